@@ -1,0 +1,107 @@
+#pragma once
+// The in-memory index of one family file: the few facts of each individual,
+// source, multimedia record and place that the census screens and writers need.
+//
+// The index is rebuilt from the file by every load and never written back: the
+// file is the only truth. Tables are in file order and addressed by position
+// (0-based); references between records (families, cited sources, linked
+// objects) are record numbers, the digits of an identifier such as 12 in @I12@.
+//
+// All texts are UTF-8, whatever the file's encoding, and are views into the
+// index's own arena: they live as long as the index.
+
+#include "flags/flagtable.h"
+#include "model/textarena.h"
+#include "platform/encoding.h"
+#include "platform/filetime.h"
+
+#include <QString>
+
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+namespace qm {
+
+// One "1 CENS" event of an individual.
+struct censusrec {
+    std::string_view date;    // "2 DATE" value (a later one replaces an earlier)
+    std::string_view place;   // "2 PLAC" value
+    std::string_view address; // "2 ADDR" value
+    std::string_view age;     // "2 AGE" value
+    std::vector<int32_t> sourceids; // sources cited under the event, in file order
+
+    int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
+};
+
+// One individual ("0 @I...").
+struct personrec {
+    int32_t id = 0;
+    std::string_view name; // "Surname, Given names", or "<no name>"
+    std::string_view sex;
+    bool hasbirthdate = false;
+    bool hasbirthplace = false;
+    bool birthedited = false; // birth details given on the form since the load
+    bool hasdeathdate = false;
+    std::string_view birthplace;
+    std::string_view birthdate;
+    std::string_view deathdate;
+    int32_t famc = 0;               // family as a child (last "1 FAMC"), 0 if none
+    std::vector<int32_t> fams;      // families as a spouse, in file order
+    std::vector<int32_t> sourceids; // every "2 SOUR @" citation of the record, in file order
+    std::vector<int32_t> flagids;   // flags held: positions in the index's flag table
+    std::vector<censusrec> census;  // "1 CENS" events, in file order
+
+    int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
+};
+
+// One source record ("0 @S...").
+struct sourcerec {
+    int32_t id = 0;
+    std::string_view title; // first TITL or ABBR, trimmed
+    std::vector<int32_t> objectids; // "1 OBJE @O" links, in file order
+    bool iscensus = false;          // that first TITL/ABBR line mentions "census"
+    std::string censusdate;         // filled when images are attached to existing sources
+    bool censusdatesought = false;
+};
+
+// One multimedia record ("0 @O...").
+struct objectrec {
+    int32_t id = 0;
+    std::string_view form, title, file, date;
+    int32_t maxasid = 0; // highest "2 _ASID" value, 0 if none
+};
+
+// One group of place names that are equal ignoring letter case.
+struct placerec {
+    std::string_view name; // the spelling met first in the file
+    int32_t count = 0;     // how many PLAC lines carry it
+};
+
+struct gedcomindex {
+    QString gedcomfile;    // full path of the family file
+    filestamp gedcomdate;  // its last-modified time and size when it was read
+    textencoding encoding = textencoding::windows1252;
+    bool bom = false;
+
+    std::vector<personrec> people;
+    std::vector<sourcerec> sources;
+    std::vector<objectrec> objects;
+    std::vector<placerec> places; // sorted by name ignoring case, one entry per group
+    flagtable flags;              // the defined flags, then those met in the file
+
+    std::vector<int32_t> censussources; // positions in `sources` of census sources, in file order
+    int64_t censusevents = 0;           // "1 CENS" events of all individuals
+
+    int32_t maxobjectid = 0;
+    int32_t maxnoteid = -1;
+    int32_t nextsourceid = 1; // highest source number + 1
+
+    textarena arena;
+
+    gedcomindex() = default;
+    gedcomindex(gedcomindex&&) = default;
+    gedcomindex& operator=(gedcomindex&&) = default;
+};
+
+} // namespace qm

@@ -1,0 +1,131 @@
+#include "platform/linereader.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+using namespace qm;
+
+namespace {
+
+struct readlines {
+    std::vector<std::string> lines;
+    std::vector<std::string> ends;
+    textencoding enc;
+    bool bom;
+};
+
+readlines readall(const std::string& bytes, size_t maxline = 0)
+{
+    linereader r;
+    r.setmaxline(maxline);
+    r.openbytes(bytes);
+    readlines out;
+    std::string_view line;
+    while (r.next(line)) {
+        out.lines.emplace_back(line);
+        out.ends.emplace_back(r.lineend());
+    }
+    out.enc = r.encoding();
+    out.bom = r.hasbom();
+    return out;
+}
+
+} // namespace
+
+TEST(LineReader, SplitsEveryKindOfLineEnd)
+{
+    const auto r = readall("0 HEAD\r\n1 A\n1 B\r1 C\n\r1 D");
+    EXPECT_EQ(r.lines, (std::vector<std::string>{"0 HEAD", "1 A", "1 B", "1 C", "1 D"}));
+    EXPECT_EQ(r.ends, (std::vector<std::string>{"\r\n", "\n", "\r", "\n\r", ""}));
+}
+
+TEST(LineReader, LfBeforeCrLfIsTwoLines)
+{
+    // "A\n\r\nB": A ends with LF, then an empty line ends with CR LF.
+    const auto r = readall("A\n\r\nB\r\n");
+    EXPECT_EQ(r.lines, (std::vector<std::string>{"A", "", "B"}));
+    EXPECT_EQ(r.ends, (std::vector<std::string>{"\n", "\r\n", "\r\n"}));
+}
+
+TEST(LineReader, EmptyFileAndLoneLineEnds)
+{
+    EXPECT_TRUE(readall("").lines.empty());
+    EXPECT_EQ(readall("\r\n\r\n").lines.size(), 2u);
+    EXPECT_EQ(readall("x").lines, std::vector<std::string>{"x"});
+}
+
+TEST(LineReader, KeepsNulBytesAndHighBytes)
+{
+    const std::string bytes("1 NAME A\0B /\xe9/\r\n", 16);
+    const auto r = readall(bytes);
+    ASSERT_EQ(r.lines.size(), 1u);
+    EXPECT_EQ(r.lines[0], std::string("1 NAME A\0B /\xe9/", 14));
+}
+
+TEST(LineReader, LinesAcrossBufferBoundaries)
+{
+    // Lines of many lengths so that line ends, CR LF pairs among them, fall on
+    // the edges of the reader's 1 MiB buffer.
+    std::string bytes;
+    std::vector<std::string> expect;
+    for (int i = 0; bytes.size() < 3u * 1024 * 1024; ++i) {
+        // Never empty: an empty CR-ended line after an LF-ended one would read as LF CR.
+        std::string line(static_cast<size_t>(1 + i % 97), static_cast<char>('a' + i % 26));
+        expect.push_back(line);
+        bytes += line;
+        bytes += (i % 3 == 0) ? "\r\n" : (i % 3 == 1 ? "\n" : "\r");
+    }
+    const auto r = readall(bytes);
+    EXPECT_EQ(r.lines, expect);
+}
+
+TEST(LineReader, CutsOverlongLinesWhenAsked)
+{
+    std::string bytes = "0 HEAD\r\n1 NOTE " + std::string(3u * 1024 * 1024, 'x') + "\r\n0 TRLR\r\n";
+    const auto r = readall(bytes, 1000);
+    ASSERT_EQ(r.lines.size(), 3u);
+    EXPECT_EQ(r.lines[1].size(), 1000u);
+    EXPECT_EQ(r.lines[2], "0 TRLR");
+    // Without a limit the whole line comes through.
+    EXPECT_EQ(readall(bytes).lines[1].size(), 3u * 1024 * 1024 + 7);
+}
+
+TEST(LineReader, FindsTheCharacterSet)
+{
+    EXPECT_EQ(readall("0 HEAD\r\n1 CHAR UTF-8\r\n0 TRLR\r\n").enc, textencoding::utf8);
+    EXPECT_EQ(readall("0 HEAD\r\n1 CHAR ANSI\r\n").enc, textencoding::windows1252);
+    EXPECT_EQ(readall("0 HEAD\r\n0 TRLR\r\n").enc, textencoding::windows1252);
+    EXPECT_EQ(readall("0 HEAD\n  1 CHAR ANSEL\n").enc, textencoding::other8bit);
+    // A CHAR line of a later record is not the header's.
+    EXPECT_EQ(readall("0 HEAD\r\n0 @I1@ INDI\r\n1 CHAR UTF-8\r\n").enc, textencoding::windows1252);
+    const auto bom = readall("\xEF\xBB\xBF" "0 HEAD\r\n1 CHAR ANSI\r\n");
+    EXPECT_EQ(bom.enc, textencoding::utf8);
+    EXPECT_TRUE(bom.bom);
+    EXPECT_EQ(bom.lines[0], "0 HEAD");
+}
+
+TEST(LineReader, DecodesUtf16)
+{
+    const std::u16string text = u"0 HEAD\r\n1 NAME J\u00f6rg /M\u00fcller/\r\n";
+    std::string le("\xFF\xFE", 2), be("\xFE\xFF", 2), nobom;
+    for (char16_t c : text) {
+        le += static_cast<char>(c & 0xFF);
+        le += static_cast<char>(c >> 8);
+        be += static_cast<char>(c >> 8);
+        be += static_cast<char>(c & 0xFF);
+        nobom += static_cast<char>(c & 0xFF);
+        nobom += static_cast<char>(c >> 8);
+    }
+    for (const auto& [bytes, enc, bom] : {std::tuple{le, textencoding::utf16le, true},
+                                          std::tuple{be, textencoding::utf16be, true},
+                                          std::tuple{nobom, textencoding::utf16le, false}}) {
+        const auto r = readall(bytes);
+        EXPECT_EQ(r.enc, enc);
+        EXPECT_EQ(r.bom, bom);
+        ASSERT_EQ(r.lines.size(), 2u);
+        EXPECT_EQ(r.lines[1], "1 NAME J\xC3\xB6rg /M\xC3\xBCller/");
+        EXPECT_EQ(r.ends[1], "\r\n");
+    }
+}
