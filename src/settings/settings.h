@@ -44,7 +44,7 @@ struct settings {
     bool occplace = true;        // "Occ Place"
     bool occage = false;         // "Occ Age"
     bool sharednote = false;     // "Shared Note"
-    QString title;               // "Title"
+    QString title = QStringLiteral("Census {YEAR} {PLACE} {REF} ({OTHER})"); // "Title"
     // group 8
     bool asid = true;            // "ASID"
     bool fileopendefault = true; // "File Open Default"
@@ -75,6 +75,10 @@ QString defaulttitletemplate(); // "Census {YEAR} {PLACE} {REF} ({OTHER})"
 // The folder Quillmark writes its own files to (census log, backups).
 QString programfolder();
 QString defaultlogpath();
+
+// The settings a value takes when it is absent or not accepted, with the log
+// path and backup folder in the program folder.
+settings defaultsettings();
 
 struct settingsload {
     settings values;
