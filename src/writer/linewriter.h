@@ -1,0 +1,98 @@
+#pragma once
+// Buffered writer of a family file's lines, the counterpart of linereader.
+//
+// Every line ends with CR LF. A line kept from the input is written as the
+// reader handed it out: its bytes unchanged for an 8-bit file, re-encoded from
+// UTF-8 into UTF-16 of the file's byte order for a UTF-16 file. A new line is
+// UTF-8 text encoded into the file's encoding (Windows-1252, UTF-8, UTF-16, or
+// ASCII only for other 8-bit sets).
+//
+// A file is written safely: the lines go to a temporary file beside it that
+// replaces it in one atomic step on commit(); until then, and whenever
+// anything fails, the file stays as it was. After the first failure nothing
+// more is written and the error is kept for the end.
+
+#include "platform/encoding.h"
+
+#include <QString>
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <string_view>
+
+class QSaveFile;
+
+namespace qm {
+
+// Faults a test can make every line writer (and every other safe write of the
+// family file) meet, like a full disk or a locked file. In force until reset
+// with an empty writefault.
+struct writefault {
+    bool failopen = false;        // the temporary file cannot be created
+    int64_t failafterbytes = -1;  // the device takes this many bytes, then every write fails
+    bool failcommit = false;      // the final replace fails
+    bool active() const { return failopen || failafterbytes >= 0 || failcommit; }
+};
+void setwritefaultfortests(const writefault& fault);
+const writefault& currentwritefault();
+
+class linewriter {
+public:
+    linewriter(textencoding enc, bool bom);
+    ~linewriter(); // cancels an uncommitted file
+    linewriter(const linewriter&) = delete;
+    linewriter& operator=(const linewriter&) = delete;
+
+    // Starts the safe write of path. False with errorstring() on failure.
+    bool open(const QString& path);
+    // Collects the bytes in memory instead (tests); memory() holds them.
+    void openmemory();
+    const std::string& memory() const { return mem_; }
+
+    // A line kept from the input, as the line reader handed it out.
+    void writeline(std::string_view line);
+    // A new line of UTF-8 text. False (and the writer failed) when a
+    // character cannot be held by the file's encoding: callers check typed
+    // text before writing, so this is a fault.
+    bool writetext(std::string_view utf8);
+    // A new line of text that came from the file itself (flag names ...):
+    // for other 8-bit sets it is encoded back through Windows-1252, which
+    // gives the file's own bytes.
+    bool writefiletext(std::string_view utf8);
+
+    // Writes what is buffered and replaces the file. False on failure, with
+    // the file untouched.
+    bool commit();
+    // Drops everything written; the file stays as it was.
+    void cancel();
+
+    bool failed() const { return failed_; }
+    QString errorstring() const { return error_; }
+    int64_t lines() const { return lines_; }
+    textencoding encoding() const { return enc_; }
+
+private:
+    void fail(const QString& error);
+    void put(std::string_view bytes); // one line's bytes without the line end
+    void flush();
+
+    textencoding enc_;
+    bool bom_;
+    std::unique_ptr<QSaveFile> file_;
+    bool memory_ = false;
+    std::string mem_;
+    std::string buf_;
+    std::string scratch_;
+    int64_t written_ = 0; // bytes handed to the device
+    int64_t lines_ = 0;
+    bool failed_ = false;
+    bool started_ = false;
+    QString error_;
+};
+
+// Appends the UTF-16 form (byte order of enc) of UTF-8 text; bytes that are
+// not UTF-8 are taken as the Windows-1252 characters they would be.
+void appendutf16(std::string_view utf8, bool bigendian, std::string& out);
+
+} // namespace qm
