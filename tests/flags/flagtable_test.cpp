@@ -1,0 +1,204 @@
+#include "flags/flagtable.h"
+
+#include "platform/encoding.h"
+#include "platform/settingsstore.h"
+
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+
+TEST(CodeForFlag, NamesFromTheHelp)
+{
+    EXPECT_EQ(codeforflag("Ab-c"), "__ABC");
+    EXPECT_EQ(codeforflag("a b"), "__A_B");
+    EXPECT_EQ(codeforflag(QStringLiteral("Émile")), "__EMILE");
+    EXPECT_EQ(codeforflag("St. John's 1881"), "__ST_JOHNS_1881"); // 15 characters: kept whole
+    EXPECT_EQ(codeforflag("Census Ireland 1901"), "__CENSUS_IRELAN");
+    EXPECT_EQ(codeforflag(""), "__");
+    EXPECT_EQ(codeforflag("\t-./"), "__");
+}
+
+TEST(CodeForFlag, FoldsEveryAccentedCharacterToACapital)
+{
+    const QString accents = QStringLiteral(
+        "ŠŒŽšœžŸ¥µÀÁÂÃÄÅÆÇÈÉÊËÌÍÎÏÐÑÒÓÔÕÖØÙÚÛÜÝßàáâãäåæçèéêëìíîïðñòóôõöøùúûüýÿ");
+    const std::string folds = "SOZSOZYYUAAAAAAACEEEEIIIIDNOOOOOOUUUUYSAAAAAAACEEEEIIIIONOOOOOOUUUUYY";
+    ASSERT_EQ(accents.size(), 69);
+    for (qsizetype i = 0; i < accents.size(); ++i)
+        EXPECT_EQ(codeforflag(accents.at(i)), "__" + folds.substr(static_cast<size_t>(i), 1))
+            << "character " << i << " U+" << std::hex << int(accents.at(i).unicode());
+    EXPECT_EQ(codeforflag(QStringLiteral("Œ Æ ß")), "__O_A_S");
+    EXPECT_EQ(codeforflag(QStringLiteral("ðµ¥")), "__OUY");
+    // Outside the list: dropped, and the code stays ASCII.
+    EXPECT_EQ(codeforflag(QStringLiteral("Łódź × ÷ 1881")), "__OD___1881");
+}
+
+TEST(CodeForFlag, SameCodeWhereverTheNameCameFrom)
+{
+    const std::string typed = codeforflag(QStringLiteral("Zoë Müller"));
+    EXPECT_EQ(typed, "__ZOE_MULLER");
+    // The same name read from a UTF-8 file, from a Windows-1252 file, and typed
+    // with combining accents.
+    EXPECT_EQ(codeforflag(qs("Zo\xc3\xab M\xc3\xbcller")), typed);
+    EXPECT_EQ(codeforflag(qs(toutf8("Zo\xeb M\xfcller", textencoding::windows1252))), typed);
+    EXPECT_EQ(codeforflag(QStringLiteral("Zoe\u0308 Mu\u0308ller")), typed);
+    EXPECT_EQ(codeforflag(qs(toutf8("\x8c\x9a\xa5\xb5", textencoding::windows1252))), "__OSYU");
+}
+
+flagrec allocated(const char* code, const char* name, const char* date, const char* country)
+{
+    flagrec f;
+    f.code = code;
+    f.name = name;
+    f.date = date;
+    f.country = country;
+    return f;
+}
+
+TEST(FindEntryFlag, MatchesYearOrFullDateOfTheCountry)
+{
+    flagtable t;
+    t.push_back(allocated("__FREE", "Free", "", ""));
+    t.push_back(allocated("__US_1880", "US 1880", "1880", "USA"));
+    t.push_back(allocated("__C1881", "Census 1881", "1881", "UK"));
+    t.push_back(allocated("__C1891", "Census 1891", "5 APR 1891", "UK"));
+    t.push_back(allocated("__IRL1901", "Ireland 1901", "1901", "Ireland"));
+    EXPECT_EQ(findentryflag(t, "3 APR 1881", "UK"), 2u);
+    EXPECT_EQ(findentryflag(t, "5 APR 1891", "UK"), 3u);
+    EXPECT_EQ(findentryflag(t, "6 APR 1891", "UK"), std::nullopt);
+    EXPECT_EQ(findentryflag(t, "31 MAR 1901", "UK"), std::nullopt) << "flag of another country";
+    EXPECT_EQ(findentryflag(t, "31 MAR 1901", "Ireland"), 4u);
+    EXPECT_EQ(findentryflag(t, "1 JUN 1880", "USA"), 1u);
+    EXPECT_EQ(findentryflag(t, "", "UK"), std::nullopt);
+    EXPECT_EQ(findentryflag(flagtable{}, "3 APR 1881", "UK"), std::nullopt);
+}
+
+TEST(FindEntryFlag, EmptyDateIsNeverFound)
+{
+    flagtable t;
+    t.push_back(allocated("__X", "X", "", "UK"));
+    EXPECT_EQ(findentryflag(t, "3 APR 1881", "UK"), std::nullopt);
+    EXPECT_EQ(findentryflag(t, "", "UK"), std::nullopt);
+}
+
+class FlagDefsTest : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        store = settingsstore::onfile(dir.filePath("settings.ini"));
+    }
+    void define(int n, const QString& code, const QString& name, const QString& date, const QString& country)
+    {
+        const QString g = "Flags/" + QString::number(n);
+        store->write(g, "Code", code);
+        store->write(g, "Name", name);
+        store->write(g, "Date", date);
+        store->write(g, "Country", country);
+    }
+    QString value(int n, const char* name) const
+    {
+        return store->read("Flags/" + QString::number(n), name).value_or("<none>");
+    }
+
+    QTemporaryDir dir;
+    std::unique_ptr<settingsstore> store;
+};
+
+TEST_F(FlagDefsTest, NoGroupsGiveAnEmptyTableAndNoError)
+{
+    flagtable t;
+    EXPECT_TRUE(loadflagdefs(*store, t));
+    EXPECT_TRUE(t.empty());
+}
+
+TEST_F(FlagDefsTest, DefinitionsAreReadInOrderAndAreNoUse)
+{
+    define(1, "__C1881", QStringLiteral("Census 1881 é"), "1881", "UK");
+    define(2, "__C1891", "Census 1891", "5 APR 1891", "UK");
+    define(4, "__LATE", "After a gap", "1901", "UK");
+    flagtable t;
+    EXPECT_TRUE(loadflagdefs(*store, t));
+    ASSERT_EQ(t.size(), 2u) << "reading stops at the first missing group";
+    EXPECT_EQ(t[0].code, "__C1881");
+    EXPECT_EQ(t[0].name, "Census 1881 \xc3\xa9");
+    EXPECT_EQ(t[0].date, "1881");
+    EXPECT_EQ(t[0].country, "UK");
+    EXPECT_EQ(t[0].count, 0);
+    EXPECT_EQ(t[1].date, "5 APR 1891");
+    // The loader then notes the same flag met in the file.
+    EXPECT_EQ(noteflag(t, "__C1891", "other name"), 1u);
+    EXPECT_EQ(t[1].count, 1);
+    EXPECT_EQ(t[1].name, "Census 1891");
+}
+
+TEST_F(FlagDefsTest, FaultyGroupIsSkippedAndStoreRenumbered)
+{
+    define(1, "__C1851", "Census 1851", "1851", "UK");
+    define(2, "__C1861", "Census 1861", "1861", "UK");
+    define(3, "__C1871", "Census 1871", "187", "UK");
+    define(4, "__C1881", "Census 1881", "1881", "UK");
+    flagtable t;
+    EXPECT_FALSE(loadflagdefs(*store, t));
+    ASSERT_EQ(t.size(), 3u);
+    EXPECT_EQ(t[2].code, "__C1881");
+    EXPECT_EQ(value(1, "Code"), "__C1851");
+    EXPECT_EQ(value(2, "Code"), "__C1861");
+    EXPECT_EQ(value(3, "Code"), "__C1881");
+    EXPECT_EQ(value(3, "Date"), "1881");
+    EXPECT_FALSE(store->groupexists("Flags/4"));
+    EXPECT_TRUE(flagloaderrormessage().startsWith("There was an error loading in the flags"));
+
+    flagtable again;
+    EXPECT_TRUE(loadflagdefs(*store, again));
+    EXPECT_EQ(again.size(), 3u);
+}
+
+TEST_F(FlagDefsTest, ShortMissingOrUnwritableValuesAreFaulty)
+{
+    define(1, "__", "Short code", "1881", "UK");
+    define(2, "__A", "", "1881", "UK");
+    define(3, "__B", "B", "1881", "U");
+    define(4, "__C", "C", "1881", "UK");
+    store->write("Flags/5", "Code", "__D");
+    define(6, "__E F", "Space in code", "1881", "UK");
+    define(7, "__G", "Line\r\n0 @I1@ INDI", "1881", "UK");
+    define(8, "__H", "H", "1891", "UK");
+    flagtable t;
+    EXPECT_FALSE(loadflagdefs(*store, t));
+    ASSERT_EQ(t.size(), 2u);
+    EXPECT_EQ(t[0].code, "__C");
+    EXPECT_EQ(t[1].code, "__H");
+    EXPECT_EQ(value(2, "Code"), "__H");
+    EXPECT_FALSE(store->groupexists("Flags/3"));
+}
+
+TEST_F(FlagDefsTest, SaveKeepsOnlyAllocatedFlagsAndClearsStaleGroups)
+{
+    define(1, "__OLD", "Old", "1841", "UK");
+    define(2, "__OLD2", "Old 2", "1851", "UK");
+    define(5, "__STALE", "Beyond a gap", "1861", "UK");
+    flagtable t;
+    t.push_back(allocated("__FILEONLY", "Only in the file", "", ""));
+    t.push_back(allocated("__C1881", "Census 1881", "3 APR 1881", "UK"));
+    t.back().count = 7;
+    saveflagdefs(*store, t);
+    EXPECT_EQ(value(1, "Code"), "__C1881");
+    EXPECT_EQ(value(1, "Name"), "Census 1881");
+    EXPECT_EQ(value(1, "Date"), "3 APR 1881");
+    EXPECT_EQ(value(1, "Country"), "UK");
+    EXPECT_FALSE(store->read("Flags/1", "Count").has_value());
+    EXPECT_FALSE(store->groupexists("Flags/2"));
+    EXPECT_FALSE(store->groupexists("Flags/5"));
+
+    flagtable back;
+    EXPECT_TRUE(loadflagdefs(*store, back));
+    ASSERT_EQ(back.size(), 1u);
+    EXPECT_EQ(back[0].count, 0);
+}
+
+} // namespace
