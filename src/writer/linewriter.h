@@ -74,6 +74,7 @@ public:
 
 private:
     void fail(const QString& error);
+    void start(); // the byte-order mark, once
     void put(std::string_view bytes); // one line's bytes without the line end
     void flush();
 

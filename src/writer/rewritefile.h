@@ -84,7 +84,7 @@ QString rewritefailuremessage(rewritemode mode, const QString& description);
 // Checks, before anything is written, that every text the request will put
 // into the file can be held by the file's encoding. Returns "" when it can,
 // otherwise the message for the user naming the first character that cannot.
-QString checkencodable(const rewriterequest& request, const gedcomindex& index, textencoding enc);
+QString checkencodable(const rewriterequest& request, const settings& s, textencoding enc);
 
 // The number of the shared note a mode 1 run would create (maxnoteid + 1, or 1).
 int32_t newnotenumber(int32_t maxnoteid);

@@ -1,0 +1,265 @@
+#include "writer/linewriter.h"
+
+#include <QSaveFile>
+
+#include <algorithm>
+
+namespace qm {
+
+namespace {
+
+constexpr size_t flushsize = 1 << 20;
+
+writefault& faultstate()
+{
+    static writefault f;
+    return f;
+}
+
+void put16(char16_t u, bool be, std::string& out)
+{
+    const char hi = static_cast<char>(u >> 8), lo = static_cast<char>(u & 0xFF);
+    if (be) {
+        out.push_back(hi);
+        out.push_back(lo);
+    } else {
+        out.push_back(lo);
+        out.push_back(hi);
+    }
+}
+
+} // namespace
+
+void setwritefaultfortests(const writefault& fault)
+{
+    faultstate() = fault;
+}
+
+const writefault& currentwritefault()
+{
+    return faultstate();
+}
+
+void appendutf16(std::string_view s, bool be, std::string& out)
+{
+    for (size_t i = 0; i < s.size();) {
+        const auto b0 = static_cast<unsigned char>(s[i]);
+        char32_t cp = 0;
+        size_t len = 0;
+        if (b0 < 0x80) {
+            cp = b0;
+            len = 1;
+        } else {
+            size_t need = 0;
+            if (b0 >= 0xC2 && b0 <= 0xDF) {
+                need = 2;
+                cp = b0 & 0x1F;
+            } else if (b0 >= 0xE0 && b0 <= 0xEF) {
+                need = 3;
+                cp = b0 & 0x0F;
+            } else if (b0 >= 0xF0 && b0 <= 0xF4) {
+                need = 4;
+                cp = b0 & 0x07;
+            }
+            bool good = need > 0 && i + need <= s.size();
+            for (size_t k = 1; good && k < need; ++k) {
+                const auto b = static_cast<unsigned char>(s[i + k]);
+                good = (b & 0xC0) == 0x80;
+                cp = (cp << 6) | (b & 0x3F);
+            }
+            if (good && ((need == 3 && (cp < 0x800 || (cp >= 0xD800 && cp <= 0xDFFF)))
+                         || (need == 4 && (cp < 0x10000 || cp > 0x10FFFF))))
+                good = false;
+            if (good) {
+                len = need;
+            } else {
+                cp = cp1252tounicode(b0);
+                len = 1;
+            }
+        }
+        if (cp >= 0x10000) {
+            cp -= 0x10000;
+            put16(static_cast<char16_t>(0xD800 + (cp >> 10)), be, out);
+            put16(static_cast<char16_t>(0xDC00 + (cp & 0x3FF)), be, out);
+        } else {
+            put16(static_cast<char16_t>(cp), be, out);
+        }
+        i += len;
+    }
+}
+
+linewriter::linewriter(textencoding enc, bool bom) : enc_(enc), bom_(bom) {}
+
+linewriter::~linewriter()
+{
+    cancel();
+}
+
+bool linewriter::open(const QString& path)
+{
+    file_ = std::make_unique<QSaveFile>(path);
+    // Never write the family file in place: a failure must leave it whole.
+    file_->setDirectWriteFallback(false);
+    if (faultstate().failopen) {
+        file_.reset();
+        fail(QStringLiteral("Permission denied"));
+        return false;
+    }
+    if (!file_->open(QIODevice::WriteOnly)) {
+        const QString e = file_->errorString();
+        file_.reset();
+        fail(e);
+        return false;
+    }
+    buf_.reserve(flushsize + 4096);
+    return true;
+}
+
+void linewriter::openmemory()
+{
+    memory_ = true;
+    mem_.clear();
+}
+
+void linewriter::fail(const QString& error)
+{
+    if (!failed_) {
+        failed_ = true;
+        error_ = error;
+    }
+}
+
+void linewriter::put(std::string_view bytes)
+{
+    if (failed_)
+        return;
+    start();
+    std::string& out = memory_ ? mem_ : buf_;
+    if (isutf16(enc_)) {
+        const bool be = enc_ == textencoding::utf16be;
+        appendutf16(bytes, be, out);
+        appendutf16("\r\n", be, out);
+    } else {
+        out.append(bytes);
+        out.append("\r\n");
+    }
+    ++lines_;
+    if (!memory_ && buf_.size() >= flushsize)
+        flush();
+}
+
+void linewriter::start()
+{
+    if (started_)
+        return;
+    started_ = true;
+    if (!bom_)
+        return;
+    std::string& out = memory_ ? mem_ : buf_;
+    if (enc_ == textencoding::utf8)
+        out.append("\xEF\xBB\xBF");
+    else if (enc_ == textencoding::utf16le)
+        out.append("\xFF\xFE");
+    else if (enc_ == textencoding::utf16be)
+        out.append("\xFE\xFF");
+}
+
+void linewriter::flush()
+{
+    if (failed_ || memory_ || !file_ || buf_.empty())
+        return;
+    const writefault& f = faultstate();
+    qint64 want = static_cast<qint64>(buf_.size());
+    bool full = false;
+    if (f.failafterbytes >= 0 && written_ + want > f.failafterbytes) {
+        want = std::max<qint64>(0, f.failafterbytes - written_);
+        full = true;
+    }
+    if (want > 0) {
+        const qint64 n = file_->write(buf_.data(), want);
+        if (n != want) {
+            fail(file_->errorString());
+            return;
+        }
+        written_ += n;
+    }
+    if (full) {
+        fail(QStringLiteral("No space left on device"));
+        return;
+    }
+    buf_.clear();
+}
+
+void linewriter::writeline(std::string_view line)
+{
+    put(line);
+}
+
+bool linewriter::writetext(std::string_view utf8)
+{
+    if (failed_)
+        return false;
+    scratch_.clear();
+    char32_t bad = 0;
+    if (!fromutf8(utf8, enc_, scratch_, &bad)) {
+        fail(QStringLiteral("the character U+%1 cannot be written in this file's encoding")
+                 .arg(QString::number(static_cast<uint>(bad), 16).toUpper().rightJustified(4, QLatin1Char('0'))));
+        return false;
+    }
+    put(scratch_);
+    return true;
+}
+
+bool linewriter::writefiletext(std::string_view utf8)
+{
+    if (enc_ != textencoding::other8bit)
+        return writetext(utf8);
+    if (failed_)
+        return false;
+    scratch_.clear();
+    if (!fromutf8(utf8, textencoding::windows1252, scratch_)) {
+        fail(QStringLiteral("a flag name cannot be written in this file's encoding"));
+        return false;
+    }
+    put(scratch_);
+    return true;
+}
+
+bool linewriter::commit()
+{
+    if (memory_) {
+        start();
+        return !failed_;
+    }
+    if (!file_) {
+        fail(QStringLiteral("The file was not opened"));
+        return false;
+    }
+    start();
+    flush();
+    if (failed_) {
+        cancel();
+        return false;
+    }
+    if (faultstate().failcommit) {
+        cancel();
+        fail(QStringLiteral("The file is in use by another program"));
+        return false;
+    }
+    if (!file_->commit()) {
+        const QString e = file_->errorString();
+        file_.reset();
+        fail(e);
+        return false;
+    }
+    file_.reset();
+    return true;
+}
+
+void linewriter::cancel()
+{
+    // A save file dropped before its commit removes its temporary file.
+    file_.reset();
+}
+
+} // namespace qm
