@@ -1,0 +1,135 @@
+#include "log/censuslog.h"
+
+#include "platform/clock.h"
+#include "settings/settings.h"
+
+#include <QDir>
+#include <QFile>
+
+namespace qm {
+
+namespace {
+
+QString timestamp()
+{
+    // Local time, written the same way in every locale so that it cannot be misread.
+    return now().toString(QStringLiteral("yyyy-MM-dd HH:mm:ss"));
+}
+
+QString native(const QString& path)
+{
+    return QDir::toNativeSeparators(path);
+}
+
+void modeonelines(const settings& s, const logentry& e, QStringList& out)
+{
+    out << QStringLiteral("Census entry added: ") + timestamp();
+    out << QStringLiteral("To Gedcom File: ") + native(e.gedcomfile);
+    const QString source = e.title.trimmed() + QStringLiteral(" (ID: ") + e.sourceid.trimmed() + QStringLiteral(")");
+    if (s.fullentry) {
+        out << QStringLiteral("Source created: ") + source;
+    } else {
+        out << QStringLiteral("Source referred to: ") + source;
+        out << QStringLiteral("Where within source: ") + e.reference.trimmed();
+        if (s.sharednote)
+            out << QStringLiteral("Note created containing census text and linked to each source citation");
+    }
+    out << QString();
+    out << QStringLiteral("Individual records changed (linked to source above): ");
+    for (const selectionrec& r : e.selection) {
+        QString line = QStringLiteral("Name: ") + r.name + QStringLiteral(" (") + QString::number(r.id)
+            + QStringLiteral(") : created ")
+            + (s.residence ? QStringLiteral("residence attribute") : QStringLiteral("census event"));
+        if (r.occupation.trimmed().size() >= 2)
+            line += QStringLiteral(" and occupation attribute (") + r.occupation.trimmed() + QStringLiteral(")");
+        // Birth events are written only with "Birthdate" on; the log says what was written.
+        if (r.birthedited && s.birthdate)
+            line += QStringLiteral(" and birth event (") + r.birthdate.trimmed() + QStringLiteral(" (cal) ")
+                + r.birthplace + QStringLiteral(")");
+        out << line;
+    }
+    if (!e.flagname.isEmpty())
+        out << QStringLiteral("Each individual was given flag '") + e.flagname
+                + QStringLiteral("' unless they already had it.");
+}
+
+} // namespace
+
+QString logseparator()
+{
+    return QString(78, u'=');
+}
+
+QStringList loglines(const settings& s, const logentry& e)
+{
+    QStringList out;
+    out << logseparator();
+    switch (e.mode) {
+    case 1:
+        modeonelines(s, e, out);
+        break;
+    case 2:
+        out << QStringLiteral("Image(s) attached: ") + timestamp();
+        out << QStringLiteral("To GEDCOM File: ") + native(e.gedcomfile);
+        out << QStringLiteral("Source image(s) attached to: ") + e.title.trimmed() + QStringLiteral(" (ID: ")
+                + e.sourceid.trimmed() + QStringLiteral(")");
+        break;
+    case 3:
+        out << QStringLiteral("Census dates changed: ") + timestamp();
+        out << QStringLiteral("In GEDCOM File: ") + native(e.gedcomfile);
+        for (const datechange& d : e.datechanges)
+            if (d.applies())
+                out << QStringLiteral("Changed ") + QString::number(d.count) + QStringLiteral(" census events dated ")
+                        + d.founddate + QStringLiteral(" to ") + d.newdate;
+        out << QStringLiteral("and changed ") + QString::number(e.occdateschanged)
+                + QStringLiteral(" associated occupation dates");
+        break;
+    case 4:
+        out << QStringLiteral("Flag Check changes made: ") + timestamp();
+        out << QStringLiteral("In GEDCOM File: ") + native(e.gedcomfile);
+        out << QStringLiteral("Made ") + QString::number(e.flagchangecount) + QStringLiteral(" changes.");
+        break;
+    default:
+        break;
+    }
+    for (const imagechoice& im : e.chosenimages) {
+        if (im.isnew)
+            out << QStringLiteral("Multimedia image record created and linked to the census source: ") + im.title
+                    + QStringLiteral(" (") + im.file + QStringLiteral(")");
+        else
+            out << QStringLiteral("Existing image record linked to the census source: ") + im.title;
+    }
+    return out;
+}
+
+QString writelogentry(const settings& s, const logentry& e)
+{
+    QFile f(s.logpath);
+    if (s.logpath.isEmpty() || !f.open(QIODevice::WriteOnly | QIODevice::Append))
+        return QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
+            + native(s.logpath);
+    QByteArray bytes;
+    for (const QString& line : loglines(s, e)) {
+        bytes += line.toUtf8();
+        bytes += "\r\n";
+    }
+    // Write errors after the open are not reported: the change itself stands.
+    f.write(bytes);
+    f.close();
+    return QString();
+}
+
+QString checklogfile(const QString& logpath)
+{
+    QFile f(logpath);
+    if (!logpath.isEmpty() && f.open(QIODevice::WriteOnly | QIODevice::Append)) {
+        f.close();
+        return QString();
+    }
+    const QString why = logpath.isEmpty() ? QStringLiteral("no file name") : f.errorString();
+    return QStringLiteral("The current log file can not be written to (") + native(logpath)
+        + QStringLiteral("). Error: ") + why
+        + QStringLiteral(" occurred. Correct the error or if necessary change the log file path.");
+}
+
+} // namespace qm

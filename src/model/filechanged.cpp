@@ -1,0 +1,32 @@
+#include "model/filechanged.h"
+
+#include "model/gedcomindex.h"
+
+#include <QDir>
+
+namespace qm {
+
+bool filechanged(const QString& path, const filestamp& noted)
+{
+    return !(stampof(path) == noted);
+}
+
+bool filechanged(const gedcomindex& index)
+{
+    return filechanged(index.gedcomfile, index.gedcomdate);
+}
+
+QString changedmessage(const QString& path)
+{
+    return QDir::toNativeSeparators(path) + QStringLiteral(" has been modified by another application and will be reloaded.");
+}
+
+QString changedonsavemessage(const QString& path, bool imageschosen)
+{
+    if (!imageschosen)
+        return changedmessage(path);
+    return QDir::toNativeSeparators(path)
+        + QStringLiteral(" has been modified by another application and will be reloaded. As a precaution against data corruption any images you have chosen will need to be reselected when you click 'Save Changes' again. Please wait for the details to be reloaded...");
+}
+
+} // namespace qm

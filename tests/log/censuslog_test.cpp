@@ -1,0 +1,144 @@
+#include "log/censuslog.h"
+
+#include "platform/clock.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+
+class CensusLog : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        setclockfortests(QDateTime(QDate(2026, 12, 4), QTime(23, 50, 7)));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        e.gedcomfile = QStringLiteral("/home/ann/family.ged");
+        e.sourceid = QStringLiteral("12 ");
+        e.title = QStringLiteral(" Census 1851 Leeds ");
+        e.reference = QStringLiteral("HO107/1 ");
+    }
+    void TearDown() override { setclockfortests(QDateTime()); }
+
+    static selectionrec person(int id, const QString& name, const QString& occupation = QString())
+    {
+        selectionrec r;
+        r.id = id;
+        r.name = name;
+        r.occupation = occupation;
+        return r;
+    }
+    QStringList lines() const { return loglines(s, e); }
+
+    QTemporaryDir dir;
+    settings s;
+    logentry e;
+    const QString sep = QString(78, u'=');
+    const QString stamp = QStringLiteral("2026-12-04 23:50:07");
+    const QString file = QDir::toNativeSeparators(QStringLiteral("/home/ann/family.ged"));
+};
+
+} // namespace
+
+TEST_F(CensusLog, EntryFullMethodTwoPeople)
+{
+    e.selection = {person(3, QStringLiteral("Smith, John")), person(4, QStringLiteral("Smith, Mary"), QStringLiteral("-"))};
+    EXPECT_EQ(lines(), (QStringList{sep, QStringLiteral("Census entry added: ") + stamp,
+                                    QStringLiteral("To Gedcom File: ") + file,
+                                    QStringLiteral("Source created: Census 1851 Leeds (ID: 12)"), QString(),
+                                    QStringLiteral("Individual records changed (linked to source above): "),
+                                    QStringLiteral("Name: Smith, John (3) : created census event"),
+                                    QStringLiteral("Name: Smith, Mary (4) : created census event")}));
+}
+
+TEST_F(CensusLog, OccupationBirthResidenceFlagAndImages)
+{
+    selectionrec r = person(7, QStringLiteral("Brown, Ann"), QStringLiteral("Weaver"));
+    r.birthedited = true;
+    r.birthdate = QStringLiteral(" 1806 ");
+    r.birthplace = QStringLiteral("Leeds");
+    e.selection = {r};
+    e.flagname = QStringLiteral("Census 1851");
+    imagechoice fresh;
+    fresh.isnew = true;
+    fresh.title = QStringLiteral("Page 3");
+    fresh.file = QStringLiteral("/img/p3.jpg");
+    imagechoice old;
+    old.title = QStringLiteral("Page 2");
+    e.chosenimages = {fresh, old};
+    s.residence = true;
+    s.fullentry = false;
+    s.sharednote = true;
+    const QStringList l = lines();
+    ASSERT_EQ(l.size(), 12);
+    EXPECT_EQ(l[3], QStringLiteral("Source referred to: Census 1851 Leeds (ID: 12)"));
+    EXPECT_EQ(l[4], QStringLiteral("Where within source: HO107/1"));
+    EXPECT_EQ(l[5], QStringLiteral("Note created containing census text and linked to each source citation"));
+    EXPECT_EQ(l[8], QStringLiteral("Name: Brown, Ann (7) : created residence attribute and occupation attribute (Weaver)"
+                                   " and birth event (1806 (cal) Leeds)"));
+    EXPECT_EQ(l[9], QStringLiteral("Each individual was given flag 'Census 1851' unless they already had it."));
+    EXPECT_EQ(l[10], QStringLiteral("Multimedia image record created and linked to the census source: Page 3 (/img/p3.jpg)"));
+    EXPECT_EQ(l[11], QStringLiteral("Existing image record linked to the census source: Page 2"));
+
+    // Without "Birthdate" no birth event is written, so none is logged.
+    s.birthdate = false;
+    EXPECT_FALSE(lines()[8].contains(QStringLiteral("birth event")));
+}
+
+TEST_F(CensusLog, OtherModes)
+{
+    e.mode = 2;
+    EXPECT_EQ(lines().mid(1), (QStringList{QStringLiteral("Image(s) attached: ") + stamp,
+                                           QStringLiteral("To GEDCOM File: ") + file,
+                                           QStringLiteral("Source image(s) attached to: Census 1851 Leeds (ID: 12)")}));
+    e.mode = 3;
+    datechange a{QStringLiteral("30 MAR 1850"), 4, QStringLiteral("30 MAR 1851"), 2, 0};
+    datechange refused{QStringLiteral("1851"), 2, QString(), -2, 0};
+    datechange official{QStringLiteral("3 APR 1881"), 1, QStringLiteral("3 APR 1881"), 5, 1};
+    e.datechanges = {a, refused, official};
+    e.occdateschanged = 3;
+    EXPECT_EQ(lines().mid(1), (QStringList{QStringLiteral("Census dates changed: ") + stamp,
+                                           QStringLiteral("In GEDCOM File: ") + file,
+                                           QStringLiteral("Changed 4 census events dated 30 MAR 1850 to 30 MAR 1851"),
+                                           QStringLiteral("and changed 3 associated occupation dates")}));
+    e.mode = 4;
+    e.flagchangecount = 3;
+    EXPECT_EQ(lines().mid(1), (QStringList{QStringLiteral("Flag Check changes made: ") + stamp,
+                                           QStringLiteral("In GEDCOM File: ") + file,
+                                           QStringLiteral("Made 3 changes.")}));
+}
+
+TEST_F(CensusLog, AppendsWithCrLfAndReportsUnwritableLog)
+{
+    e.selection = {person(3, QStringLiteral("Søren, Jens"))};
+    EXPECT_EQ(writelogentry(s, e), QString());
+    EXPECT_EQ(writelogentry(s, e), QString());
+    const std::string text = qmtest::readfile(s.logpath);
+    const std::string one = (lines().join(QStringLiteral("\r\n")) + QStringLiteral("\r\n")).toStdString();
+    EXPECT_EQ(text, one + one);
+
+    s.logpath = dir.filePath(QStringLiteral("missing/censuslog.txt"));
+    EXPECT_EQ(writelogentry(s, e),
+              QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
+                  + QDir::toNativeSeparators(s.logpath));
+}
+
+TEST_F(CensusLog, CheckCreatesMissingLogAndKeepsExisting)
+{
+    EXPECT_EQ(checklogfile(s.logpath), QString());
+    EXPECT_EQ(qmtest::readfile(s.logpath), "");
+    qmtest::writefile(s.logpath, "old\r\n");
+    EXPECT_EQ(checklogfile(s.logpath), QString());
+    EXPECT_EQ(qmtest::readfile(s.logpath), "old\r\n");
+    const QString bad = dir.filePath(QStringLiteral("missing/log.txt"));
+    EXPECT_TRUE(checklogfile(bad).startsWith(QStringLiteral("The current log file can not be written to (")
+                                             + QDir::toNativeSeparators(bad) + QStringLiteral("). Error: ")));
+    EXPECT_TRUE(checklogfile(bad).endsWith(QStringLiteral(" occurred. Correct the error or if necessary change the log file path.")));
+}

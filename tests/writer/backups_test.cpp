@@ -1,0 +1,182 @@
+#include "writer/backups.h"
+
+#include "platform/clock.h"
+#include "platform/filetime.h"
+#include "platform/scriptedprompts.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+#include <unistd.h>
+
+using namespace qm;
+using qmtest::readfile;
+using qmtest::writefile;
+
+namespace {
+
+const QDateTime fixed(QDate(2026, 12, 4), QTime(23, 50, 7));
+
+class Backups : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        QDir(dir.path()).mkdir(QStringLiteral("bk"));
+        folder = dir.filePath(QStringLiteral("bk"));
+        family = dir.filePath(QStringLiteral("family.ged"));
+        writefile(family, "0 HEAD\r\n0 TRLR\r\n");
+        setmodified(family, QDateTime(QDate(2020, 1, 2), QTime(3, 4, 5)).toMSecsSinceEpoch());
+        setclockfortests(fixed);
+    }
+    void TearDown() override { setclockfortests(QDateTime()); }
+
+    // A file in the backup folder with a given last-modified day.
+    void put(const QString& name, int day)
+    {
+        const QString path = QDir(folder).filePath(name);
+        writefile(path, "x");
+        setmodified(path, QDateTime(QDate(2021, 3, day), QTime(12, 0)).toMSecsSinceEpoch());
+    }
+    QStringList names() const { return QDir(folder).entryList(QDir::Files, QDir::Name); }
+
+    QTemporaryDir dir;
+    QString folder, family;
+    scriptedprompts prompts;
+};
+
+} // namespace
+
+TEST_F(Backups, CopyKeepsBytesAndTimeAndLeavesFamilyFile)
+{
+    const filestamp before = stampof(family);
+    const backupresult r = makebackup(family, folder);
+    ASSERT_TRUE(r.ok()) << r.error.toStdString();
+    EXPECT_EQ(QFileInfo(r.path).fileName(), QStringLiteral("QM Backup 2026_12_04_23_50_07.ged"));
+    EXPECT_EQ(readfile(r.path), readfile(family));
+    EXPECT_EQ(stampof(r.path), before);
+    EXPECT_EQ(stampof(family), before);
+}
+
+TEST_F(Backups, SameSecondGetsSuffixes)
+{
+    QStringList got;
+    for (int i = 0; i < 4; ++i)
+        got << QFileInfo(makebackup(family, folder).path).fileName();
+    EXPECT_EQ(got, (QStringList{QStringLiteral("QM Backup 2026_12_04_23_50_07.ged"),
+                                QStringLiteral("QM Backup 2026_12_04_23_50_071.ged"),
+                                QStringLiteral("QM Backup 2026_12_04_23_50_07 2.ged"),
+                                QStringLiteral("QM Backup 2026_12_04_23_50_07 3.ged")}));
+}
+
+TEST_F(Backups, FailureGivesMessageAndLeavesNothing)
+{
+    const backupresult r = makebackup(family, dir.filePath(QStringLiteral("missing")));
+    EXPECT_FALSE(r.ok());
+    EXPECT_EQ(r.error, backupfailedmessage());
+    EXPECT_TRUE(r.error.startsWith(QStringLiteral("There was an error when attempting to back up your family historian file.")));
+    EXPECT_FALSE(makebackup(dir.filePath(QStringLiteral("nofile.ged")), folder).ok());
+    EXPECT_TRUE(names().isEmpty());
+}
+
+TEST_F(Backups, ReadOnlyFamilyFileStillBacksUpWithItsTime)
+{
+    QFile::setPermissions(family, QFileDevice::ReadOwner);
+    const backupresult r = makebackup(family, folder);
+    ASSERT_TRUE(r.ok());
+    EXPECT_EQ(stampof(r.path).modified, stampof(family).modified);
+}
+
+TEST_F(Backups, FolderCheck)
+{
+    EXPECT_FALSE(checkbackupfolder(prompts, folder));
+    EXPECT_TRUE(names().isEmpty()) << "the probe file is removed";
+
+    prompts.expect(answer::ok, QStringLiteral("does not exist. "));
+    EXPECT_TRUE(checkbackupfolder(prompts, dir.filePath(QStringLiteral("gone"))));
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(Backups, ReadOnlyFolderCannotBeWrittenTo)
+{
+    QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::ExeOwner);
+    if (QFile probe(QDir(folder).filePath(QStringLiteral("p"))); probe.open(QIODevice::WriteOnly)) {
+        probe.remove();
+        QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
+        GTEST_SKIP() << "running with rights that ignore folder permissions";
+    }
+    prompts.expect(answer::ok, QStringLiteral("can not be written to. ") + folder);
+    EXPECT_TRUE(checkbackupfolder(prompts, folder));
+    EXPECT_EQ(prompts.history().at(0).m.kind, icon::critical);
+    QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
+}
+
+TEST_F(Backups, CheckPathsStopsAtLogProblem)
+{
+    settings s;
+    s.keeplog = true;
+    s.logpath = dir.filePath(QStringLiteral("nofolder/censuslog.txt"));
+    s.backupfolder = dir.filePath(QStringLiteral("gone")); // not reported: the log check came first
+    prompts.expect(answer::ok, QStringLiteral("The current log file can not be written to ("));
+    EXPECT_TRUE(checkpaths(prompts, s));
+    EXPECT_EQ(prompts.unexpected(), 0);
+
+    s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+    s.backupfolder = folder;
+    EXPECT_FALSE(checkpaths(prompts, s));
+    EXPECT_TRUE(QFileInfo::exists(s.logpath)) << "a missing log is created";
+
+    s.keeplog = false;
+    s.logpath = dir.filePath(QStringLiteral("nofolder/censuslog.txt"));
+    EXPECT_FALSE(checkpaths(prompts, s));
+}
+
+TEST_F(Backups, RemoveOldNoneAndFew)
+{
+    put(QStringLiteral("other.ged"), 1);
+    prompts.expect(answer::ok, QStringLiteral("You have no Quillmark backup files to delete."));
+    removeoldbackups(prompts, folder);
+
+    for (int d = 1; d <= 5; ++d)
+        put(QStringLiteral("QM Backup 2021_03_0%1_12_00_00.ged").arg(d), d);
+    prompts.expect(answer::ok, QStringLiteral("You only have 5 Quillmark backup files and so none will be deleted"));
+    removeoldbackups(prompts, folder);
+    EXPECT_EQ(names().size(), 6);
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(Backups, RemoveOldKeepsFiveNewestByTime)
+{
+    // Names sort in the opposite order to their times.
+    for (int d = 1; d <= 7; ++d)
+        put(QStringLiteral("qm backup %1.GED").arg(8 - d), d);
+    prompts.expect(answer::no, QStringLiteral("2 Quillmark backup files will be deleted leaving you with the 5 most recent backups."));
+    removeoldbackups(prompts, folder);
+    EXPECT_EQ(names().size(), 7);
+    EXPECT_EQ(prompts.history().at(0).m.defaultanswer, answer::no);
+
+    QFile::setPermissions(QDir(folder).filePath(QStringLiteral("qm backup 7.GED")), QFileDevice::ReadOwner);
+    prompts.expect(answer::yes, QStringLiteral("2 Quillmark backup files"));
+    prompts.expect(answer::ok, QStringLiteral("Deleted 2 backup files."));
+    removeoldbackups(prompts, folder);
+    EXPECT_EQ(names(), (QStringList{QStringLiteral("qm backup 1.GED"), QStringLiteral("qm backup 2.GED"),
+                                    QStringLiteral("qm backup 3.GED"), QStringLiteral("qm backup 4.GED"),
+                                    QStringLiteral("qm backup 5.GED")}));
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(Backups, RemoveOldRenamesOldFormFirst)
+{
+    put(QStringLiteral("Backup  12.ged"), 9);
+    put(QStringLiteral("Backup  x.ged"), 10);
+    prompts.expect(answer::ok, QStringLiteral("You only have 1 Quillmark"));
+    removeoldbackups(prompts, folder);
+    EXPECT_EQ(names(), (QStringList{QStringLiteral("Backup  x.ged"), QStringLiteral("QM Backup 2021_03_09_12_00_00.ged")}));
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
