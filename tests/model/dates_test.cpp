@@ -1,0 +1,258 @@
+#include "model/dates.h"
+
+#include "model/gedcomindex.h"
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+using namespace Qt::StringLiterals;
+
+namespace {
+
+QDate d(int y, int m, int day)
+{
+    return QDate(y, m, day);
+}
+
+const std::optional<QDate> census1881 = QDate(1881, 4, 3);
+
+// Sets the default locale for the life of a test.
+class localeguard {
+public:
+    explicit localeguard(const QLocale& l) : old_(QLocale()) { QLocale::setDefault(l); }
+    ~localeguard() { QLocale::setDefault(old_); }
+
+private:
+    QLocale old_;
+};
+
+} // namespace
+
+TEST(Recognisedate, EnglishMonthsInAnyCase)
+{
+    for (const char* text : {"4 apr 1881", "04 APR 1881", "4 April 1881", "4-Apr-1881", "4 Apr. 1881",
+                             "April 4 1881", "apr 4, 1881", " 4  APR 1881 ", "4 aPrIl 1881"})
+        EXPECT_EQ(recognisedate(QString::fromLatin1(text), dateorder::dmy), d(1881, 4, 4)) << text;
+    EXPECT_EQ(recognisedate(u"3 Sept 1851", dateorder::dmy), d(1851, 9, 3));
+    EXPECT_EQ(recognisedate(u"APR 1881", dateorder::mdy), d(1881, 4, 1));
+    EXPECT_EQ(recognisedate(u"29 FEB 1852", dateorder::dmy), d(1852, 2, 29));
+}
+
+TEST(Recognisedate, RefusesWhatIsNotOneDay)
+{
+    for (const char* text : {"", "1881", "ABT 1881", "BET 1850 AND 1852", "31 FEB 1881", "29 FEB 1851",
+                             "0 APR 1881", "32 APR 1881", "4 Apr", "4/4/81", "4 AP 1881", "4 Aprilx 1881",
+                             "4 APR 1881 1882", "4 MAI 1881", "4 APR 18810", "4 APR 1881?", "13/13/1881",
+                             "4 APR 0000"})
+        EXPECT_FALSE(recognisedate(QString::fromLatin1(text), dateorder::dmy)) << text;
+}
+
+TEST(Recognisedate, NumericDatesFollowTheLocaleOrder)
+{
+    EXPECT_EQ(recognisedate(u"3/4/1881", dateorder::dmy), d(1881, 4, 3));
+    EXPECT_EQ(recognisedate(u"3/4/1881", dateorder::mdy), d(1881, 3, 4));
+    EXPECT_EQ(recognisedate(u"03.04.1881", dateorder::dmy), d(1881, 4, 3));
+    EXPECT_FALSE(recognisedate(u"3/4/1881", dateorder::ymd));
+    EXPECT_FALSE(recognisedate(u"13/4/1881", dateorder::mdy));
+    // Year first with four digits reads the same everywhere.
+    for (dateorder o : {dateorder::dmy, dateorder::mdy, dateorder::ymd})
+        EXPECT_EQ(recognisedate(u"1881-04-03", o), d(1881, 4, 3));
+
+    EXPECT_EQ(localedateorder(QLocale(QLocale::German, QLocale::Germany)), dateorder::dmy);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::English, QLocale::UnitedKingdom)), dateorder::dmy);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::English, QLocale::UnitedStates)), dateorder::mdy);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::Chinese, QLocale::China)), dateorder::ymd);
+}
+
+TEST(Recognisedate, TypedUnderAnyLocaleIsWrittenInEnglish)
+{
+    {
+        localeguard g(QLocale(QLocale::German, QLocale::Germany));
+        auto typed = recognisedate(u"3.4.1881");
+        ASSERT_TRUE(typed);
+        EXPECT_EQ(formatgedcomdate(*typed), "03 APR 1881");
+        EXPECT_EQ(formatgedcomdate(d(1881, 3, 3)), "03 MAR 1881"); // not "MÄR"
+        EXPECT_EQ(formatgedcommonth(d(1850, 10, 1)), "OCT 1850");  // not "OKT"
+        EXPECT_EQ(validdate(u"3.5.1881"_s, u"3 APR 1881"_s).newtext, u"03 MAY 1881"_s);
+    }
+    {
+        localeguard g(QLocale(QLocale::English, QLocale::UnitedStates));
+        auto typed = recognisedate(u"4/3/1881");
+        ASSERT_TRUE(typed);
+        EXPECT_EQ(formatgedcomdate(*typed), "03 APR 1881");
+    }
+}
+
+TEST(Formatgedcomdate, StampsAndMonths)
+{
+    EXPECT_EQ(formatgedcomdate(d(2026, 12, 4)), "04 DEC 2026");
+    EXPECT_EQ(formatgedcomdate(d(1851, 3, 30)), "30 MAR 1851");
+    EXPECT_EQ(formatgedcomdate(QDate()), "");
+    EXPECT_EQ(formatgedcomtime(QTime(9, 5, 7)), "09:05:07");
+    EXPECT_EQ(englishmonth(9), "SEP");
+    EXPECT_EQ(englishmonth(13), "");
+}
+
+TEST(Completedyears, CountsWholeYears)
+{
+    EXPECT_EQ(completedyears(d(1851, 3, 3), d(1881, 4, 3)), 30);
+    EXPECT_EQ(completedyears(d(1851, 4, 3), d(1881, 4, 3)), 30); // birthday on census day
+    EXPECT_EQ(completedyears(d(1851, 4, 4), d(1881, 4, 3)), 29);
+    EXPECT_EQ(completedyears(d(1851, 12, 31), d(1881, 4, 3)), 29);
+    EXPECT_EQ(completedyears(d(1881, 5, 1), d(1881, 4, 3)), 0);
+    EXPECT_EQ(completedyears(d(1883, 5, 1), d(1881, 4, 3)), -2);
+}
+
+TEST(Datephrase, PlainDatesAndTheirAges)
+{
+    auto r = datephrase(u"3 MAR 1851", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "on 3 Mar 1851");
+    EXPECT_TRUE(r.agecomputed);
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 30");
+    EXPECT_EQ(r.earliestyear, 1851);
+    EXPECT_EQ(r.latestyear, 1851);
+
+    // Born on 31 or on 1 March: 30 either way, so one age.
+    r = datephrase(u"MAR 1851", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "in Mar 1851");
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 30");
+
+    r = datephrase(u"1851", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "in 1851");
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 29 or 30");
+
+    r = datephrase(u"  12 apr 1851 ", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "on 12 Apr 1851");
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 29");
+}
+
+TEST(Datephrase, MonthYearLatestDayIsTheMonthsLast)
+{
+    // 29 FEB 1852 turns 29 on census day 1 MAR 1881; 1 FEB 1852 already has.
+    const std::optional<QDate> census = d(1881, 2, 29 - 1);
+    auto r = datephrase(u"FEB 1852", census, dateorder::dmy);
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 28 or 29");
+    r = datephrase(u"FEB 1852", d(1881, 3, 1), dateorder::dmy);
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 29");
+    r = datephrase(u"FEB 1851", d(1880, 2, 28), dateorder::dmy);
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 29"); // 28 days in 1851
+    r = datephrase(u"APR 1851", d(1881, 4, 30), dateorder::dmy);
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 30");
+}
+
+TEST(Datephrase, Qualifiers)
+{
+    auto r = datephrase(u"BET 1850 AND 1852", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "between 1850 and 1852");
+    EXPECT_FALSE(r.agecomputed);
+    EXPECT_EQ(r.agephrase, "");
+    EXPECT_EQ(r.earliestyear, -9999);
+
+    EXPECT_EQ(datephrase(u"aft 1851", census1881, dateorder::dmy).phrase, "after 1851");
+    EXPECT_EQ(datephrase(u"BEF 3 MAR 1851", census1881, dateorder::dmy).phrase, "before 3 Mar 1851");
+    EXPECT_EQ(datephrase(u"FROM 1850 TO 1852", census1881, dateorder::dmy).phrase,
+              "during a period from 1850 To 1852");
+    EXPECT_EQ(datephrase(u"TO 1852", census1881, dateorder::dmy).phrase, "during a period to 1852");
+    EXPECT_FALSE(datephrase(u"BEF 3 MAR 1851", census1881, dateorder::dmy).agecomputed);
+
+    r = datephrase(u"ABT 1851", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "in 1851 (approx.)");
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 29 or 30 (approx.)");
+    r = datephrase(u"EST 3 MAR 1851", census1881, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "on 3 Mar 1851 (estimated)");
+    EXPECT_EQ(r.agephrase, " and in this census would be aged 30 (estimated)");
+    r = datephrase(u"CAL MAR 1851", std::nullopt, dateorder::dmy);
+    EXPECT_EQ(r.phrase, "in Mar 1851 (calculated)");
+    EXPECT_EQ(r.agephrase, "");
+    EXPECT_EQ(datephrase(u"ABT", census1881, dateorder::dmy).phrase, "in (approx.)");
+}
+
+TEST(Datephrase, NoAgeWithoutCensusDayOrUsableDate)
+{
+    EXPECT_FALSE(datephrase(u"3 MAR 1851", std::nullopt, dateorder::dmy).agecomputed);
+    EXPECT_FALSE(datephrase(u"3 MAR 1851", u""_s).agecomputed);
+    EXPECT_FALSE(datephrase(u"3 MAR 1851", u"sometime in 1881"_s).agecomputed);
+    EXPECT_TRUE(datephrase(u"3 MAR 1851", u"3 APR 1881"_s).agecomputed);
+
+    for (const char* text : {"31 FEB 1851", "0 MAR 1851", "32 MAR 1851", "MARCH 1851", "XYZ 1851", "3 MAR 185",
+                             "3 MAR", "INT 3 MAR 1851 (BAPTISM)", "3  MAR 1851", ""}) {
+        auto r = datephrase(QString::fromLatin1(text), census1881, dateorder::dmy);
+        EXPECT_FALSE(r.agecomputed) << text;
+        EXPECT_EQ(r.earliestyear, -9999) << text;
+    }
+    // The year is the first four digits of the last word.
+    auto r = datephrase(u"1851/52", census1881, dateorder::dmy);
+    EXPECT_TRUE(r.agecomputed);
+    EXPECT_EQ(r.phrase, "in 1851/52");
+    EXPECT_EQ(r.latestyear, 1851);
+}
+
+TEST(Datephrase, WordStyles)
+{
+    // Words of two or more characters not starting with a digit are
+    // capitalised; single characters and numbers are lower case.
+    EXPECT_EQ(datephrase(u"@#DJULIAN@ 3 mar 1751", std::nullopt, dateorder::dmy).phrase, "in @#djulian@ 3 Mar 1751");
+    EXPECT_EQ(datephrase(u"3 MAR 1851 A", std::nullopt, dateorder::dmy).phrase, "on 3 Mar 1851 a");
+    EXPECT_EQ(datephrase(u"1851 and 1852", std::nullopt, dateorder::dmy).phrase, "in 1851 and 1852");
+    // Split at single spaces, twelve words at most: the last keeps the rest.
+    EXPECT_EQ(datephrase(u"3  MAR", std::nullopt, dateorder::dmy).phrase, "on 3  Mar");
+    EXPECT_EQ(datephrase(u"A B C D E F G H I J K LL MM", std::nullopt, dateorder::dmy).phrase,
+              "in a b c d e f g h i j k Ll mm");
+}
+
+TEST(Personinfo, TheLineForAnIndividual)
+{
+    personrec p;
+    p.name = "Smith, John";
+    p.hasbirthdate = true;
+    p.birthdate = "ABT 1851";
+    p.hasbirthplace = true;
+    p.birthplace = "Leeds";
+    EXPECT_EQ(personinfo(p, u"3 APR 1881"_s),
+              "John Smith was born in 1851 (approx.) in Leeds and in this census would be aged 29 or 30 (approx.).");
+    EXPECT_EQ(personinfo(p, u""_s), "John Smith was born in 1851 (approx.) in Leeds.");
+
+    p.hasbirthplace = false;
+    p.birthdate = "BET 1850 AND 1852";
+    EXPECT_EQ(personinfo(p, census1881, dateorder::dmy), "John Smith was born between 1850 and 1852.");
+
+    p.name = "Plato";
+    p.hasbirthdate = false;
+    p.hasbirthplace = true;
+    EXPECT_EQ(personinfo(p, census1881, dateorder::dmy), "Plato was born in Leeds.");
+
+    p.name = "";
+    EXPECT_EQ(personinfo(p, census1881, dateorder::dmy), "[No Name] was born in Leeds.");
+    p.name = "Smith";
+    p.hasbirthplace = false;
+    EXPECT_EQ(personinfo(p, census1881, dateorder::dmy), "");
+
+    p.name = "Brontë, Anne";
+    p.hasbirthdate = true;
+    p.birthdate = "17 JAN 1820";
+    EXPECT_EQ(personinfo(p, census1881, dateorder::dmy),
+              u"Anne Bront\u00eb was born on 17 Jan 1820 and in this census would be aged 61."_s);
+}
+
+TEST(Validdate, NormalisesTypedDates)
+{
+    auto r = validdate(u"4 apr 1881"_s, u"3 APR 1881"_s, dateorder::dmy);
+    EXPECT_TRUE(r.isdate);
+    EXPECT_EQ(r.newtext, u"04 APR 1881"_s);
+
+    // The official date stands as it is.
+    r = validdate(u"3 APR 1881"_s, u"3 APR 1881"_s, dateorder::dmy);
+    EXPECT_TRUE(r.isdate);
+    EXPECT_FALSE(r.newtext);
+    // Typed differently, the official day keeps the official spelling.
+    EXPECT_EQ(validdate(u" 03 apr 1881"_s, u"3 APR 1881"_s, dateorder::dmy).newtext, u"3 APR 1881"_s);
+    EXPECT_EQ(validdate(u"3/4/1881"_s, u"3 APR 1881"_s, dateorder::dmy).newtext, u"3 APR 1881"_s);
+    // Already in the written form: nothing to change.
+    EXPECT_FALSE(validdate(u"04 APR 1881"_s, u"3 APR 1881"_s, dateorder::dmy).newtext);
+    EXPECT_EQ(validdate(u"4 apr 1881"_s, u""_s, dateorder::dmy).newtext, u"04 APR 1881"_s);
+
+    r = validdate(u"ABT 1881"_s, u"3 APR 1881"_s, dateorder::dmy);
+    EXPECT_FALSE(r.isdate);
+    EXPECT_FALSE(r.newtext);
+    EXPECT_FALSE(validdate(u""_s, u"3 APR 1881"_s, dateorder::dmy).isdate);
+}
