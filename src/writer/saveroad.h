@@ -1,0 +1,50 @@
+#pragma once
+// The road every change to the family file takes, whichever feature asks for
+// it: refuse text the file cannot hold, refuse to write over a change made by
+// another program, make the backup, rewrite the file (safely: it is replaced in
+// one step or not at all), add the census log entry, note the new file stamp.
+// The caller shows the outcome's messages and reloads the file afterwards.
+
+#include "platform/filetime.h"
+#include "writer/rewritefile.h"
+
+#include <QString>
+
+namespace qm {
+
+struct gedcomindex;
+struct settings;
+
+enum class savestatus {
+    saved,
+    refused,       // nothing written: text the file cannot hold, or the rewrite found the entry out of date
+    changed,       // the file was changed by another program: reload it; nothing written
+    backupfailed,  // the backup could not be made; nothing written
+    rewritefailed, // the family file is as it was; the program ends after the message
+};
+
+struct saveoutcome {
+    savestatus status = savestatus::refused;
+    QString message;    // for the user unless saved
+    QString backuppath; // the backup made ("" when none)
+    bool logwritten = false;
+    QString logerror;   // after a save: the log entry could not be written (shown, the save stands)
+    filestamp newstamp; // after a save: the family file's new stamp
+    rewriteresult rewrite;
+
+    bool saved() const { return status == savestatus::saved; }
+    // A failed rewrite ends the program once its message has been shown.
+    bool fatal() const { return status == savestatus::rewritefailed; }
+};
+
+// Runs the road for one rewrite request over the index's family file.
+saveoutcome savechange(const gedcomindex& index, const settings& s, const rewriterequest& request);
+
+// Census entry: mode 1 of the above.
+saveoutcome saveentry(const gedcomindex& index, const settings& s, const censusentry& entry);
+
+// Tests: makes the rewrite meet an input it cannot open (as with a backup
+// taken away or made unreadable after it was written).
+void setinputfaultfortests(bool on);
+
+} // namespace qm

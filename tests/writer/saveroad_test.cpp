@@ -1,0 +1,221 @@
+#include "writer/saveroad.h"
+
+#include "log/censuslog.h"
+#include "model/gedcomindex.h"
+#include "platform/clock.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+#include "writer/linewriter.h"
+
+#include <QDir>
+#include <QFileInfo>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+using qmtest::readfile;
+
+namespace {
+
+// A family file of two individuals of the entry and, when asked, enough
+// others to make the rewrite flush several times before its end.
+std::string familybytes(int filler)
+{
+    std::string s = "0 HEAD\r\n1 CHAR ANSI\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n0 @I2@ INDI\r\n1 NAME Mary /Smith/\r\n";
+    for (int i = 3; i < 3 + filler; ++i)
+        s += "0 @I" + std::to_string(i) + "@ INDI\r\n1 NAME Filler Person Number " + std::to_string(i)
+            + " /Padding/\r\n1 BIRT\r\n2 DATE 1 JAN 1850\r\n2 PLAC Somewhere, Yorkshire, England\r\n";
+    s += "0 @S1@ SOUR\r\n1 TITL Census 1851 Leeds\r\n0 TRLR\r\n";
+    return s;
+}
+
+class SaveRoad : public ::testing::Test {
+protected:
+    void SetUp() override { prepare(0); }
+    void TearDown() override
+    {
+        setclockfortests(QDateTime());
+        setwritefaultfortests(writefault());
+        setinputfaultfortests(false);
+    }
+
+    void prepare(int filler)
+    {
+        ASSERT_TRUE(dir.isValid());
+        setclockfortests(QDateTime(QDate(2026, 12, 4), QTime(23, 50, 7)));
+        QDir(dir.path()).mkpath(QStringLiteral("backups"));
+        family = dir.filePath(QStringLiteral("family.ged"));
+        original = familybytes(filler);
+        qmtest::writefile(family, original);
+        setmodified(family, QDateTime(QDate(2024, 5, 6), QTime(7, 8, 9)).toMSecsSinceEpoch());
+        before = stampof(family);
+
+        index.gedcomfile = family;
+        index.gedcomdate = before;
+        index.encoding = textencoding::windows1252;
+        index.people.clear();
+        for (int id = 1; id <= 2 + filler; ++id) {
+            personrec p;
+            p.id = id;
+            index.people.push_back(p);
+        }
+        index.nextsourceid = 2;
+
+        s.backupfolder = dir.filePath(QStringLiteral("backups"));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        s.keeplog = true;
+
+        entry = censusentry();
+        entry.sourceid = QStringLiteral("2");
+        entry.title = QStringLiteral("Census 1851 Leeds HO107/2319 (John Smith)");
+        entry.place = QStringLiteral("Leeds, Yorkshire");
+        entry.reference = QStringLiteral("HO107/2319");
+        entry.sourcetext = QStringLiteral("John Smith Head 40\r\nMary Smith Wife 38");
+        entry.entrydate = QStringLiteral("30 MAR 1851");
+        entry.year = 1851;
+        for (int id : {1, 2}) {
+            selectionrec r;
+            r.id = id;
+            r.name = id == 1 ? QStringLiteral("Smith, John") : QStringLiteral("Smith, Mary");
+            r.age = id == 1 ? QStringLiteral("40") : QStringLiteral("38");
+            r.personindex = id - 1;
+            entry.selection.push_back(r);
+        }
+    }
+
+    QStringList backups() const { return QDir(s.backupfolder).entryList(QDir::Files); }
+    // Nothing but the family file is left beside it (no temporary files).
+    QStringList besidefamily() const
+    {
+        return QDir(dir.path()).entryList(QDir::Files | QDir::Hidden, QDir::Name);
+    }
+    void expectuntouched()
+    {
+        EXPECT_EQ(readfile(family), original);
+        EXPECT_EQ(stampof(family), before);
+        EXPECT_FALSE(QFileInfo::exists(s.logpath)) << "no log entry for a change not made";
+    }
+
+    QTemporaryDir dir;
+    QString family;
+    std::string original;
+    filestamp before;
+    gedcomindex index;
+    settings s;
+    censusentry entry;
+};
+
+} // namespace
+
+TEST_F(SaveRoad, SavesBacksUpAndLogs)
+{
+    const saveoutcome out = saveentry(index, s, entry);
+    ASSERT_TRUE(out.saved()) << out.message.toStdString();
+    EXPECT_EQ(QFileInfo(out.backuppath).fileName(), QStringLiteral("QM Backup 2026_12_04_23_50_07.ged"));
+    EXPECT_EQ(readfile(out.backuppath), original);
+    EXPECT_EQ(stampof(out.backuppath).modified, before.modified) << "the backup keeps the file's time";
+
+    const std::string now = readfile(family);
+    EXPECT_NE(now.find("0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n2 PLAC Leeds, Yorkshire\r\n"
+                       "2 AGE 40y\r\n2 SOUR @S2@\r\n"),
+              std::string::npos)
+        << now;
+    EXPECT_NE(now.find("0 @S2@ SOUR\r\n"), std::string::npos);
+    EXPECT_EQ(out.newstamp, stampof(family));
+    EXPECT_TRUE(out.logwritten);
+    const std::string log = readfile(s.logpath);
+    EXPECT_NE(log.find("Source created: Census 1851 Leeds HO107/2319 (John Smith) (ID: 2)\r\n"), std::string::npos);
+    EXPECT_NE(log.find("Name: Smith, Mary (2) : created census event\r\n"), std::string::npos);
+    EXPECT_EQ(besidefamily(), (QStringList{QStringLiteral("censuslog.txt"), QStringLiteral("family.ged")}));
+}
+
+TEST_F(SaveRoad, NoLogWhenOffAndLogFailureLeavesSave)
+{
+    s.keeplog = false;
+    saveoutcome out = saveentry(index, s, entry);
+    ASSERT_TRUE(out.saved());
+    EXPECT_FALSE(out.logwritten);
+    EXPECT_FALSE(QFileInfo::exists(s.logpath));
+
+    index.gedcomdate = out.newstamp;
+    s.keeplog = true;
+    s.logpath = dir.filePath(QStringLiteral("nofolder/censuslog.txt"));
+    out = saveentry(index, s, entry);
+    EXPECT_TRUE(out.saved());
+    EXPECT_FALSE(out.logwritten);
+    EXPECT_TRUE(out.logerror.startsWith(QStringLiteral("Quillmark was unable to add a log entry")));
+    EXPECT_EQ(backups().size(), 2);
+}
+
+TEST_F(SaveRoad, ChangedFileIsNeverWrittenOver)
+{
+    index.gedcomdate.modified -= 5000;
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::changed);
+    EXPECT_EQ(out.message, QDir::toNativeSeparators(family)
+                               + QStringLiteral(" has been modified by another application and will be reloaded."));
+    EXPECT_TRUE(backups().isEmpty());
+    expectuntouched();
+
+    index.gedcomdate = before;
+    index.gedcomdate.size += 1;
+    entry.chosenimages.push_back(imagechoice{});
+    EXPECT_TRUE(saveentry(index, s, entry).message.contains(QStringLiteral("will need to be reselected")));
+}
+
+TEST_F(SaveRoad, TextTheFileCannotHoldIsRefusedFirst)
+{
+    entry.selection[1].occupation = QStringLiteral("Weaver \u2227");
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::refused);
+    EXPECT_TRUE(out.message.contains(QStringLiteral("occupation of Smith, Mary"))) << out.message.toStdString();
+    EXPECT_TRUE(backups().isEmpty());
+    expectuntouched();
+}
+
+TEST_F(SaveRoad, FailedBackupWritesNothing)
+{
+    s.backupfolder = dir.filePath(QStringLiteral("missing"));
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::backupfailed);
+    EXPECT_TRUE(out.message.startsWith(QStringLiteral("There was an error when attempting to back up")));
+    EXPECT_FALSE(out.fatal());
+    expectuntouched();
+}
+
+// Every way the write can fail leaves the family file as it was, keeps the
+// backup and writes no log entry; the message is the one after which the
+// program closes.
+struct faultcase {
+    const char* name;
+    bool input;
+    writefault fault;
+};
+
+class SaveRoadFault : public SaveRoad, public ::testing::WithParamInterface<faultcase> {};
+
+TEST_P(SaveRoadFault, FamilyFileStaysByteForByte)
+{
+    prepare(30000); // several megabytes: the middle of the write is a real flush
+    ASSERT_GT(original.size(), 3u << 20);
+    setinputfaultfortests(GetParam().input);
+    setwritefaultfortests(GetParam().fault);
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::rewritefailed);
+    EXPECT_TRUE(out.fatal());
+    EXPECT_TRUE(out.message.startsWith(QStringLiteral("An error occurred (")));
+    EXPECT_TRUE(out.message.endsWith(QStringLiteral("): Census entry not added and program will close when you press OK")))
+        << out.message.toStdString();
+    expectuntouched();
+    ASSERT_EQ(backups().size(), 1);
+    EXPECT_EQ(readfile(out.backuppath), original);
+    EXPECT_EQ(besidefamily(), QStringList{QStringLiteral("family.ged")}) << "no temporary file left behind";
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    EveryStep, SaveRoadFault,
+    ::testing::Values(faultcase{"CannotOpenInput", true, {}}, faultcase{"CannotCreateOutput", false, {true, -1, false}},
+                      faultcase{"WriteErrorInTheMiddle", false, {false, 1500000, false}},
+                      faultcase{"CannotReplace", false, {false, -1, true}}),
+    [](const ::testing::TestParamInfo<faultcase>& i) { return std::string(i.param.name); });
