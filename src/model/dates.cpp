@@ -296,18 +296,52 @@ bool birthrange(const QList<QStringView>& used, dateorder order, QDate& earliest
 
 } // namespace
 
+namespace {
+
+// A date upper-cased and split into words, its qualifier recognised.
+struct datewords {
+    QString upper;
+    QList<QStringView> words; // views into upper
+    const qualifier* q = nullptr;
+    QList<QStringView> used;  // the words after the qualifier
+    bool canage = false;      // plain, ABT, EST or CAL
+};
+
+void splitdate(QStringView date, datewords& w)
+{
+    w.upper = date.trimmed().toString().toUpper();
+    w.words = splitwords(w.upper);
+    for (const qualifier& candidate : qualifiers)
+        if (w.words[0] == QLatin1StringView(candidate.word))
+            w.q = &candidate;
+    w.used = w.q ? w.words.sliced(1) : w.words;
+    w.canage = !w.q || !w.q->prefix;
+}
+
+} // namespace
+
+datephraseyears dateyears(QStringView date, const std::optional<QDate>& census, dateorder order)
+{
+    datephraseyears r;
+    datewords w;
+    splitdate(date, w);
+    QDate earliest, latest;
+    if (w.canage && census && census->isValid() && birthrange(w.used, order, earliest, latest)) {
+        r.agecomputed = true;
+        r.earliestyear = earliest.year();
+        r.latestyear = latest.year();
+    }
+    return r;
+}
+
 datephraseresult datephrase(QStringView date, const std::optional<QDate>& census, dateorder order)
 {
     datephraseresult r;
-    const QString upper = date.trimmed().toString().toUpper();
-    const QList<QStringView> words = splitwords(upper);
-
-    const qualifier* q = nullptr;
-    for (const qualifier& candidate : qualifiers)
-        if (words[0] == QLatin1StringView(candidate.word))
-            q = &candidate;
-    const QList<QStringView> used = q ? words.sliced(1) : words;
-    const bool canage = !q || !q->prefix;
+    datewords w;
+    splitdate(date, w);
+    const qualifier* q = w.q;
+    const QList<QStringView>& used = w.used;
+    const bool canage = w.canage;
 
     QString prefix;
     if (canage) {

@@ -66,6 +66,14 @@ datephraseresult datephrase(QStringView date, const std::optional<QDate>& census
 // census: the text of the census date box, recognised under the default locale.
 datephraseresult datephrase(QStringView date, const QString& censusdatetext);
 
+// Only the years of datephrase, for filtering long lists of individuals.
+struct datephraseyears {
+    bool agecomputed = false;
+    int earliestyear = -9999;
+    int latestyear = 9999;
+};
+datephraseyears dateyears(QStringView date, const std::optional<QDate>& census, dateorder order);
+
 // The line shown for an individual: "John Smith was born in 1851 (approx.) in
 // Leeds and in this census would be aged 29 or 30 (approx.)." Empty when the
 // individual has neither birth date nor birth place.

@@ -187,6 +187,21 @@ TEST(Datephrase, NoAgeWithoutCensusDayOrUsableDate)
     EXPECT_EQ(r.latestyear, 1851);
 }
 
+TEST(Datephrase, YearsAloneAgreeWithThePhrase)
+{
+    for (const char* text : {"3 MAR 1851", "MAR 1851", "FEB 1852", "1851", "ABT 1851", "CAL DEC 1849", "BET 1850 AND 1852",
+                             "AFT 1851", "31 FEB 1851", "1851/52", "ABT", ""}) {
+        for (const std::optional<QDate>& census : {census1881, std::optional<QDate>()}) {
+            auto full = datephrase(QString::fromLatin1(text), census, dateorder::dmy);
+            auto years = dateyears(QString::fromLatin1(text), census, dateorder::dmy);
+            EXPECT_EQ(years.agecomputed, full.agecomputed) << text;
+            EXPECT_EQ(years.earliestyear, full.earliestyear) << text;
+            EXPECT_EQ(years.latestyear, full.latestyear) << text;
+        }
+    }
+    EXPECT_EQ(dateyears(u"ABT 1851", census1881, dateorder::dmy).latestyear, 1851);
+}
+
 TEST(Datephrase, WordStyles)
 {
     // Words of two or more characters not starting with a digit are
