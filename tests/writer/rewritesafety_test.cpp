@@ -1,0 +1,256 @@
+// Safe writing of the family file: encodings kept, unencodable text refused
+// before anything is written, and a failure at any step leaving the file
+// byte for byte as it was.
+
+#include "writer/rewritefile.h"
+
+#include "model/loadgedcom.h"
+#include "platform/clock.h"
+#include "support/goldenfiles.h"
+#include "support/testfiles.h"
+#include "writer/linewriter.h"
+
+#include <QDir>
+#include <QFile>
+#include <QStringEncoder>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+using qmtest::readfile;
+using qmtest::writefile;
+
+namespace {
+
+const QDateTime fixedclock(QDate(2026, 12, 4), QTime(13, 5, 9));
+
+std::string familytext(const char* charset)
+{
+    return std::string("0 HEAD\r\n1 CHAR ") + charset
+           + "\r\n0 @I1@ INDI\r\n1 NAME Zo\xC3\xAB /Bront\xC3\xAB/\r\n1 CHAN\r\n2 DATE 1 JAN 2020\r\n"
+             "0 @S1@ SOUR\r\n1 TITL Census\r\n0 TRLR\r\n";
+}
+
+std::string expectedtext(const char* charset)
+{
+    return std::string("0 HEAD\r\n1 CHAR ") + charset
+           + "\r\n0 @I1@ INDI\r\n1 NAME Zo\xC3\xAB /Bront\xC3\xAB/\r\n"
+             "1 CENS\r\n2 DATE 3 APR 1881\r\n2 PLAC Haworth\r\n2 AGE 30y\r\n2 SOUR @S2@\r\n"
+             "1 OCCU Cur\xC3\xA9\r\n2 DATE 3 APR 1881\r\n2 PLAC Haworth\r\n2 SOUR @S2@\r\n"
+             "1 CHAN\r\n2 DATE 04 DEC 2026\r\n3 TIME 13:05:09\r\n"
+             "0 @S1@ SOUR\r\n1 TITL Census\r\n"
+             "0 @S2@ SOUR\r\n1 TITL Census 1881 Haworth\r\n1 _TYPE Census\r\n1 TEXT Zo\xC3\xAB Bront\xC3\xAB\tHead\r\n"
+             "1 CHAN\r\n2 DATE 04 DEC 2026\r\n3 TIME 13:05:09\r\n0 TRLR\r\n";
+}
+
+// UTF-8 text in a file's encoding.
+std::string encoded(const std::string& utf8, textencoding enc, bool bom)
+{
+    const QString text = QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
+    QByteArray bytes;
+    if (enc == textencoding::windows1252) {
+        std::string out;
+        fromutf8(utf8, textencoding::windows1252, out);
+        return out;
+    }
+    const auto kind = enc == textencoding::utf16le   ? QStringConverter::Utf16LE
+                      : enc == textencoding::utf16be ? QStringConverter::Utf16BE
+                                                     : QStringConverter::Utf8;
+    QStringEncoder encoder(kind, bom ? QStringConverter::Flag::WriteBom : QStringConverter::Flag::Default);
+    bytes = encoder.encode(text);
+    return std::string(bytes.constData(), static_cast<size_t>(bytes.size()));
+}
+
+rewriterequest entry(const gedcomindex& ix)
+{
+    rewriterequest r;
+    r.entry.sourceid = QString::number(ix.nextsourceid);
+    r.entry.title = QStringLiteral("Census 1881 Haworth");
+    r.entry.place = QStringLiteral("Haworth");
+    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry.sourcetext = QString::fromUtf8("Zo\xC3\xAB Bront\xC3\xAB\tHead");
+    selectionrec p;
+    p.id = 1;
+    p.name = QStringLiteral("Bronte, Zoe");
+    p.age = QStringLiteral("30");
+    p.occupation = QString::fromUtf8("Cur\xC3\xA9");
+    p.personindex = 0;
+    r.entry.selection.push_back(p);
+    return r;
+}
+
+struct encodingcase {
+    const char* name;
+    textencoding enc;
+    bool bom;
+    const char* charset;
+};
+
+class RewriteEncoding : public ::testing::TestWithParam<encodingcase> {
+protected:
+    void SetUp() override { setclockfortests(fixedclock); }
+    void TearDown() override { setclockfortests(QDateTime()); }
+};
+
+class RewriteFaults : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        setclockfortests(fixedclock);
+        input = familytext("UTF-8");
+        family = dir.filePath(QStringLiteral("family.ged"));
+        backup = dir.filePath(QStringLiteral("QM Backup 20261204130509.ged"));
+        writefile(family, input);
+        writefile(backup, input);
+        ix = loadgedcombytes(input, {});
+    }
+    void TearDown() override
+    {
+        setwritefaultfortests({});
+        setclockfortests(QDateTime());
+    }
+    // The family file as it was, and nothing else left in its folder.
+    void expectuntouched()
+    {
+        EXPECT_EQ(readfile(family), input);
+        EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files | QDir::Hidden).size(), 2)
+            << QDir(dir.path()).entryList(QDir::Files | QDir::Hidden).join(QLatin1Char(' ')).toStdString();
+    }
+
+    QTemporaryDir dir;
+    std::string input;
+    QString family, backup;
+    std::unique_ptr<gedcomindex> ix;
+};
+
+} // namespace
+
+TEST_P(RewriteEncoding, WritesTheFileBackInItsOwnEncoding)
+{
+    const encodingcase& c = GetParam();
+    const std::string input = encoded(familytext(c.charset), c.enc, c.bom);
+    auto ix = loadgedcombytes(input, {});
+    ASSERT_TRUE(ix);
+    std::string out;
+    const rewriteresult r = rewritebytes(input, out, *ix, settings{}, entry(*ix));
+    ASSERT_TRUE(r.ok) << r.message.toStdString();
+    EXPECT_TRUE(qmtest::samebytes(encoded(expectedtext(c.charset), c.enc, c.bom), out));
+
+    // Line ends of any kind come back as CR LF.
+    std::string lf = familytext(c.charset);
+    for (size_t at; (at = lf.find("\r\n")) != std::string::npos;)
+        lf.erase(at, 1);
+    std::string outlf;
+    ASSERT_TRUE(rewritebytes(encoded(lf, c.enc, c.bom), outlf, *ix, settings{}, entry(*ix)).ok);
+    EXPECT_TRUE(qmtest::samebytes(out, outlf));
+}
+
+INSTANTIATE_TEST_SUITE_P(Encodings, RewriteEncoding,
+                         ::testing::Values(encodingcase{"utf8", textencoding::utf8, false, "UTF-8"},
+                                           encodingcase{"utf8bom", textencoding::utf8, true, "UTF-8"},
+                                           encodingcase{"utf16lebom", textencoding::utf16le, true, "UNICODE"},
+                                           encodingcase{"utf16le", textencoding::utf16le, false, "UNICODE"},
+                                           encodingcase{"utf16bebom", textencoding::utf16be, true, "UNICODE"},
+                                           encodingcase{"utf16be", textencoding::utf16be, false, "UNICODE"},
+                                           encodingcase{"windows1252", textencoding::windows1252, false, "ANSI"}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(RewriteRefusal, TextTheEncodingCannotHoldIsRefusedBeforeAnythingIsWritten)
+{
+    QTemporaryDir dir;
+    const QString family = dir.filePath(QStringLiteral("family.ged"));
+    const std::string input = encoded(familytext("ANSI"), textencoding::windows1252, false);
+    writefile(family, input);
+    auto ix = loadgedcombytes(input, {});
+    rewriterequest r = entry(*ix);
+    r.entry.place = QString::fromUtf8("\xC5\x81\xC3\xB3""d\xC5\xBA"); // Łódź: Ł is not in Windows-1252
+
+    const rewriteresult res = rewritefile(family, family, *ix, settings{}, r);
+    EXPECT_FALSE(res.ok);
+    EXPECT_TRUE(res.refused);
+    EXPECT_TRUE(res.message.contains(QStringLiteral("place"))) << res.message.toStdString();
+    EXPECT_TRUE(res.message.contains(QStringLiteral("U+0141"))) << res.message.toStdString();
+    EXPECT_EQ(checkencodable(r, settings{}, textencoding::windows1252), res.message);
+    EXPECT_EQ(readfile(family), input);
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files | QDir::Hidden).size(), 1);
+
+    // The same text is fine in UTF-8 and UTF-16; for other character sets only ASCII is typed.
+    EXPECT_TRUE(checkencodable(r, settings{}, textencoding::utf8).isEmpty());
+    EXPECT_TRUE(checkencodable(r, settings{}, textencoding::utf16be).isEmpty());
+    r.entry.place = QStringLiteral("Haworth");
+    EXPECT_FALSE(checkencodable(r, settings{}, textencoding::other8bit).isEmpty()); // the occupation Curé
+    EXPECT_TRUE(checkencodable(r, settings{}, textencoding::windows1252).isEmpty());
+}
+
+TEST(RewriteRefusal, OtherCharacterSetsKeepTheirBytesAndTakeAsciiText)
+{
+    // An ANSEL file: its bytes are kept, whatever they mean.
+    const std::string input = "0 HEAD\r\n1 CHAR ANSEL\r\n0 @I1@ INDI\r\n1 NAME Ren\xE2""e /Doe/\r\n0 TRLR\r\n";
+    auto ix = loadgedcombytes(input, {});
+    rewriterequest r = entry(*ix);
+    r.entry.selection[0].occupation = QStringLiteral("Cure");
+    r.entry.sourcetext = QStringLiteral("Renee Doe");
+    std::string out;
+    ASSERT_TRUE(rewritebytes(input, out, *ix, settings{}, r).ok);
+    EXPECT_NE(out.find("1 NAME Ren\xE2""e /Doe/\r\n1 CENS\r\n"), std::string::npos);
+}
+
+TEST_F(RewriteFaults, FailuresLeaveTheFamilyFileAsItWas)
+{
+    const rewriterequest r = entry(*ix);
+    const QString expected =
+        QStringLiteral("An error occurred (Permission denied): Census entry not added and program will close when you press OK");
+
+    setwritefaultfortests({.failopen = true});
+    rewriteresult res = rewritefile(backup, family, *ix, settings{}, r);
+    EXPECT_FALSE(res.ok);
+    EXPECT_FALSE(res.refused);
+    EXPECT_EQ(res.message, expected);
+    expectuntouched();
+
+    const auto size = static_cast<int64_t>(expectedtext("UTF-8").size());
+    for (int64_t after : {int64_t(0), int64_t(1), int64_t(40), size / 2, size - 1}) {
+        setwritefaultfortests({.failafterbytes = after});
+        res = rewritefile(backup, family, *ix, settings{}, r);
+        EXPECT_FALSE(res.ok) << after;
+        EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (No space left on device): Census entry")))
+            << res.message.toStdString();
+        expectuntouched();
+    }
+
+    setwritefaultfortests({.failcommit = true});
+    res = rewritefile(backup, family, *ix, settings{}, r);
+    EXPECT_FALSE(res.ok);
+    expectuntouched();
+
+    // The same run without a fault goes through, also reading the family file itself.
+    setwritefaultfortests({});
+    res = rewritefile(family, family, *ix, settings{}, r);
+    EXPECT_TRUE(res.ok) << res.message.toStdString();
+    EXPECT_EQ(readfile(family), expectedtext("UTF-8"));
+}
+
+TEST_F(RewriteFaults, FilesThatCannotBeOpenedAreReported)
+{
+    const rewriterequest r = entry(*ix);
+    rewriteresult res = rewritefile(dir.filePath(QStringLiteral("missing.ged")), family, *ix, settings{}, r);
+    EXPECT_FALSE(res.ok);
+    EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (")));
+    EXPECT_TRUE(res.message.endsWith(QStringLiteral("): Census entry not added and program will close when you press OK")));
+    expectuntouched();
+
+    res = rewritefile(backup, dir.filePath(QStringLiteral("no such folder/family.ged")), *ix, settings{}, r);
+    EXPECT_FALSE(res.ok);
+    expectuntouched();
+}
+
+TEST(RewriteMessages, EachModeHasItsOwnFailureText)
+{
+    EXPECT_EQ(rewritefailuremessage(rewritemode::censusdates, QStringLiteral("Disk full")),
+              QStringLiteral("An error occurred (Disk full): Dates were not changed and program will close when you press OK"));
+    EXPECT_EQ(rewritefailuremessage(rewritemode::flagchanges, QStringLiteral("x")),
+              QStringLiteral("An error occurred (x): Flags were not changed and program will close when you press OK"));
+    EXPECT_EQ(rewritefailuremessage(rewritemode::attachimages, QStringLiteral("x")),
+              QStringLiteral("An error occurred (x): Images not attached and program will close when you press OK"));
+}
