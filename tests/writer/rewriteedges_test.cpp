@@ -1,0 +1,261 @@
+// Placement rules and edge cases of the rewrite, checked on the lines they
+// concern, and the small formats shared by the record writers.
+
+#include "writer/rewritefile.h"
+
+#include "model/loadgedcom.h"
+#include "platform/clock.h"
+#include "writer/linewriter.h"
+#include "writer/recordwriters.h"
+
+#include <QLocale>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+
+std::vector<std::string> lines(const std::string& bytes)
+{
+    std::vector<std::string> out;
+    size_t start = 0;
+    for (size_t at; (at = bytes.find("\r\n", start)) != std::string::npos; start = at + 2)
+        out.push_back(bytes.substr(start, at - start));
+    return out;
+}
+
+size_t lineat(const std::vector<std::string>& ls, const std::string& line)
+{
+    for (size_t i = 0; i < ls.size(); ++i)
+        if (ls[i] == line)
+            return i;
+    return std::string::npos;
+}
+
+std::vector<std::string> multiline(std::string_view text, std::string_view first, std::string_view cont)
+{
+    linewriter w(textencoding::utf8, false);
+    w.openmemory();
+    writemultiline(w, text, first, cont);
+    return lines(w.memory());
+}
+
+selectionrec who(int32_t id, int32_t personindex, const char* occupation = "")
+{
+    selectionrec s;
+    s.id = id;
+    s.personindex = personindex;
+    s.name = QStringLiteral("Someone");
+    s.age = QStringLiteral("40");
+    s.occupation = QString::fromUtf8(occupation);
+    return s;
+}
+
+struct run {
+    rewriteresult result;
+    std::vector<std::string> out;
+};
+
+run rewrite(const std::string& input, const settings& s, const rewriterequest& r, const flagtable& defs = {})
+{
+    auto ix = loadgedcombytes(input, defs);
+    std::string out;
+    run x;
+    x.result = rewritebytes(input, out, *ix, s, r);
+    x.out = lines(out);
+    return x;
+}
+
+class RewriteEdges : public ::testing::Test {
+protected:
+    void SetUp() override { setclockfortests(QDateTime(QDate(2026, 5, 4), QTime(7, 8, 9))); }
+    void TearDown() override
+    {
+        setclockfortests(QDateTime());
+        QLocale::setDefault(QLocale::c());
+    }
+};
+
+} // namespace
+
+TEST(RecordFormats, MultiLineTextsSplitAtEveryKindOfLineBreak)
+{
+    using v = std::vector<std::string>;
+    EXPECT_EQ(multiline("a\r\nb\nc\rd", "4 TEXT ", "5 CONT "), (v{"4 TEXT a", "5 CONT b", "5 CONT c", "5 CONT d"}));
+    EXPECT_EQ(multiline("one\r\n\r\nthree", "4 TEXT ", "5 CONT "), (v{"4 TEXT one", "5 CONT ", "5 CONT three"}));
+    EXPECT_EQ(multiline("note\r\n", "3 NOTE ", "4 CONT "), (v{"3 NOTE note"}));
+    EXPECT_EQ(multiline("note\n\n", "3 NOTE ", "4 CONT "), (v{"3 NOTE note", "4 CONT "}));
+    EXPECT_EQ(multiline("", "1 TEXT ", "2 CONT "), (v{"1 TEXT "}));
+    EXPECT_EQ(multiline("", "1 CONT ", "1 CONT "), v{});
+    EXPECT_EQ(multiline("  kept as typed  ", "1 NOTE ", "2 CONT "), (v{"1 NOTE   kept as typed  "}));
+}
+
+TEST(RecordFormats, OneLineValuesNeverCarryALineBreak)
+{
+    EXPECT_EQ(oneline(QStringLiteral(" Leeds\r\nYorkshire\nEngland\r ")), "Leeds Yorkshire England");
+    EXPECT_EQ(censusyear(QStringLiteral("30 MAR 1851"), 0), "1851");
+    EXPECT_EQ(censusyear(QStringLiteral("1851"), 0), "1851");
+    EXPECT_EQ(censusyear(QStringLiteral("MAR 18511"), 1851), "1851");
+}
+
+TEST_F(RewriteEdges, DatesUseEnglishMonthsWhateverTheLocale)
+{
+    QLocale::setDefault(QLocale(QLocale::German, QLocale::Germany));
+    EXPECT_EQ(gedcomtoday(), "04 MAY 2026");
+    EXPECT_EQ(gedcomtimenow(), "07:08:09");
+    setclockfortests(QDateTime(QDate(987, 12, 31), QTime(23, 59, 59)));
+    EXPECT_EQ(gedcomtoday(), "31 DEC 0987");
+}
+
+TEST_F(RewriteEdges, FirstSourceAndFirstImagesGoBeforeTheirFirstFollowers)
+{
+    // No source and no multimedia record yet: the new source (number 1) goes
+    // before the first submitter record, the images before the first note.
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME A\r\n0 @N1@ NOTE x\r\n0 @U1@ SUBM\r\n0 TRLR\r\n";
+    rewriterequest r;
+    r.entry.sourceid = QStringLiteral("1");
+    r.entry.title = QStringLiteral("Census 1881 Leeds");
+    r.entry.place = QStringLiteral("Leeds\r\nYorkshire");
+    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry.selection = {who(1, 0, "-")};
+    imagechoice img;
+    img.objectid = 1;
+    img.isnew = true;
+    r.entry.chosenimages = {img};
+    const run x = rewrite(input, settings{}, r);
+    ASSERT_TRUE(x.result.ok) << x.result.message.toStdString();
+    EXPECT_LT(lineat(x.out, "0 @O1@ OBJE"), lineat(x.out, "0 @N1@ NOTE x"));
+    EXPECT_EQ(lineat(x.out, "0 @S1@ SOUR") + 9, lineat(x.out, "0 @U1@ SUBM")); // TITL, _TYPE, TEXT, OBJE, _ASID, CHAN
+    EXPECT_NE(lineat(x.out, "2 PLAC Leeds Yorkshire"), std::string::npos);
+    // A one-character occupation gives no OCCU, but the record still gets a change stamp.
+    EXPECT_EQ(lineat(x.out, "1 OCCU -"), std::string::npos);
+    EXPECT_EQ(x.out[lineat(x.out, "0 @N1@ NOTE x") - 3], "1 CHAN");
+    EXPECT_EQ(x.result.maxobjectid, 1);
+    EXPECT_EQ(x.result.censusblocks, 1);
+}
+
+TEST_F(RewriteEdges, TheFirstSharedNoteIsNumberOneAndTheCountersComeBack)
+{
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n0 @R1@ REPO\r\n0 TRLR\r\n";
+    settings s;
+    s.fullentry = false;
+    s.sharednote = true;
+    rewriterequest r;
+    r.entry.sourceid = QStringLiteral("7");
+    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry.selection = {who(1, 0)};
+    const run x = rewrite(input, s, r);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.result.maxnoteid, 1);
+    EXPECT_EQ(lineat(x.out, "0 @N1@ NOTE Census 1881 ") + 6, lineat(x.out, "0 @R1@ REPO"));
+    EXPECT_NE(lineat(x.out, "3 NOTE @N1@"), std::string::npos);
+    EXPECT_EQ(newnotenumber(-1), 1);
+    EXPECT_EQ(newnotenumber(0), 1);
+    EXPECT_EQ(newnotenumber(12), 13);
+}
+
+TEST_F(RewriteEdges, IndentedLinesAreRecognisedAndKept)
+{
+    const std::string input = "0 HEAD\r\n  0 @I1@ INDI\r\n\t1 NAME A\r\n  1 CHAN\r\n    2 DATE 1 JAN 2000\r\n  0 TRLR\r\n";
+    rewriterequest r;
+    r.entry.sourceid = QStringLiteral("1");
+    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry.selection = {who(1, 0)};
+    const run x = rewrite(input, settings{}, r);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.out[2], "\t1 NAME A");
+    EXPECT_EQ(x.out[3], "1 CENS");
+    EXPECT_EQ(lineat(x.out, "    2 DATE 1 JAN 2000"), std::string::npos);
+    EXPECT_EQ(x.out.back(), "  0 TRLR");
+}
+
+TEST_F(RewriteEdges, WhatCannotBeFoundStopsTheRunWithTheFileUntouched)
+{
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n0 @S1@ SOUR\r\n0 TRLR\r\n";
+    rewriterequest r;
+    r.entry.sourceid = QStringLiteral("2");
+    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry.selection = {who(1, 0), who(9, -1)};
+    run x = rewrite(input, settings{}, r);
+    EXPECT_FALSE(x.result.ok);
+    EXPECT_TRUE(x.result.refused);
+    EXPECT_TRUE(x.result.message.contains(QStringLiteral("Someone (9)"))) << x.result.message.toStdString();
+    EXPECT_TRUE(x.out.empty());
+
+    rewriterequest a;
+    a.mode = rewritemode::attachimages;
+    a.entry.sourceid = QStringLiteral("5");
+    a.entry.title = QStringLiteral("Census 1881");
+    imagechoice img;
+    img.objectid = 3;
+    a.entry.chosenimages = {img};
+    x = rewrite(input, settings{}, a);
+    EXPECT_TRUE(x.result.refused);
+    EXPECT_TRUE(x.result.message.contains(QStringLiteral("(ID: 5)")));
+}
+
+TEST_F(RewriteEdges, FlagUseGivesTheFlagOnceAndCountsIt)
+{
+    flagtable defs{{"__C1881", "Census 1881", "1881", 0, "UK"}, {"__C1891", "Census 1891", "1891", 0, "USA"}};
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n1 _FLGS\r\n2 __C1881 Census 1881\r\n"
+                              "0 @I2@ INDI\r\n1 _FLGS\r\n2 __C18811 Other\r\n0 TRLR\r\n";
+    settings s;
+    s.flaguse = true;
+    rewriterequest r;
+    r.entry.sourceid = QStringLiteral("1");
+    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry.selection = {who(1, 0), who(2, 1)};
+    run x = rewrite(input, s, r, defs);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.result.entryflag, std::optional<size_t>(0));
+    EXPECT_EQ(x.result.flaggiven, 1);
+    EXPECT_EQ(std::count(x.out.begin(), x.out.end(), "1 _FLGS"), 2);
+    EXPECT_EQ(std::count(x.out.begin(), x.out.end(), "2 __C1881 Census 1881"), 2);
+
+    // No flag of the configured country for that census: nothing is given.
+    s.country = QStringLiteral("USA");
+    x = rewrite(input, s, r, defs);
+    EXPECT_FALSE(x.result.entryflag.has_value());
+    EXPECT_EQ(std::count(x.out.begin(), x.out.end(), "2 __C1881 Census 1881"), 1);
+}
+
+TEST_F(RewriteEdges, FlagRemovalComparesWholeCodesAndKeepsOtherLines)
+{
+    flagtable defs{{"__C1881", "Census 1881", "1881", 0, "UK"}};
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n1 _FLGS\r\n2 __C18811 Longer\r\n2 __C1881 Census 1881\r\n"
+                              "2 LIVING Hand-made\r\n1 CHAN\r\n2 DATE 1 JAN 2000\r\n0 TRLR\r\n";
+    rewriterequest r;
+    r.mode = rewritemode::flagchanges;
+    r.flagchanges = {{0, 0, false}};
+    const run x = rewrite(input, settings{}, r, defs);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.out, (std::vector<std::string>{"0 HEAD", "0 @I1@ INDI", "1 _FLGS", "2 __C18811 Longer",
+                                               "2 LIVING Hand-made", "1 CHAN", "2 DATE 04 MAY 2026", "3 TIME 07:08:09",
+                                               "0 TRLR"}));
+}
+
+TEST_F(RewriteEdges, OccupationDatesChangeOnlyWithAMatchingCensusCitation)
+{
+    const std::string input = "0 HEAD\r\n"
+                              "0 @I1@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n2 SOUR @S1@\r\n"
+                              "1 OCCU Weaver\r\n2 DATE 1881\r\n2 PLAC Leeds\r\n2 SOUR @S2@\r\n" // other source: kept
+                              "1 OCCU Spinner\r\n2 DATE 1881\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"    // changed
+                              "0 @I2@ INDI\r\n1 OCCU Carter\r\n2 DATE 1881\r\n2 SOUR @S1@\r\n"  // no census event
+                              "0 TRLR\r\n";
+    rewriterequest r;
+    r.mode = rewritemode::censusdates;
+    datechange d;
+    d.founddate = QStringLiteral("1881");
+    d.newdate = QStringLiteral("3 APR 1881");
+    r.datechanges = {d};
+    const run x = rewrite(input, settings{}, r);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.result.censusdateschanged, 1);
+    EXPECT_EQ(x.result.occdateschanged, 1);
+    EXPECT_EQ(x.out, (std::vector<std::string>{
+                         "0 HEAD", "0 @I1@ INDI", "1 CENS", "2 DATE 3 APR 1881", "2 SOUR @S1@", "1 OCCU Weaver",
+                         "2 DATE 1881", "2 PLAC Leeds", "2 SOUR @S2@", "1 OCCU Spinner", "2 DATE 3 APR 1881", "2 NOTE x",
+                         "2 SOUR @S1@", "1 CHAN", "2 DATE 04 MAY 2026", "3 TIME 07:08:09", "0 @I2@ INDI", "1 OCCU Carter",
+                         "2 DATE 1881", "2 SOUR @S1@", "0 TRLR"}));
+}
