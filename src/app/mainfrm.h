@@ -1,0 +1,148 @@
+#pragma once
+// The main window: the family file open, the census entry form, the household
+// being put together and the menus. It owns the whole working state of the
+// program (index, settings, household); the prompts and the settings store are
+// handed in by main() (tests hand in scripted prompts and an INI store).
+
+#include "app/recentfiles.h"
+#include "census/selection.h"
+#include "model/gedcomindex.h"
+#include "settings/settings.h"
+
+#include <QMainWindow>
+
+#include <array>
+#include <memory>
+
+class QAction;
+class QLabel;
+class QPushButton;
+class QStackedWidget;
+
+namespace qm {
+
+class entrypanel;
+class householdpanel;
+class prompts;
+class settingsstore;
+
+class mainfrm : public QMainWindow {
+    Q_OBJECT
+public:
+    mainfrm(prompts& p, settingsstore& store, QWidget* parent = nullptr);
+    ~mainfrm() override;
+
+    // Start-up: places the window, chooses the family file (command line,
+    // default file, Open dialog) and loads it. False when the user cancelled
+    // the choice: the program then ends without showing the window.
+    bool start(const QStringList& arguments);
+    // Shows the window as it was placed (maximised when it was closed so).
+    void showplaced();
+
+    const gedcomindex* index() const { return index_.get(); }
+    const householdrows& household() const { return rows_; }
+    const settings& currentsettings() const { return settings_; }
+    const recentfiles& recent() const { return recent_; }
+    QString gedcomfile() const { return gedcomfile_; }
+    bool firststart() const { return firststart_; }
+    bool watching() const { return watchfile_; }
+    entrypanel* panel() const; // the panel of the current source mode
+
+public slots:
+    void openfamilyfile(const QString& path);
+    // The application has become active: reload when the file changed.
+    void checkonactivate();
+    void reload();
+    // "Save Census Entry" (addbut, savemen): filled by the entry save.
+    void saveentry();
+
+protected:
+    void closeEvent(QCloseEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
+private:
+    // construction (mainfrm.cpp)
+    void buildmenus();
+    void buildform();
+    void placewindow();
+    void rememberfile(const QString& path, bool fromopen);
+    void showrecentfiles();
+    void settitleandpanel();
+    bool loadfile();
+    void afterload();
+    void editmenuopening();
+    void clearall();
+    void comingsoon();
+    std::optional<QString> askforfile(bool startup);
+
+    // census year and form (mainfrm.cpp)
+    void fillyears();
+    void yearchosen(int item);
+    void refreshtitle();
+    void datechanged();
+    bool censusdateok(bool normalise);
+
+    // the household (household_ui.cpp)
+    void fillallpeople();
+    void fillalivepeople();
+    void fillfamily(int32_t k);
+    void showallclicked();
+    void peopleclicked(int row);
+    void familyclicked(int row);
+    void selectperson(int32_t k);
+    bool checkages();
+    void storerows();
+    void showrows(int t);
+    void scrollup();
+    void scrolldown();
+    void deleterow(int r);
+    void inforow(int r);
+    void showpersoninfo(int32_t k);
+    void clearentry();
+    void findclicked();
+    // Shows the Find dialog starting at people[start]; the individual chosen, or -1.
+    int32_t runfind(int32_t start);
+    void pullrows();
+    void pushrows();
+
+    prompts& prompts_;
+    settingsstore& store_;
+
+    settings settings_;
+    bool firststart_ = false;
+    std::unique_ptr<gedcomindex> index_;
+    QString gedcomfile_;
+    QString defaultfile_;
+    QString gedcomfolder_;
+    recentfiles recent_;
+    int sourcemode_ = 0; // 0 a new source per entry, 1 an existing source cited
+    QString lastrefprefix_;
+    double divider_ = 1;
+    bool maximise_ = false;
+
+    householdrows rows_;
+    bool watchfile_ = false;
+    bool checking_ = false;
+    bool reloading_ = false;
+    int32_t findresult_ = -1;
+    bool fromfind_ = false;
+
+    // controls
+    QStackedWidget* panels_ = nullptr;
+    std::array<entrypanel*, 2> panel_{};
+    householdpanel* household_ = nullptr;
+    QLabel* infolab_ = nullptr;
+    QPushButton* addbut_ = nullptr;
+    QPushButton* Autosourcebut_ = nullptr;
+    QPushButton* reloadbut_ = nullptr;
+    QPushButton* findbut_ = nullptr;
+    std::array<QAction*, recentfiles::slotcount> RecentFilesmen_{};
+    QAction* recentseparator_ = nullptr;
+    QAction* viewlogmen_ = nullptr;
+    QAction* attachbut_ = nullptr;
+    QAction* copymen_ = nullptr;
+    QAction* cutmen_ = nullptr;
+    QAction* pastemen_ = nullptr;
+};
+
+} // namespace qm

@@ -1,0 +1,48 @@
+#pragma once
+// Start-up rules of the main window that need no widgets: the file named on
+// the command line, the window title, the window placement kept in the
+// settings store, and when to ask about the default file.
+
+#include <QString>
+#include <QStringList>
+
+#include <optional>
+
+namespace qm {
+
+class settingsstore;
+
+// The family file named on the command line (the arguments after the program
+// name), or nothing. The arguments are joined and trimmed; a text of two
+// characters or fewer names no file; surrounding quotes are removed.
+std::optional<QString> commandlinefile(const QStringList& arguments);
+
+// "Quillmark v1.0", with ".revision" when the revision is not 0.
+QString versiontitle();
+// The version title + " - " + the file name of the family file.
+QString windowtitle(const QString& gedcomfile);
+
+// The window's last placement, in twips (1440 per logical inch).
+struct placement {
+    std::optional<int> top, left, width, height; // restored in this order, up to the first missing
+    bool maximised = false;
+    bool centre = false;   // all four present but "Main Maximised" missing or empty
+    double divider = 1;    // source text height over source note height
+    bool complete() const { return top && left && width && height; }
+};
+
+placement readplacement(const settingsstore& store);
+void writeplacement(settingsstore& store, bool maximised, int top, int left, int width, int height, double divider);
+
+int twipstopixels(int twips, double dpi);
+int pixelstotwips(int pixels, double dpi);
+
+// Whether to ask "Do you want to open this file by default ...": always when
+// no default file is set; when a file is opened from the menu also when the
+// setting "File Open Default" is on.
+bool askdefaultfile(const QString& defaultfile, bool fromopen, bool fileopendefault);
+
+// The Open dialog's filter.
+QString gedcomfilter();
+
+} // namespace qm

@@ -1,0 +1,175 @@
+#include "census/entrypanel_ui.h"
+
+#include <QComboBox>
+#include <QGridLayout>
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPlainTextEdit>
+#include <QSplitter>
+#include <QVBoxLayout>
+
+namespace qm {
+
+namespace {
+// A caption label for a field: its buddy is the field, and the field's
+// accessible name is the caption without its colon.
+QLabel* caption(QWidget* parent, const QString& text, QWidget* field)
+{
+    auto* l = new QLabel(text, parent);
+    l->setBuddy(field);
+    QString name = text;
+    name.remove(QLatin1Char('&'));
+    if (name.endsWith(QLatin1Char(':')))
+        name.chop(1);
+    field->setAccessibleName(name);
+    return l;
+}
+
+QLineEdit* linebox(QWidget* parent, const char* name)
+{
+    auto* e = new QLineEdit(parent);
+    e->setObjectName(QString::fromLatin1(name));
+    return e;
+}
+
+QPlainTextEdit* textbox(QWidget* parent, const char* name, bool tabs)
+{
+    auto* e = new QPlainTextEdit(parent);
+    e->setObjectName(QString::fromLatin1(name));
+    // The source text takes tab characters (its columns); Shift+Tab leaves it.
+    e->setTabChangesFocus(!tabs);
+    e->setMinimumHeight(40);
+    return e;
+}
+} // namespace
+
+entrypanel::entrypanel(int m, QWidget* parent) : QWidget(parent), mode(m)
+{
+    setObjectName(QStringLiteral("entrypanel%1").arg(m));
+    auto* outer = new QHBoxLayout(this);
+    outer->setContentsMargins(0, 0, 0, 0);
+    auto* grid = new QGridLayout;
+    grid->setVerticalSpacing(4);
+    outer->addLayout(grid, 5);
+
+    // Created in tab order.
+    yearcom = new QComboBox(this);
+    yearcom->setObjectName(QStringLiteral("yearcom"));
+    yearcom->setMinimumContentsLength(5);
+    fixeddatetxt = linebox(this, "fixeddatetxt");
+    fixeddatetxt->setEnabled(false);
+    fixeddatetxt->setMaximumWidth(fixeddatetxt->fontMetrics().horizontalAdvance(QStringLiteral("00 MMM 00000")) + 16);
+    CensusYearLab = caption(this, QStringLiteral("UK Census Year:"), yearcom);
+    CensusYearLab->setObjectName(QStringLiteral("CensusYearLab"));
+    grid->addWidget(CensusYearLab, 0, 0);
+    grid->addWidget(yearcom, 0, 1);
+    grid->addWidget(caption(this, QStringLiteral("Census Date:"), fixeddatetxt), 0, 2, Qt::AlignRight);
+    grid->addWidget(fixeddatetxt, 0, 3);
+
+    sourceidlab = new QLabel(this);
+    sourceidlab->setObjectName(QStringLiteral("sourceidlab"));
+    sourceidlab->setMinimumWidth(sourceidlab->fontMetrics().horizontalAdvance(QStringLiteral("000000")));
+    int row = 1;
+    if (mode == 1) {
+        sourcecom = new QComboBox(this);
+        sourcecom->setObjectName(QStringLiteral("sourcecom"));
+        sourcecom->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
+        sourcecom->setMinimumContentsLength(20);
+        grid->addWidget(caption(this, QStringLiteral("Existing Source:"), sourcecom), row, 0);
+        grid->addWidget(sourcecom, row, 1, 1, 2);
+        auto* id = new QHBoxLayout;
+        id->addWidget(caption(this, QStringLiteral("Source ID:"), sourceidlab));
+        id->addWidget(sourceidlab, 1);
+        grid->addLayout(id, row, 3);
+    } else {
+        auto* id = new QHBoxLayout;
+        id->addWidget(caption(this, QStringLiteral("New Source ID:"), sourceidlab));
+        id->addWidget(sourceidlab, 1);
+        grid->addLayout(id, row, 2, 1, 2);
+    }
+    ++row;
+
+    locationtxt = linebox(this, "locationtxt");
+    locationtxt->setToolTip(QStringLiteral("The town or village for this census entry (e.g. Warrington, Lancashire)"));
+    grid->addWidget(caption(this, QStringLiteral("Place:"), locationtxt), row, 0);
+    grid->addWidget(locationtxt, row++, 1, 1, 3);
+    addresstxt = linebox(this, "addresstxt");
+    addresstxt->setToolTip(QStringLiteral("House number and road"));
+    grid->addWidget(caption(this, QStringLiteral("Address:"), addresstxt), row, 0);
+    grid->addWidget(addresstxt, row++, 1, 1, 3);
+    if (mode == 0) {
+        referencetxt = linebox(this, "referencetxt");
+        othertxt = linebox(this, "othertxt");
+        othertxt->setToolTip(QStringLiteral(
+            "Other information identifying the source record (e.g. name of head of household)"));
+        grid->addWidget(caption(this, QStringLiteral("Ref Code:"), referencetxt), row, 0);
+        grid->addWidget(referencetxt, row, 1);
+        grid->addWidget(caption(this, QStringLiteral("Other Info:"), othertxt), row, 2, Qt::AlignRight);
+        grid->addWidget(othertxt, row++, 3);
+        titletxt = linebox(this, "titletxt");
+        grid->addWidget(caption(this, QStringLiteral("Full Title:"), titletxt), row, 0);
+        grid->addWidget(titletxt, row++, 1, 1, 3);
+    } else {
+        wherewithinsourcetxt = linebox(this, "wherewithinsourcetxt");
+        grid->addWidget(caption(this, QStringLiteral("Where within Source:"), wherewithinsourcetxt), row, 0);
+        grid->addWidget(wherewithinsourcetxt, row++, 1, 1, 3);
+    }
+    grid->setRowStretch(row, 1);
+    grid->setColumnStretch(1, 1);
+    grid->setColumnStretch(3, 1);
+
+    dividerpic = new QSplitter(Qt::Vertical, this);
+    dividerpic->setObjectName(QStringLiteral("dividerpic"));
+    dividerpic->setChildrenCollapsible(false);
+    const auto half = [this](const QString& text, QPlainTextEdit* box) {
+        auto* w = new QWidget(dividerpic);
+        auto* v = new QVBoxLayout(w);
+        v->setContentsMargins(0, 0, 0, 0);
+        v->setSpacing(1);
+        v->addWidget(caption(w, text, box));
+        v->addWidget(box);
+        return w;
+    };
+    texttxt = textbox(this, "texttxt", true);
+    notetxt = textbox(this, "notetxt", false);
+    dividerpic->addWidget(half(QStringLiteral("Source Text:"), texttxt));
+    dividerpic->addWidget(half(QStringLiteral("Source Note:"), notetxt));
+    outer->addWidget(dividerpic, 6);
+}
+
+double entrypanel::divider() const
+{
+    const QList<int> s = dividerpic->sizes();
+    if (s.size() != 2 || s[0] <= 0 || s[1] <= 0)
+        return 1;
+    return static_cast<double>(s[0]) / s[1];
+}
+
+void entrypanel::setdivider(double ratio)
+{
+    if (!(ratio > 0.05 && ratio < 20))
+        ratio = 1;
+    const int total = 1000;
+    const int top = static_cast<int>(total * ratio / (1 + ratio));
+    dividerpic->setSizes({top, total - top});
+}
+
+void entrypanel::clearfields(bool keepsourceid)
+{
+    for (QLineEdit* e : {fixeddatetxt, locationtxt, addresstxt, referencetxt, othertxt, titletxt,
+                         wherewithinsourcetxt}) {
+        if (e)
+            e->clear();
+    }
+    texttxt->clear();
+    notetxt->clear();
+    yearcom->setCurrentIndex(-1);
+    if (sourcecom)
+        sourcecom->setCurrentIndex(-1);
+    if (!keepsourceid)
+        sourceidlab->clear();
+    fixeddatetxt->setEnabled(false);
+}
+
+} // namespace qm

@@ -1,0 +1,333 @@
+// The main window's household: the people and family lists, choosing
+// individuals into the census rows, the rows themselves, and the reload that
+// keeps them.
+#include "app/mainfrm.h"
+
+#include "census/entrypanel_ui.h"
+#include "census/householdpanel_ui.h"
+#include "model/dates.h"
+#include "model/filechanged.h"
+#include "model/loadgedcom.h"
+#include "platform/encoding.h"
+#include "platform/prompts.h"
+
+#include <QApplication>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListView>
+#include <QPlainTextEdit>
+#include <QPushButton>
+
+namespace qm {
+
+void mainfrm::pullrows()
+{
+    rows_.rows = household_->rows->values();
+}
+
+void mainfrm::pushrows()
+{
+    household_->rows->show(rows_);
+}
+
+void mainfrm::fillallpeople()
+{
+    busycursor busy(prompts_);
+    if (index_)
+        household_->people->setpeople(index_.get(), sortedpeople(*index_, settings_.idonly), settings_.idonly);
+    household_->setpeoplecaption(QStringLiteral("All Individuals:"));
+}
+
+void mainfrm::fillalivepeople()
+{
+    if (!index_)
+        return;
+    busycursor busy(prompts_);
+    entrypanel* p = panel();
+    const std::optional<QDate> day = recognisedate(p->fixeddatetxt->text());
+    if (!day)
+        return;
+    const alivelist alive = couldbealive(*index_, *day, localedateorder());
+    household_->people->setpeople(index_.get(), sortbylabel(*index_, alive.people, settings_.idonly),
+                                  settings_.idonly);
+    household_->setpeoplecaption(QStringLiteral("Individuals in ") + p->yearcom->currentText().trimmed() +
+                                 QLatin1Char(':'));
+    if (alive.toomany)
+        prompts_.tell(QStringLiteral("There are too many people to display them all in the list."));
+    else
+        findbut_->setEnabled(true);
+    household_->showpeoplelist(true);
+}
+
+void mainfrm::fillfamily(int32_t k)
+{
+    if (!index_ || k < 0 || static_cast<size_t>(k) >= index_->people.size())
+        return;
+    busycursor busy(prompts_);
+    household_->family->setentries(immediatefamily(*index_, k, settings_.idonly));
+    household_->setfamilycaption(QStringLiteral("Immediate Family of ") +
+                                 qs(index_->people[static_cast<size_t>(k)].name) + QLatin1Char(':'));
+}
+
+void mainfrm::showallclicked()
+{
+    QCheckBox* all = household_->allpeoplechk;
+    if (!all->isEnabled())
+        return;
+    if (all->isChecked()) {
+        fillallpeople();
+        return;
+    }
+    if (!censusdateok(true)) {
+        prompts_.tell(QStringLiteral("The current census date is not valid. This must be corrected first."));
+        // The list still holds everyone: the box says so too.
+        all->setChecked(true);
+        return;
+    }
+    fillalivepeople();
+}
+
+void mainfrm::peopleclicked(int row)
+{
+    int32_t k = -1;
+    if (reloading_ && rows_.selectioncount > 0)
+        k = rows_.selection[0].personindex;
+    else if (findresult_ != -1)
+        k = findresult_;
+    else
+        k = household_->people->personat(row);
+    if (k < 0)
+        return;
+    if (rows_.selectioncount == 0 || reloading_ || fromfind_)
+        fillfamily(k);
+    if (!reloading_)
+        selectperson(k);
+}
+
+void mainfrm::familyclicked(int row)
+{
+    const int32_t k = household_->family->personat(row);
+    if (k >= 0)
+        selectperson(k);
+}
+
+bool mainfrm::checkages()
+{
+    pullrows();
+    const int r = rows_.checkages();
+    if (r < 0)
+        return true;
+    prompts_.tell(QStringLiteral("You must first enter an age for this individual"));
+    household_->rows->agebox(r)->setFocus();
+    return false;
+}
+
+void mainfrm::storerows()
+{
+    pullrows();
+    rows_.storerows();
+}
+
+void mainfrm::showrows(int t)
+{
+    rows_.showrows(t);
+    pushrows();
+}
+
+void mainfrm::selectperson(int32_t k)
+{
+    if (!index_ || k < 0 || static_cast<size_t>(k) >= index_->people.size())
+        return;
+    if (!checkages())
+        return;
+    storerows();
+    const personrec& person = index_->people[static_cast<size_t>(k)];
+    if (rows_.has(person.id)) {
+        prompts_.tell(QStringLiteral("This individual has already been selected"));
+        return;
+    }
+    const QString censustext = panel()->fixeddatetxt->text();
+    const std::optional<QDate> censusday = recognisedate(censustext);
+    for (const censusrec& c : person.census) {
+        const std::optional<QDate> day = recognisedate(qs(c.date));
+        if (!day || !censusday || *day != *censusday)
+            continue;
+        QString q = QStringLiteral("This individual already has a census record for ") + censustext;
+        const QString place = qs(c.place).trimmed();
+        if (!place.isEmpty())
+            q += QStringLiteral(" at ") + place;
+        q += QStringLiteral(". Are you sure you want to select this individual?");
+        if (!prompts_.yes(q, icon::exclamation, answer::yes)) {
+            if (rows_.selectioncount == 0)
+                household_->family->clear();
+            return;
+        }
+    }
+    const int r = rows_.add(person, k);
+    pushrows();
+    household_->rows->agebox(r)->setFocus();
+    Autosourcebut_->setEnabled(true);
+    showpersoninfo(k);
+}
+
+void mainfrm::scrollup()
+{
+    if (!checkages())
+        return;
+    storerows();
+    rows_.scrollup();
+    pushrows();
+}
+
+void mainfrm::scrolldown()
+{
+    if (!checkages())
+        return;
+    storerows();
+    rows_.scrolldown();
+    pushrows();
+}
+
+void mainfrm::deleterow(int r)
+{
+    pullrows();
+    const int32_t last = rows_.deleterow(r);
+    pushrows();
+    if (rows_.selectioncount == 0) {
+        household_->allpeoplelst->clearSelection();
+        infolab_->clear();
+        household_->family->clear();
+        household_->setfamilycaption(QStringLiteral("Immediate Family:"));
+        Autosourcebut_->setEnabled(false);
+        return;
+    }
+    showpersoninfo(last);
+}
+
+void mainfrm::inforow(int r)
+{
+    if (!index_)
+        return;
+    pullrows();
+    const int32_t id = rows_.rows[static_cast<size_t>(r)].id.toInt();
+    for (size_t k = 0; k < index_->people.size(); ++k) {
+        if (index_->people[k].id == id) {
+            showpersoninfo(static_cast<int32_t>(k));
+            return;
+        }
+    }
+}
+
+void mainfrm::showpersoninfo(int32_t k)
+{
+    if (!index_ || k < 0 || static_cast<size_t>(k) >= index_->people.size()) {
+        infolab_->clear();
+        return;
+    }
+    infolab_->setText(personinfo(index_->people[static_cast<size_t>(k)], panel()->fixeddatetxt->text()));
+}
+
+void mainfrm::clearentry()
+{
+    rows_.clear();
+    findresult_ = -1;
+    pushrows();
+    for (entrypanel* p : panel_)
+        p->clearfields(p->mode == 0 && settings_.fullentry);
+    infolab_->clear();
+    household_->setpeoplecaption(QStringLiteral("All Individuals"));
+    Autosourcebut_->setEnabled(false);
+    household_->setfamilycaption(QStringLiteral("Immediate Family:"));
+}
+
+void mainfrm::findclicked()
+{
+    if (!checkages())
+        return;
+    if (rows_.selectioncount > 0) {
+        storerows();
+        findresult_ = rows_.selection[static_cast<size_t>(rows_.selectioncount - 1)].personindex;
+    } else {
+        findresult_ = -1;
+    }
+    watchfile_ = false;
+    fromfind_ = false;
+    findresult_ = runfind(findresult_);
+    if (findresult_ != -1)
+        peopleclicked(-1);
+    fromfind_ = false;
+    watchfile_ = true;
+    findresult_ = -1;
+}
+
+void mainfrm::checkonactivate()
+{
+    if (!index_ || index_->people.empty() || checking_ || !watchfile_)
+        return;
+    checking_ = true;
+    repaint();
+    QApplication::processEvents();
+    if (filechanged(*index_)) {
+        prompts_.tell(changedmessage(index_->gedcomfile));
+        checking_ = false;
+        reload();
+        return;
+    }
+    checking_ = false;
+}
+
+void mainfrm::reload()
+{
+    reloading_ = true;
+    storerows();
+    const bool watched = watchfile_;
+    watchfile_ = false;
+    loadfile();
+    watchfile_ = watched;
+    if (censusdateok(false)) {
+        if (index_ && peoplelistshown(*index_))
+            household_->allpeoplechk->setEnabled(true);
+        else
+            fillalivepeople();
+    }
+    if (sourcemode_ == 1)
+        panel_[1]->sourceidlab->clear();
+    if (rows_.selectioncount == 0) {
+        reloading_ = false;
+        return;
+    }
+    for (selectionrec& s : rows_.selection)
+        s.found = false;
+    for (size_t k = 0; k < index_->people.size(); ++k) {
+        const personrec& p = index_->people[k];
+        for (int i = 0; i < rows_.selectioncount; ++i) {
+            selectionrec& s = rows_.selection[static_cast<size_t>(i)];
+            if (!s.found && s.id == p.id) {
+                s.found = true;
+                s.name = qs(p.name);
+                s.personindex = static_cast<int32_t>(k);
+            }
+        }
+    }
+    bool all = true;
+    for (int i = 0; i < rows_.selectioncount; ++i)
+        all = all && rows_.selection[static_cast<size_t>(i)].found;
+    if (!all) {
+        prompts_.tell(QStringLiteral("At least one of the individuals already selected appears to no longer be in "
+                                     "your file following changes made in another application. ") +
+                      QStringLiteral("Therefore, the selections will be cleared to avoid the possibility of data "
+                                     "corruption."));
+        rows_.clear();
+        pushrows();
+        Autosourcebut_->setEnabled(false);
+        panel()->texttxt->setFocus();
+    } else {
+        peopleclicked(-1);
+        showrows(rows_.toprow);
+    }
+    reloading_ = false;
+}
+
+} // namespace qm

@@ -1,0 +1,138 @@
+#include "app/recentfiles.h"
+#include "app/startup.h"
+#include "platform/settingsstore.h"
+
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+recentfiles filled()
+{
+    recentfiles r;
+    r.paths = {QStringLiteral("/a.ged"), QStringLiteral("/b.ged"), QStringLiteral("/c.ged"), QStringLiteral("/d.ged")};
+    return r;
+}
+} // namespace
+
+TEST(RecentFiles, RememberMovesToFirstSlot)
+{
+    recentfiles r = filled();
+    r.remember(QStringLiteral("/c.ged")); // slot 3 to 1; 1 and 2 move down; 4 unchanged
+    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/c.ged", "/a.ged", "/b.ged", "/d.ged"}));
+    r.remember(QStringLiteral("/c.ged")); // already first: nothing moves
+    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/c.ged", "/a.ged", "/b.ged", "/d.ged"}));
+    r.remember(QStringLiteral("/e.ged")); // new: the last is dropped
+    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/e.ged", "/c.ged", "/a.ged", "/b.ged"}));
+    r.remember(QStringLiteral("/C.ged")); // compared as exact text
+    EXPECT_EQ(r.paths[0], "/C.ged");
+    EXPECT_EQ(r.paths[1], "/e.ged");
+}
+
+TEST(RecentFiles, RemoveMovesLaterSlotsUp)
+{
+    recentfiles r = filled();
+    r.remove(QStringLiteral("/b.ged"));
+    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/a.ged", "/c.ged", "/d.ged", ""}));
+    r.remove(QStringLiteral("/x.ged"));
+    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/a.ged", "/c.ged", "/d.ged", ""}));
+    EXPECT_FALSE(r.inuse(3));
+}
+
+TEST(RecentFiles, CaptionShortensPastFortyCharacters)
+{
+    recentfiles r;
+    const QString forty = QStringLiteral("/home/user/") + QString(25, u'x') + QStringLiteral(".ged");
+    ASSERT_EQ(forty.size(), 40);
+    r.paths[0] = forty;
+    EXPECT_EQ(r.caption(0), "&1 " + forty);
+    r.paths[0] = QStringLiteral("/") + forty;
+    EXPECT_EQ(r.caption(0), "&1.." + forty);
+    r.paths[2] = QStringLiteral("/a.ged");
+    EXPECT_EQ(r.caption(2), "&3 /a.ged");
+}
+
+TEST(RecentFiles, ReadAndWriteTheFourValues)
+{
+    QTemporaryDir dir;
+    auto store = settingsstore::onfile(dir.filePath(QStringLiteral("s.ini")));
+    store->write(QStringLiteral("Recent Files  1"), QStringLiteral("  /a.ged  "));
+    store->write(QStringLiteral("Recent Files  2"), QStringLiteral("x")); // too short: empty slot
+    store->write(QStringLiteral("Recent Files  4"), QStringLiteral("/d.ged"));
+    recentfiles r;
+    r.read(*store);
+    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/a.ged", "", "", "/d.ged"}));
+    r.remember(QStringLiteral("/n.ged"));
+    r.write(*store);
+    EXPECT_EQ(store->read(QStringLiteral("Recent Files  1")), QStringLiteral("/n.ged"));
+    EXPECT_EQ(store->read(QStringLiteral("Recent Files  2")), QStringLiteral("/a.ged"));
+    EXPECT_EQ(store->read(QStringLiteral("Recent Files  4")), QString());
+}
+
+TEST(RecentFiles, PathParts)
+{
+    EXPECT_EQ(folderof(QStringLiteral("C:\\fam\\smith.ged")), "C:\\fam\\");
+    EXPECT_EQ(folderof(QStringLiteral("/home/u/smith.ged")), "/home/u/");
+    EXPECT_EQ(folderof(QStringLiteral("smith.ged")), "");
+    EXPECT_EQ(filenameof(QStringLiteral("C:\\fam/smith.ged")), "smith.ged");
+    EXPECT_EQ(windowtitle(QStringLiteral("/x/smith.ged")), versiontitle() + " - smith.ged");
+    EXPECT_TRUE(versiontitle().startsWith("Quillmark v"));
+}
+
+TEST(Startup, CommandLine)
+{
+    EXPECT_EQ(commandlinefile({}), std::nullopt);
+    EXPECT_EQ(commandlinefile({QStringLiteral("\"\"")}), std::nullopt); // two quotes: ignored
+    EXPECT_EQ(commandlinefile({QStringLiteral("  ")}), std::nullopt);
+    EXPECT_EQ(commandlinefile({QStringLiteral("\"/my files/a.ged\"")}), QStringLiteral("/my files/a.ged"));
+    // The shell has already removed the quotes.
+    EXPECT_EQ(commandlinefile({QStringLiteral("/my"), QStringLiteral("files/a.ged")}),
+              QStringLiteral("/my files/a.ged"));
+}
+
+TEST(Startup, PlacementStopsAtFirstMissingValue)
+{
+    QTemporaryDir dir;
+    auto store = settingsstore::onfile(dir.filePath(QStringLiteral("s.ini")));
+    placement p = readplacement(*store);
+    EXPECT_FALSE(p.top);
+    EXPECT_EQ(p.divider, 1);
+
+    store->write(QStringLiteral("Main Top"), QStringLiteral("1200"));
+    store->write(QStringLiteral("Main Width"), QStringLiteral("9000"));
+    store->write(QStringLiteral("Main Height"), QStringLiteral("7000"));
+    p = readplacement(*store); // "Main Left" missing: stops there
+    EXPECT_EQ(p.top, 1200);
+    EXPECT_FALSE(p.left);
+    EXPECT_FALSE(p.width);
+    EXPECT_FALSE(p.complete());
+
+    store->write(QStringLiteral("Main Left"), QStringLiteral("300"));
+    p = readplacement(*store);
+    ASSERT_TRUE(p.complete());
+    EXPECT_TRUE(p.centre); // "Main Maximised" missing
+    EXPECT_FALSE(p.maximised);
+
+    writeplacement(*store, true, 10, 20, 30000, 40000, 0.5);
+    p = readplacement(*store);
+    EXPECT_TRUE(p.maximised);
+    EXPECT_FALSE(p.centre);
+    EXPECT_EQ(p.width, 30000);
+    EXPECT_EQ(p.divider, 0.5);
+    writeplacement(*store, false, 10, 20, 30000, 40000, 2);
+    p = readplacement(*store);
+    EXPECT_FALSE(p.maximised);
+    EXPECT_FALSE(p.centre);
+}
+
+TEST(Startup, DefaultFileQuestion)
+{
+    EXPECT_TRUE(askdefaultfile(QString(), false, false));
+    EXPECT_FALSE(askdefaultfile(QStringLiteral("/a.ged"), false, true)); // at start-up
+    EXPECT_FALSE(askdefaultfile(QStringLiteral("/a.ged"), true, false));
+    EXPECT_TRUE(askdefaultfile(QStringLiteral("/a.ged"), true, true));
+    EXPECT_EQ(twipstopixels(12000, 96), 800);
+    EXPECT_EQ(pixelstotwips(800, 96), 12000);
+}

@@ -1,0 +1,227 @@
+#include "census/selection.h"
+
+#include "model/loadgedcom.h"
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+
+struct family {
+    gedcomindex index;
+    int32_t add(const char* name, int32_t famc = 0, std::vector<int32_t> fams = {}, const char* birth = nullptr,
+                const char* death = nullptr)
+    {
+        personrec p;
+        p.id = static_cast<int32_t>(index.people.size()) + 1;
+        p.name = index.arena.store(name);
+        p.famc = famc;
+        p.fams = std::move(fams);
+        if (birth) {
+            p.hasbirthdate = true;
+            p.birthdate = index.arena.store(birth);
+        }
+        if (death) {
+            p.hasdeathdate = true;
+            p.deathdate = index.arena.store(death);
+        }
+        index.people.push_back(std::move(p));
+        return static_cast<int32_t>(index.people.size()) - 1;
+    }
+};
+
+// n individuals chosen, each with age "1" typed in its row as it was added.
+householdrows chosen(family& f, int n)
+{
+    householdrows h;
+    for (int i = 0; i < n; ++i) {
+        const int32_t k = f.add(("P" + std::to_string(i)).c_str());
+        const int r = h.add(f.index.people[static_cast<size_t>(k)], k);
+        h.rows[static_cast<size_t>(r)].age = QString::number(i + 1);
+        h.storerows();
+    }
+    return h;
+}
+
+// Ages shown in the visible rows, "" for empty rows.
+std::vector<QString> shownages(const householdrows& h)
+{
+    std::vector<QString> out;
+    for (const auto& r : h.rows)
+        out.push_back(r.age);
+    return out;
+}
+
+void expectconsistent(const householdrows& h)
+{
+    // Rows may be hidden below (after scrolling up), never empty rows shown
+    // while rows are hidden above.
+    if (h.toprow >= 1) {
+        EXPECT_GE(h.selectioncount, h.toprow + 10);
+    }
+    for (int r = 0; r < 10; ++r) {
+        const int i = h.toprow + r;
+        if (i < h.selectioncount) {
+            EXPECT_EQ(h.rows[static_cast<size_t>(r)].age, h.selection[static_cast<size_t>(i)].age) << "row " << r;
+        } else {
+            EXPECT_FALSE(h.rows[static_cast<size_t>(r)].shown()) << "row " << r;
+        }
+    }
+}
+
+} // namespace
+
+TEST(HouseholdRows, AddStoreAndAgeCheck)
+{
+    family f;
+    householdrows h;
+    const int32_t k = f.add("Smith, John");
+    EXPECT_EQ(h.checkages(), -1); // nothing to check
+    EXPECT_EQ(h.add(f.index.people[0], k), 0);
+    EXPECT_EQ(h.rows[0].name, "Smith, John");
+    EXPECT_EQ(h.rows[0].agetype, "Y");
+    EXPECT_EQ(h.checkages(), 0);
+    h.rows[0].age = QStringLiteral(" 32 ");
+    h.rows[0].agetype = QString();
+    h.rows[0].occupation = QStringLiteral(" Weaver ");
+    EXPECT_EQ(h.checkages(), -1);
+    h.storerows();
+    ASSERT_EQ(h.selection.size(), 1u);
+    EXPECT_EQ(h.selection[0].age, "32");
+    EXPECT_EQ(h.selection[0].agetype, u'Y');
+    EXPECT_EQ(h.selection[0].occupation, "Weaver");
+    EXPECT_EQ(h.selection[0].id, 1);
+    EXPECT_TRUE(h.has(1));
+    EXPECT_FALSE(h.has(2));
+}
+
+TEST(HouseholdRows, EleventhScrollsAndScrollingKeepsTypedValues)
+{
+    family f;
+    householdrows h = chosen(f, 10);
+    EXPECT_FALSE(h.upshown());
+    const int32_t k = f.add("Eleventh");
+    EXPECT_EQ(h.add(f.index.people[static_cast<size_t>(k)], k), 9);
+    EXPECT_EQ(h.toprow, 1);
+    EXPECT_TRUE(h.upshown());
+    EXPECT_FALSE(h.downshown());
+    EXPECT_EQ(h.rows[0].age, "2");
+    h.rows[9].age = QStringLiteral("11");
+    h.storerows();
+    h.scrollup();
+    EXPECT_EQ(h.toprow, 0);
+    EXPECT_TRUE(h.downshown());
+    EXPECT_EQ(h.rows[0].age, "1");
+    h.rows[0].age = QStringLiteral("99"); // typed while scrolled up
+    h.storerows();
+    h.scrolldown();
+    EXPECT_EQ(h.rows[9].age, "11");
+    h.scrollup();
+    EXPECT_EQ(h.rows[0].age, "99");
+    expectconsistent(h);
+}
+
+TEST(HouseholdRows, DeleteTheOnlyRow)
+{
+    family f;
+    householdrows h = chosen(f, 1);
+    EXPECT_EQ(h.deleterow(0), -1);
+    EXPECT_EQ(h.selectioncount, 0);
+    EXPECT_FALSE(h.rows[0].shown());
+}
+
+TEST(HouseholdRows, DeleteWithNothingHiddenAbove)
+{
+    family f;
+    householdrows h = chosen(f, 4);
+    h.rows[3].age = QStringLiteral("44"); // typed but not stored: rows move as they are
+    EXPECT_EQ(h.deleterow(1), 3);
+    EXPECT_EQ(h.selectioncount, 3);
+    EXPECT_EQ(shownages(h), (std::vector<QString>{"1", "3", "44", "", "", "", "", "", "", ""}));
+    h.storerows();
+    expectconsistent(h);
+
+    // Rows hidden below: the first hidden one moves into row 9.
+    family g;
+    householdrows s = chosen(g, 12);
+    s.scrollup();
+    s.scrollup();
+    ASSERT_EQ(s.toprow, 0);
+    ASSERT_TRUE(s.downshown());
+    s.deleterow(0);
+    EXPECT_EQ(s.selectioncount, 11);
+    EXPECT_EQ(s.rows[0].age, "2");
+    EXPECT_EQ(s.rows[9].age, "11");
+    EXPECT_TRUE(s.downshown());
+    s.storerows();
+    expectconsistent(s);
+    s.scrolldown();
+    EXPECT_EQ(s.rows[9].age, "12");
+    expectconsistent(s);
+}
+
+TEST(HouseholdRows, DeleteWithRowsHiddenAbovePullsWindowDown)
+{
+    family f;
+    householdrows h = chosen(f, 12); // toprow 2
+    ASSERT_EQ(h.toprow, 2);
+    EXPECT_EQ(h.deleterow(4), 11); // the individual shown last
+    EXPECT_EQ(h.toprow, 1);
+    EXPECT_EQ(h.selectioncount, 11);
+    EXPECT_EQ(shownages(h), (std::vector<QString>{"2", "3", "4", "5", "6", "8", "9", "10", "11", "12"}));
+    h.storerows();
+    expectconsistent(h);
+    h.deleterow(0);
+    EXPECT_EQ(h.toprow, 0);
+    EXPECT_FALSE(h.upshown());
+    h.storerows();
+    expectconsistent(h);
+    EXPECT_EQ(h.selection.size(), 10u);
+}
+
+TEST(ImmediateFamily, KindsAndOrder)
+{
+    family f;
+    // Family 1: John and Mary with children Ann and Tom; John also married Mary
+    // twice (family 3); John's parents are family 2 (Old John).
+    const int32_t john = f.add("Smith, John", 2, {1, 3});
+    f.add("Brown, Mary", 0, {1, 3});
+    f.add("Smith, Ann", 1);
+    f.add("Smith, Tom", 1);
+    f.add("Smith, Old John", 0, {2});
+    f.add("Smith, Jane", 2); // sister
+    f.add("Jones, Stranger", 5, {4});
+    const auto fam = immediatefamily(f.index, john, true);
+    std::vector<QString> texts;
+    for (const auto& e : fam)
+        texts.push_back(e.text);
+    EXPECT_EQ(texts, (std::vector<QString>{"CHI Smith, Ann (ID: 3)", "CHI Smith, Tom (ID: 4)",
+                                           "PAR Smith, Old John (ID: 5)", "SIB Smith, Jane (ID: 6)",
+                                           "WED Brown, Mary (ID: 2)", "WED Brown, Mary (ID: 2)"}));
+    EXPECT_EQ(fam[0].person, 2);
+}
+
+TEST(CouldBeAlive, YearsAroundTheCensus)
+{
+    family f;
+    f.add("No dates");
+    f.add("Born 1700", 0, {}, "1700");
+    f.add("Born 1707", 0, {}, "1707");
+    f.add("Born 1847", 0, {}, "ABT 1847");
+    f.add("Born 1846", 0, {}, "1846");
+    f.add("Died 1835", 0, {}, nullptr, "1835");
+    f.add("Died 1836", 0, {}, nullptr, "1836");
+    f.add("Died before 1800", 0, {}, nullptr, "BEF 1800"); // gives no age: kept
+    f.add("Born between", 0, {}, "BET 1700 AND 1702");     // likewise
+    const alivelist a = couldbealive(f.index, QDate(1841, 6, 6), dateorder::dmy);
+    EXPECT_EQ(a.people, (std::vector<int32_t>{0, 2, 4, 6, 7, 8}));
+    EXPECT_FALSE(a.toomany);
+
+    const alivelist capped = couldbealive(f.index, QDate(1841, 6, 6), dateorder::dmy, 3);
+    EXPECT_EQ(capped.people.size(), 4u);
+    EXPECT_TRUE(capped.toomany);
+
+    // Listed in label order: names first, then the bracketed dates.
+    EXPECT_EQ(sortbylabel(f.index, a.people, false), (std::vector<int32_t>{2, 4, 8, 6, 7, 0}));
+}
