@@ -1,8 +1,49 @@
 // quillmark-cli: Quillmark's work without windows, for scripts and batches.
+#include "app/cli.h"
+
+#include <QCoreApplication>
+
 #include <cstdio>
 
-int main(int, char**)
+namespace qm {
+
+// One line per command; the usage text and the dispatch both come from here.
+const std::vector<clicommand>& clicommands()
 {
-    std::fputs("usage: quillmark-cli stats FILE [--settings S.ini]\n", stderr);
-    return 2;
+    static const std::vector<clicommand> commands = {
+        {"stats", "FILE [--settings S.ini]",
+         "load FILE and print what it holds as one JSON object (individuals, sources, places, ...)", clistats},
+    };
+    return commands;
+}
+
+} // namespace qm
+
+int main(int argc, char** argv)
+{
+    QCoreApplication app(argc, argv);
+    QCoreApplication::setApplicationName(QStringLiteral("quillmark-cli"));
+    QStringList args = QCoreApplication::arguments();
+    args.removeFirst();
+
+    const auto print = [](const QString& text, FILE* to) { std::fputs(text.toStdString().c_str(), to); };
+    if (args.isEmpty()) {
+        print(qm::cliusage(), stderr);
+        return qm::clifailure;
+    }
+    const QString name = args.takeFirst();
+    if (name == QLatin1String("--help") || name == QLatin1String("-h") || name == QLatin1String("help")) {
+        print(qm::cliusage(args.isEmpty() ? QString() : args.front()), stdout);
+        return 0;
+    }
+    for (const qm::clicommand& c : qm::clicommands()) {
+        if (name != QLatin1String(c.name))
+            continue;
+        if (args.contains(QLatin1String("--help")) || args.contains(QLatin1String("-h"))) {
+            print(qm::cliusage(name), stdout);
+            return 0;
+        }
+        return c.run(args);
+    }
+    return qm::clifail(QStringLiteral("unknown command %1 (see quillmark-cli --help)").arg(name));
 }

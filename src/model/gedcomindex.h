@@ -83,6 +83,7 @@ struct gedcomindex {
     filestamp gedcomdate;  // its last-modified time and size when it was read
     textencoding encoding = textencoding::windows1252;
     bool bom = false;
+    bool hashead = false; // a "0 HEAD" line was met: the file looks like GEDCOM
 
     std::vector<personrec> people;
     std::vector<sourcerec> sources;

@@ -6,6 +6,8 @@
 #include <QString>
 
 #include <memory>
+#include <string>
+#include <vector>
 
 namespace qm {
 
@@ -28,14 +30,29 @@ std::unique_ptr<gedcomindex> loadgedcombytes(std::string_view bytes, const flagt
 QString nopeoplemessage();
 
 // Place table operations (the table is one entry per group, sorted ignoring case).
+// addplace and insertplace both count one more occurrence of a (UTF-8) name:
+// its group's count is raised, or a new group is inserted at its sorted place.
+// An empty name adds nothing.
 void addplace(gedcomindex& index, std::string_view name);
 void insertplace(gedcomindex& index, std::string_view name); // a place typed after the load
 int findplace(const gedcomindex& index, std::string_view name); // position of the group, or -1
+// Sorts places[low..high] (inclusive) by name ignoring case.
+void sortplaces(gedcomindex& index, size_t low, size_t high);
+// Sorts the whole table and merges entries equal ignoring case into one group
+// each (first spelling, counts added up).
+void countplaces(gedcomindex& index);
+// The form of a place name under which names equal ignoring case are equal.
+std::string placekey(std::string_view name);
 
 // People list: an individual's label and the positions of individuals in label order.
 QString personlabel(const personrec& p, bool idonly);
 std::vector<int32_t> sortedpeople(const gedcomindex& index, bool idonly);
 // Census source list: titles of census sources with their positions in `sources`.
+struct sourceitem {
+    QString title;
+    int32_t source = 0; // position in `sources`
+};
+std::vector<sourceitem> censussourcelist(const gedcomindex& index);
 bool peoplelistshown(const gedcomindex& index); // fewer than 32,001 individuals
 
 } // namespace qm

@@ -4,7 +4,11 @@
 #include <QStringDecoder>
 
 #include <algorithm>
+#include <cstdint>
 #include <cstring>
+#if defined(__SSE2__) || defined(_M_X64)
+#include <emmintrin.h>
+#endif
 
 namespace qm {
 
@@ -16,6 +20,35 @@ constexpr size_t charscan = 64 * 1024;
 bool isspace_(char c)
 {
     return c == ' ' || c == '\t';
+}
+
+// Position of the first CR or LF in data[from, end), or end. Lines are short
+// and files long, so this scan is most of the reader's time: it looks at 16
+// bytes at once where the processor allows.
+size_t findeol(const char* data, size_t from, size_t end)
+{
+    size_t i = from;
+#if defined(__SSE2__) || defined(_M_X64)
+    const __m128i lf = _mm_set1_epi8('\n');
+    const __m128i cr = _mm_set1_epi8('\r');
+    while (i + 16 <= end) {
+        const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + i));
+        const int mask = _mm_movemask_epi8(_mm_or_si128(_mm_cmpeq_epi8(v, lf), _mm_cmpeq_epi8(v, cr)));
+        if (mask) {
+#if defined(_MSC_VER) && !defined(__clang__)
+            unsigned long bit;
+            _BitScanForward(&bit, static_cast<unsigned long>(mask));
+            return i + bit;
+#else
+            return i + static_cast<size_t>(__builtin_ctz(static_cast<unsigned>(mask)));
+#endif
+        }
+        i += 16;
+    }
+#endif
+    while (i < end && data[i] != '\n' && data[i] != '\r')
+        ++i;
+    return i;
 }
 } // namespace
 
@@ -171,9 +204,7 @@ bool linereader::next(std::string_view& line)
     size_t scan = begin_;
     for (;;) {
         const char* data = buf_.data();
-        size_t i = scan;
-        while (i < end_ && data[i] != '\n' && data[i] != '\r')
-            ++i;
+        const size_t i = findeol(data, scan, end_);
         if (i < end_) {
             // A line end: look at the following byte to tell CR LF and LF CR
             // from single ones; fetch it first when the buffer ends here.
@@ -211,9 +242,7 @@ bool linereader::next(std::string_view& line)
                 if (begin_ == end_ && !fill())
                     break;
                 const char* d = buf_.data();
-                size_t k = begin_;
-                while (k < end_ && d[k] != '\n' && d[k] != '\r')
-                    ++k;
+                size_t k = findeol(d, begin_, end_);
                 if (k < end_) {
                     begin_ = k;
                     if (k + 1 >= end_)

@@ -1,0 +1,128 @@
+#include "app/cli.h"
+
+#include "platform/settingsstore.h"
+
+#include <QFileInfo>
+
+#include <cmath>
+#include <cstdio>
+
+namespace qm {
+
+int clifail(const QString& message)
+{
+    QString line = message;
+    line.replace(QLatin1Char('\n'), QLatin1Char(' '));
+    const std::string text = "quillmark-cli: " + line.toStdString() + "\n";
+    std::fputs(text.c_str(), stderr);
+    return clifailure;
+}
+
+QString cliusage(const QString& name)
+{
+    QString text = QStringLiteral("usage:\n");
+    for (const clicommand& c : clicommands()) {
+        if (!name.isEmpty() && name != QLatin1String(c.name))
+            continue;
+        text += QStringLiteral("  quillmark-cli %1 %2\n      %3\n")
+                    .arg(QLatin1String(c.name), QLatin1String(c.args), QLatin1String(c.summary));
+    }
+    if (name.isEmpty())
+        text += QStringLiteral("  quillmark-cli --help\n"
+                               "\n--settings S.ini reads the settings from an INI file holding the same value names\n"
+                               "as the settings store; without it the user's own settings are used.\n"
+                               "Exit status: 0 when done, 2 when the command could not be carried out.\n");
+    return text;
+}
+
+bool takesettingsoption(QStringList& args, QString* path, QString* error)
+{
+    static const QString option = QStringLiteral("--settings");
+    for (qsizetype i = 0; i < args.size(); ++i) {
+        if (args[i] == option) {
+            if (i + 1 >= args.size() || args[i + 1].isEmpty()) {
+                *error = QStringLiteral("--settings needs the path of an INI file");
+                return false;
+            }
+            *path = args[i + 1];
+            args.remove(i, 2);
+            return true;
+        }
+        if (args[i].startsWith(option + QLatin1Char('='))) {
+            *path = args[i].mid(option.size() + 1);
+            args.remove(i);
+            if (path->isEmpty()) {
+                *error = QStringLiteral("--settings needs the path of an INI file");
+                return false;
+            }
+            return true;
+        }
+    }
+    return true;
+}
+
+std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error)
+{
+    auto s = std::make_unique<clisettings>();
+    if (inipath.isEmpty()) {
+        s->store = settingsstore::native();
+    } else {
+        const QFileInfo info(inipath);
+        if (!info.isFile() || !info.isReadable()) {
+            *error = QStringLiteral("the settings file %1 does not exist or cannot be read").arg(inipath);
+            return nullptr;
+        }
+        s->store = settingsstore::onfile(inipath);
+    }
+    s->values = loadsettings(*s->store).values;
+    return s;
+}
+
+void jsonobject::key(const char* key)
+{
+    if (out_.size() > 1)
+        out_ += ", ";
+    out_ += '"';
+    out_ += key;
+    out_ += "\": ";
+}
+
+void jsonobject::add(const char* k, int64_t value)
+{
+    key(k);
+    out_ += std::to_string(value);
+}
+
+void jsonobject::add(const char* k, double value)
+{
+    key(k);
+    if (!std::isfinite(value)) {
+        out_ += "null";
+        return;
+    }
+    char buf[64];
+    std::snprintf(buf, sizeof buf, "%.3f", value);
+    out_ += buf;
+}
+
+void jsonobject::add(const char* k, const QString& value)
+{
+    key(k);
+    out_ += '"';
+    for (const char c : value.toStdString()) {
+        const auto u = static_cast<unsigned char>(c);
+        if (c == '"' || c == '\\') {
+            out_ += '\\';
+            out_ += c;
+        } else if (u < 0x20) {
+            char buf[8];
+            std::snprintf(buf, sizeof buf, "\\u%04x", u);
+            out_ += buf;
+        } else {
+            out_ += c;
+        }
+    }
+    out_ += '"';
+}
+
+} // namespace qm

@@ -1,0 +1,67 @@
+#pragma once
+// quillmark-cli: the commands and what they share (settings, messages, JSON).
+//
+// A command is one entry of clicommands(): its name, its arguments for the
+// usage text, a one-line summary and the function that runs it with the
+// arguments after its name. It returns the process's exit status: 0 when done,
+// 2 when it could not be (after one line on standard error).
+
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+
+#include <QString>
+#include <QStringList>
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace qm {
+
+
+struct clicommand {
+    const char* name;
+    const char* args;
+    const char* summary;
+    int (*run)(QStringList args);
+};
+
+const std::vector<clicommand>& clicommands();
+
+// Commands.
+int clistats(QStringList args);
+
+// Exit status of a command that could not do its work.
+constexpr int clifailure = 2;
+
+// Writes "quillmark-cli: " + message as one line on standard error and returns clifailure.
+int clifail(const QString& message);
+// Usage of one command (or of all when name is empty), for --help and mistakes.
+QString cliusage(const QString& name = QString());
+
+// Takes "--settings S.ini" or "--settings=S.ini" out of args. False (with a
+// message) when the option has no value.
+bool takesettingsoption(QStringList& args, QString* path, QString* error);
+
+// The user's settings store, or the INI file named by --settings (which must exist).
+struct clisettings {
+    std::unique_ptr<settingsstore> store;
+    settings values;
+};
+std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error);
+
+// A JSON object written field by field on one line.
+class jsonobject {
+public:
+    void add(const char* key, int64_t value);
+    void add(const char* key, double value);
+    void add(const char* key, const QString& value);
+    std::string text() const { return out_ + "}"; }
+
+private:
+    void key(const char* key);
+    std::string out_ = "{";
+};
+
+} // namespace qm

@@ -1,0 +1,65 @@
+// quillmark-cli stats: loads a family file and prints what the index holds.
+#include "app/cli.h"
+
+#include "flags/flagtable.h"
+#include "model/loadgedcom.h"
+
+#include <QDir>
+#include <QFileInfo>
+
+#include <cstdio>
+
+namespace qm {
+
+int clistats(QStringList args)
+{
+    QString inipath, error;
+    if (!takesettingsoption(args, &inipath, &error))
+        return clifail(error);
+    for (const QString& a : args)
+        if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-"))
+            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
+    if (args.size() != 1)
+        return clifail(QStringLiteral("stats needs one family file: quillmark-cli stats FILE [--settings S.ini]"));
+    const QString path = args.front();
+    const QFileInfo info(path);
+    if (!info.exists())
+        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
+    if (info.isDir())
+        return clifail(QStringLiteral("%1 is a folder, not a family file").arg(QDir::toNativeSeparators(path)));
+
+    const auto s = opensettings(inipath, &error);
+    if (!s)
+        return clifail(error);
+    flagtable flagdefs;
+    if (!loadflagdefs(*s->store, flagdefs))
+        std::fputs(("quillmark-cli: warning: " + flagloaderrormessage().toStdString() + "\n").c_str(), stderr);
+
+    const loadresult r = loadgedcom(path, flagdefs);
+    if (!r.index)
+        return clifail(r.error);
+    const gedcomindex& ix = *r.index;
+    if (!ix.hashead)
+        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
+                           .arg(QDir::toNativeSeparators(path)));
+
+    jsonobject j;
+    j.add("individuals", static_cast<int64_t>(ix.people.size()));
+    j.add("sources", static_cast<int64_t>(ix.sources.size()));
+    j.add("census_sources", static_cast<int64_t>(ix.censussources.size()));
+    j.add("objects", static_cast<int64_t>(ix.objects.size()));
+    j.add("places", static_cast<int64_t>(ix.places.size()));
+    j.add("census_events", ix.censusevents);
+    j.add("flags", static_cast<int64_t>(ix.flags.size()));
+    j.add("next_source", static_cast<int64_t>(ix.nextsourceid));
+    j.add("maxobjectid", static_cast<int64_t>(ix.maxobjectid));
+    j.add("maxnoteid", static_cast<int64_t>(ix.maxnoteid));
+    j.add("encoding", QString::fromLatin1(encodingname(ix.encoding)));
+    j.add("load_ms", r.ms);
+    const std::string out = j.text() + "\n";
+    std::fwrite(out.data(), 1, out.size(), stdout);
+    std::fflush(stdout);
+    return 0;
+}
+
+} // namespace qm

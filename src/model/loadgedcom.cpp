@@ -1,0 +1,644 @@
+// The loader: one pass over the family file's lines, recognising each by exact
+// prefixes after its indentation, filling a new index.
+#include "model/loadgedcom.h"
+
+#include "platform/linereader.h"
+
+#include <QElapsedTimer>
+#include <QFileInfo>
+
+#include <algorithm>
+#include <cstring>
+#include <limits>
+
+namespace qm {
+
+namespace {
+
+// A line longer than this is cut: no value the index keeps comes near it, and
+// a damaged file cannot make the reader hold a huge line.
+constexpr size_t maxlinebytes = 1 << 20;
+
+constexpr std::string_view noname = "<no name>";
+
+bool startswith(std::string_view s, std::string_view prefix)
+{
+    return s.size() >= prefix.size() && std::memcmp(s.data(), prefix.data(), prefix.size()) == 0;
+}
+
+bool asciionly(std::string_view s)
+{
+    const char* p = s.data();
+    size_t n = s.size();
+    uint64_t bits = 0;
+    while (n >= 8) {
+        uint64_t w;
+        std::memcpy(&w, p, 8);
+        bits |= w;
+        p += 8;
+        n -= 8;
+    }
+    while (n--)
+        bits |= static_cast<unsigned char>(*p++);
+    return (bits & 0x8080808080808080ULL) == 0;
+}
+
+std::string_view trim(std::string_view s)
+{
+    while (!s.empty() && (s.front() == ' ' || s.front() == '\t'))
+        s.remove_prefix(1);
+    while (!s.empty() && (s.back() == ' ' || s.back() == '\t'))
+        s.remove_suffix(1);
+    return s;
+}
+
+// The digits that start at pos, up to the first non-digit (the closing "@",
+// or anything else when it is missing). No digits, or a number too large for
+// a record number, count as 0.
+int32_t numberat(std::string_view line, size_t pos)
+{
+    int64_t v = 0;
+    for (size_t i = pos; i < line.size(); ++i) {
+        const char c = line[i];
+        if (c < '0' || c > '9')
+            break;
+        v = v * 10 + (c - '0');
+        if (v > std::numeric_limits<int32_t>::max())
+            return 0;
+    }
+    return static_cast<int32_t>(v);
+}
+
+bool containscensus(std::string_view line)
+{
+    static constexpr char word[] = "census";
+    for (size_t i = 0; i + 6 <= line.size(); ++i) {
+        size_t k = 0;
+        while (k < 6 && (line[i + k] | 0x20) == word[k])
+            ++k;
+        if (k == 6)
+            return true;
+    }
+    return false;
+}
+
+uint64_t hashbytes(std::string_view s)
+{
+    constexpr uint64_t mul = 0x9E3779B97F4A7C15ULL;
+    uint64_t h = s.size() * mul;
+    const char* p = s.data();
+    size_t n = s.size();
+    while (n >= 8) {
+        uint64_t w;
+        std::memcpy(&w, p, 8);
+        h = (h ^ w) * mul;
+        h ^= h >> 32;
+        p += 8;
+        n -= 8;
+    }
+    uint64_t w = 0;
+    std::memcpy(&w, p, n);
+    h = (h ^ w) * mul;
+    return h ^ (h >> 29);
+}
+
+// Open-addressing map from byte strings (views the caller keeps alive) to values.
+template <typename V>
+class viewmap {
+public:
+    V* find(uint64_t hash, std::string_view key)
+    {
+        if (entries_.empty())
+            return nullptr;
+        for (size_t s = hash & mask_;; s = (s + 1) & mask_) {
+            const int32_t e = slots_[s];
+            if (e < 0)
+                return nullptr;
+            const entry& en = entries_[static_cast<size_t>(e)];
+            if (en.hash == hash && en.key == key)
+                return &entries_[static_cast<size_t>(e)].value;
+        }
+    }
+
+    void insert(uint64_t hash, std::string_view key, V value)
+    {
+        if ((entries_.size() + 1) * 2 > slots_.size())
+            grow();
+        entries_.push_back({hash, key, value});
+        place(hash, static_cast<int32_t>(entries_.size() - 1));
+    }
+
+private:
+    struct entry {
+        uint64_t hash;
+        std::string_view key;
+        V value;
+    };
+
+    void place(uint64_t hash, int32_t e)
+    {
+        size_t s = hash & mask_;
+        while (slots_[s] >= 0)
+            s = (s + 1) & mask_;
+        slots_[s] = e;
+    }
+
+    void grow()
+    {
+        const size_t size = slots_.empty() ? 1024 : slots_.size() * 2;
+        slots_.assign(size, -1);
+        mask_ = size - 1;
+        for (size_t i = 0; i < entries_.size(); ++i)
+            place(entries_[i].hash, static_cast<int32_t>(i));
+    }
+
+    std::vector<entry> entries_;
+    std::vector<int32_t> slots_;
+    size_t mask_ = 0;
+};
+
+class loader {
+public:
+    loader(gedcomindex& ix, textencoding enc) : ix_(ix), enc_(enc) {}
+
+    void line(std::string_view s);
+    void finish();
+
+private:
+    enum class kind { none, source, person, object };
+
+    std::string_view text(std::string_view raw);
+    std::string_view place(std::string_view raw);
+    void startrecord(std::string_view s);
+    void endrecord();
+    void sourceline(std::string_view s);
+    void objectline(std::string_view s);
+    void personline(std::string_view s);
+    void setname(std::string_view s);
+    void flagline(std::string_view s);
+
+    personrec& person() { return ix_.people.back(); }
+    censusrec& lastcensus() { return census_.back(); }
+
+    gedcomindex& ix_;
+    const textencoding enc_;
+    std::string conv_, flagcode_, flagname_; // conversion scratch
+
+    kind kind_ = kind::none;
+    int32_t highestsource = 0;
+    bool namepending = false, birthpending = false, deathpending = false;
+    bool inbirthdate = false, inbirthplace = false, indeath = false;
+    bool inflags = false, incensus = false, titlepending = false;
+
+    // The current individual's lists, gathered here and copied out at the end
+    // of the record so that each list is one allocation of its exact size.
+    std::vector<int32_t> fams_, sourceids_, flagids_;
+    std::vector<censusrec> census_;
+    std::vector<int32_t> censuscites_;      // citations of all its census events, in order
+    std::vector<size_t> censuscitestart_;   // where each event's citations start
+
+    // The place value of the current "2 PLAC " line (UTF-8, trimmed).
+    std::string_view lastplace_;
+
+    // Places: groups in the order first met, found by their key, and every
+    // spelling met found by its bytes as they stand in the file.
+    struct spelling {
+        int32_t group;
+        std::string_view utf8;
+    };
+    textarena keys_; // keys and raw spellings, dropped with the loader
+    viewmap<int32_t> groupbykey_;
+    viewmap<spelling> spellings_;
+    std::vector<placerec> groups_;
+    std::vector<std::string_view> groupkeys_;
+};
+
+std::string_view loader::text(std::string_view raw)
+{
+    if (asciionly(raw))
+        return ix_.arena.store(raw);
+    conv_.clear();
+    appendutf8(raw, enc_, conv_);
+    return ix_.arena.store(conv_);
+}
+
+// Counts one occurrence of a place (raw bytes, trimmed, not empty) and returns its UTF-8 text.
+std::string_view loader::place(std::string_view raw)
+{
+    const uint64_t h = hashbytes(raw);
+    if (spelling* sp = spellings_.find(h, raw)) {
+        ++groups_[static_cast<size_t>(sp->group)].count;
+        return sp->utf8;
+    }
+    const std::string_view utf8 = text(raw);
+    const std::string key = placekey(utf8);
+    const uint64_t kh = hashbytes(key);
+    int32_t group;
+    if (int32_t* g = groupbykey_.find(kh, key)) {
+        group = *g;
+    } else {
+        group = static_cast<int32_t>(groups_.size());
+        groups_.push_back({utf8, 0});
+        const std::string_view storedkey = keys_.store(key);
+        groupkeys_.push_back(storedkey);
+        groupbykey_.insert(kh, storedkey, group);
+    }
+    ++groups_[static_cast<size_t>(group)].count;
+    spellings_.insert(h, keys_.store(raw), {group, utf8});
+    return utf8;
+}
+
+void loader::line(std::string_view s)
+{
+    while (!s.empty() && (s.front() == ' ' || s.front() == '\t'))
+        s.remove_prefix(1);
+    if (s.size() < 2 || s[1] != ' ')
+        return;
+    switch (s[0]) {
+    case '0':
+        startrecord(s);
+        return;
+    case '1':
+        break;
+    case '2':
+        lastplace_ = {};
+        if (s.size() > 7 && startswith(s, "2 PLAC ")) {
+            const std::string_view v = trim(s.substr(7));
+            if (!v.empty())
+                lastplace_ = place(v);
+        }
+        break;
+    default:
+        return;
+    }
+    switch (kind_) {
+    case kind::person:
+        personline(s);
+        break;
+    case kind::source:
+        sourceline(s);
+        break;
+    case kind::object:
+        objectline(s);
+        break;
+    case kind::none:
+        break;
+    }
+}
+
+void loader::startrecord(std::string_view s)
+{
+    endrecord();
+    namepending = birthpending = deathpending = false;
+    inbirthdate = inbirthplace = indeath = inflags = incensus = titlepending = false;
+    kind_ = kind::none;
+    if (s.size() < 4 || !startswith(s, "0 @")) {
+        if (startswith(s, "0 HEAD"))
+            ix_.hashead = true;
+        return;
+    }
+    const int32_t id = numberat(s, 4);
+    switch (s[3]) {
+    case 'S': {
+        kind_ = kind::source;
+        sourcerec& r = ix_.sources.emplace_back();
+        r.id = id;
+        highestsource = std::max(highestsource, id);
+        titlepending = true;
+        break;
+    }
+    case 'I': {
+        kind_ = kind::person;
+        personrec& p = ix_.people.emplace_back();
+        p.id = id;
+        p.name = noname;
+        namepending = birthpending = deathpending = true;
+        break;
+    }
+    case 'O': {
+        kind_ = kind::object;
+        objectrec& o = ix_.objects.emplace_back();
+        o.id = id;
+        ix_.maxobjectid = std::max(ix_.maxobjectid, id);
+        break;
+    }
+    case 'N':
+        ix_.maxnoteid = std::max(ix_.maxnoteid, id);
+        break;
+    default:
+        break;
+    }
+}
+
+void loader::endrecord()
+{
+    if (kind_ != kind::person)
+        return;
+    personrec& p = person();
+    if (!fams_.empty())
+        p.fams.assign(fams_.begin(), fams_.end());
+    if (!sourceids_.empty())
+        p.sourceids.assign(sourceids_.begin(), sourceids_.end());
+    if (!flagids_.empty())
+        p.flagids.assign(flagids_.begin(), flagids_.end());
+    if (!census_.empty()) {
+        censuscitestart_.push_back(censuscites_.size());
+        for (size_t i = 0; i < census_.size(); ++i) {
+            const auto from = censuscites_.begin() + static_cast<std::ptrdiff_t>(censuscitestart_[i]);
+            const auto to = censuscites_.begin() + static_cast<std::ptrdiff_t>(censuscitestart_[i + 1]);
+            if (from != to)
+                census_[i].sourceids.assign(from, to);
+        }
+        p.census.reserve(census_.size());
+        for (censusrec& c : census_)
+            p.census.push_back(std::move(c));
+    }
+    fams_.clear();
+    sourceids_.clear();
+    flagids_.clear();
+    census_.clear();
+    censuscites_.clear();
+    censuscitestart_.clear();
+}
+
+void loader::sourceline(std::string_view s)
+{
+    sourcerec& r = ix_.sources.back();
+    if (titlepending && (startswith(s, "1 TITL ") || startswith(s, "1 ABBR "))) {
+        titlepending = false;
+        r.title = text(trim(s.substr(7)));
+        if (containscensus(s)) {
+            r.iscensus = true;
+            ix_.censussources.push_back(static_cast<int32_t>(ix_.sources.size() - 1));
+        }
+    } else if (startswith(s, "1 OBJE @O")) {
+        r.objectids.push_back(numberat(s, 9));
+    }
+}
+
+void loader::objectline(std::string_view s)
+{
+    objectrec& o = ix_.objects.back();
+    if (startswith(s, "1 FORM "))
+        o.form = text(s.substr(7));
+    else if (startswith(s, "1 TITL "))
+        o.title = text(s.substr(7));
+    else if (startswith(s, "1 _FILE "))
+        o.file = text(s.substr(8));
+    else if (startswith(s, "1 _DATE "))
+        o.date = text(s.substr(8));
+    else if (startswith(s, "2 _ASID ")) {
+        const std::string_view v = trim(s.substr(8));
+        o.maxasid = std::max(o.maxasid, numberat(v, 0));
+    }
+}
+
+// Rule for the first NAME line: "Surname, Given names" from "Given names /Surname/".
+// The surname is the text between the first slash and the next one (or the
+// end of the line); text after the closing slash (a suffix such as "Jr")
+// follows the given names. A value without a slash, or whose only slash ends
+// it, is given names without a surname and stands as it is.
+void loader::setname(std::string_view s)
+{
+    const std::string_view value = s.substr(7);
+    const size_t slash = value.find('/');
+    std::string_view given, surname, suffix;
+    bool hassurname = false;
+    if (slash == std::string_view::npos) {
+        given = trim(value);
+    } else {
+        given = trim(value.substr(0, slash));
+        const std::string_view rest = value.substr(slash + 1);
+        const size_t close = rest.find('/');
+        if (close == std::string_view::npos) {
+            // "Given /Surname" without its closing slash; "Given /" has no surname.
+            surname = trim(rest);
+            hassurname = !surname.empty();
+        } else {
+            surname = trim(rest.substr(0, close));
+            suffix = trim(rest.substr(close + 1));
+            hassurname = true;
+        }
+    }
+    std::string& n = conv_;
+    n.clear();
+    if (hassurname) {
+        appendutf8(surname, enc_, n);
+        if (!given.empty() || !suffix.empty()) {
+            n += ", ";
+            appendutf8(given, enc_, n);
+            if (!given.empty() && !suffix.empty())
+                n += ' ';
+            appendutf8(suffix, enc_, n);
+        }
+    } else {
+        appendutf8(given, enc_, n);
+    }
+    if (!n.empty())
+        person().name = ix_.arena.store(n);
+}
+
+void loader::flagline(std::string_view s)
+{
+    const size_t space = s.find(' ', 2);
+    if (space == std::string_view::npos)
+        return;
+    flagcode_.clear();
+    flagname_.clear();
+    appendutf8(s.substr(2, space - 2), enc_, flagcode_);
+    appendutf8(trim(s.substr(space + 1)), enc_, flagname_);
+    flagids_.push_back(static_cast<int32_t>(noteflag(ix_.flags, flagcode_, flagname_)));
+}
+
+void loader::personline(std::string_view s)
+{
+    personrec& p = person();
+    if (s[0] == '1') {
+        if (namepending && startswith(s, "1 NAME")) {
+            if (s.size() > 7)
+                setname(s);
+            namepending = inflags = incensus = false;
+            // A NAME line ends an event above it like any other level-1 line.
+            inbirthdate = inbirthplace = indeath = false;
+        } else if (birthpending && startswith(s, "1 BIRT")) {
+            birthpending = indeath = inflags = incensus = false;
+            inbirthdate = inbirthplace = true;
+        } else if (deathpending && startswith(s, "1 DEAT")) {
+            deathpending = inbirthdate = inbirthplace = inflags = incensus = false;
+            indeath = true;
+        } else {
+            inbirthdate = inbirthplace = indeath = inflags = incensus = false;
+            if (startswith(s, "1 SEX")) {
+                if (s.size() >= 7)
+                    p.sex = text(s.substr(6));
+            } else if (startswith(s, "1 FAMC @")) {
+                p.famc = numberat(s, 9);
+            } else if (startswith(s, "1 FAMS @")) {
+                fams_.push_back(numberat(s, 9));
+            } else if (startswith(s, "1 _FLGS")) {
+                inflags = true;
+            } else if (startswith(s, "1 CENS")) {
+                incensus = true;
+                census_.emplace_back();
+                censuscitestart_.push_back(censuscites_.size());
+                ++ix_.censusevents;
+            }
+        }
+        return;
+    }
+
+    // Level 2.
+    if (incensus) {
+        if (startswith(s, "2 DATE")) {
+            if (s.size() > 7)
+                lastcensus().date = text(s.substr(7));
+            return;
+        }
+        if (startswith(s, "2 ADDR")) {
+            if (s.size() > 7)
+                lastcensus().address = text(s.substr(7));
+            return;
+        }
+        if (startswith(s, "2 PLAC")) {
+            if (s.size() > 7) {
+                const std::string_view v = s.substr(7);
+                lastcensus().place = !lastplace_.empty() && lastplace_.size() == v.size() && asciionly(v)
+                                         ? lastplace_
+                                         : text(v);
+            }
+            return;
+        }
+        if (startswith(s, "2 AGE")) {
+            if (s.size() > 6)
+                lastcensus().age = text(s.substr(6));
+            return;
+        }
+    }
+    if (inbirthdate && startswith(s, "2 DATE")) {
+        if (s.size() >= 8) {
+            p.birthdate = text(s.substr(7));
+            p.hasbirthdate = true;
+        }
+        inbirthdate = inflags = incensus = false;
+        return;
+    }
+    if (indeath && startswith(s, "2 DATE")) {
+        if (s.size() >= 8) {
+            p.deathdate = text(s.substr(7));
+            p.hasdeathdate = true;
+        }
+        indeath = inflags = incensus = false;
+        return;
+    }
+    if (inbirthplace && startswith(s, "2 PLAC")) {
+        if (s.size() >= 8) {
+            const std::string_view v = s.substr(7);
+            p.birthplace = !lastplace_.empty() && lastplace_.size() == v.size() && asciionly(v) ? lastplace_ : text(v);
+            p.hasbirthplace = true;
+        }
+        inbirthplace = inflags = incensus = false;
+        return;
+    }
+    if (inflags && startswith(s, "2 __")) {
+        flagline(s);
+        incensus = false;
+        return;
+    }
+    if (startswith(s, "2 SOUR @")) {
+        const int32_t id = numberat(s, 9);
+        sourceids_.push_back(id);
+        if (incensus)
+            censuscites_.push_back(id);
+    }
+}
+
+void loader::finish()
+{
+    endrecord();
+    kind_ = kind::none;
+    ix_.nextsourceid = highestsource < std::numeric_limits<int32_t>::max() ? highestsource + 1 : highestsource;
+
+    // Groups sorted by key; keys are distinct, so the order is total.
+    std::vector<int32_t> order(groups_.size());
+    for (size_t i = 0; i < order.size(); ++i)
+        order[i] = static_cast<int32_t>(i);
+    std::sort(order.begin(), order.end(), [&](int32_t a, int32_t b) {
+        return groupkeys_[static_cast<size_t>(a)] < groupkeys_[static_cast<size_t>(b)];
+    });
+    ix_.places.clear();
+    ix_.places.reserve(order.size());
+    for (int32_t g : order)
+        ix_.places.push_back(groups_[static_cast<size_t>(g)]);
+}
+
+// Reserves room for the records a file of this size may hold. Growing the
+// tables by copying would touch their memory twice over; room reserved beyond
+// what is used is never touched, so it costs address space, not memory.
+void reservetables(gedcomindex& index, int64_t bytes)
+{
+    const auto room = [&](int64_t bytesper) { return static_cast<size_t>(std::max<int64_t>(bytes / bytesper, 64)); };
+    index.people.reserve(room(256));
+    index.sources.reserve(room(2048));
+    index.objects.reserve(room(2048));
+}
+
+void loadlines(linereader& reader, gedcomindex& index)
+{
+    index.encoding = reader.encoding();
+    index.bom = reader.hasbom();
+    loader l(index, reader.encoding());
+    std::string_view s;
+    while (reader.next(s))
+        l.line(s);
+    l.finish();
+}
+
+} // namespace
+
+loadresult loadgedcom(const QString& path, const flagtable& flagdefs)
+{
+    QElapsedTimer timer;
+    timer.start();
+    loadresult result;
+    linereader reader;
+    reader.setmaxline(maxlinebytes);
+    QString error;
+    if (!reader.open(path, &error)) {
+        result.error = error;
+        return result;
+    }
+    auto index = std::make_unique<gedcomindex>();
+    index->gedcomfile = QFileInfo(path).absoluteFilePath();
+    index->gedcomdate = stampof(path);
+    index->flags = flagdefs;
+    reservetables(*index, index->gedcomdate.size);
+    loadlines(reader, *index);
+    if (reader.failed()) {
+        result.error = QStringLiteral("The file %1 could not be read: %2").arg(path, reader.errorstring());
+        return result;
+    }
+    result.index = std::move(index);
+    result.ms = static_cast<double>(timer.nsecsElapsed()) / 1e6;
+    return result;
+}
+
+std::unique_ptr<gedcomindex> loadgedcombytes(std::string_view bytes, const flagtable& flagdefs)
+{
+    linereader reader;
+    reader.setmaxline(maxlinebytes);
+    reader.openbytes(bytes);
+    auto index = std::make_unique<gedcomindex>();
+    index->flags = flagdefs;
+    reservetables(*index, static_cast<int64_t>(bytes.size()));
+    loadlines(reader, *index);
+    return index;
+}
+
+QString nopeoplemessage()
+{
+    return QStringLiteral("There are no individuals recorded in the selected file. This is probably because the file "
+                          "selected was not a GEDCOM file. Please select 'Open another GEDCOM family history file' "
+                          "from the File menu to try again.");
+}
+
+} // namespace qm
