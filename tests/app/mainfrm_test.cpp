@@ -1,0 +1,362 @@
+// End-to-end tests of the main window on the offscreen platform: start-up,
+// file opening, recent files, choosing the household and reloading.
+#include "app/mainfrm.h"
+#include "census/entrypanel_ui.h"
+#include "census/householdpanel_ui.h"
+#include "platform/encoding.h"
+#include "platform/scriptedprompts.h"
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QAction>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QDir>
+#include <QFile>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListView>
+#include <QPlainTextEdit>
+#include <QProcess>
+#include <QPushButton>
+#include <QTemporaryDir>
+#include <QTest>
+#include <QToolButton>
+
+using namespace qm;
+
+namespace {
+
+// One run of the program: prompts, settings store and window.
+struct session {
+    scriptedprompts prompts;
+    std::unique_ptr<settingsstore> store;
+    std::unique_ptr<mainfrm> w;
+
+    explicit session(const QString& ini) : store(settingsstore::onfile(ini)) {}
+
+    void make() { w = std::make_unique<mainfrm>(prompts, *store); }
+    QString read(const char* name) const { return store->read(QString::fromLatin1(name)).value_or(QString()); }
+};
+
+template <class T>
+QList<T*> rowcontrols(mainfrm& w, const char* name)
+{
+    return w.findChild<censusrowsview*>()->findChildren<T*>(QString::fromLatin1(name));
+}
+
+QListView* peoplelist(mainfrm& w)
+{
+    return w.findChild<QListView*>(QStringLiteral("allpeoplelst"));
+}
+
+QListView* familylist(mainfrm& w)
+{
+    return w.findChild<QListView*>(QStringLiteral("familylst"));
+}
+
+// Row of the list entry of the individual with this record number, or -1.
+int rowofid(mainfrm& w, QListView* view, int32_t id)
+{
+    auto* model = static_cast<peoplelistmodel*>(view->model());
+    for (int r = 0; r < model->rowCount(); ++r) {
+        const int32_t k = model->personat(r);
+        if (w.index()->people[static_cast<size_t>(k)].id == id)
+            return r;
+    }
+    return -1;
+}
+
+void clickrow(QListView* view, int row)
+{
+    const QModelIndex i = view->model()->index(row, 0);
+    view->scrollTo(i);
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, view->visualRect(i).center());
+}
+
+void clickid(mainfrm& w, QListView* view, int32_t id)
+{
+    const int r = rowofid(w, view, id);
+    QVERIFY2(r >= 0, qPrintable(QStringLiteral("no entry for ID %1").arg(id)));
+    clickrow(view, r);
+}
+
+void chooseyear(mainfrm& w, const QString& year)
+{
+    QComboBox* years = w.panel()->yearcom;
+    const int i = years->findText(year);
+    QVERIFY(i >= 0);
+    years->setCurrentIndex(i);
+}
+
+[[maybe_unused]] QStringList shownnames(mainfrm& w)
+{
+    QStringList out;
+    for (QLabel* l : rowcontrols<QLabel>(w, "namelab"))
+        out << l->text();
+    while (!out.isEmpty() && out.back().isEmpty())
+        out.removeLast();
+    return out;
+}
+
+[[maybe_unused]] bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
+{
+    QFile f(path);
+    if (!f.open(QIODevice::ReadOnly))
+        return false;
+    QByteArray b = f.readAll();
+    f.close();
+    if (!b.contains(from))
+        return false;
+    b.replace(from, to);
+    if (!f.open(QIODevice::WriteOnly | QIODevice::Truncate))
+        return false;
+    return f.write(b) == b.size();
+}
+
+} // namespace
+
+class mainfrm_test : public QObject {
+    Q_OBJECT
+
+private:
+    QTemporaryDir dir_;
+    int runs_ = 0;
+
+    QString sample()
+    {
+        const QString to = dir_.filePath(QStringLiteral("sample%1.ged").arg(++runs_));
+        QFile::copy(qmtest::samplefile(), to);
+        QFile(to).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+        return to;
+    }
+    QString ini() { return dir_.filePath(QStringLiteral("settings%1.ini").arg(++runs_)); }
+
+    // A window started on `file` from the command line, the default-file
+    // question answered No; shown, so that lists can be clicked.
+    std::unique_ptr<session> opened(const QString& file, const settings* s = nullptr)
+    {
+        auto r = std::make_unique<session>(ini());
+        if (s)
+            savesettings(*r->store, *s);
+        r->make();
+        r->prompts.expect(answer::no, QStringLiteral("by default"));
+        if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
+            return nullptr;
+        r->w->show();
+        if (!QTest::qWaitForWindowExposed(r->w.get()))
+            return nullptr;
+        return r;
+    }
+
+    QString generated(int individuals)
+    {
+        const QString out = dir_.filePath(QStringLiteral("gen%1.ged").arg(individuals));
+        if (QFile::exists(out))
+            return out;
+        const int rc = QProcess::execute(QStringLiteral("python3"),
+                                         {QStringLiteral(QM_GENERATOR), QStringLiteral("--individuals"),
+                                          QString::number(individuals), QStringLiteral("-o"), out});
+        return rc == 0 ? out : QString();
+    }
+
+private slots:
+    void initTestCase() { QVERIFY(dir_.isValid()); }
+
+    void startfromcommandline()
+    {
+        const QString file = sample();
+        auto s = opened(file);
+        QVERIFY(s);
+        QCOMPARE(s->w->index()->people.size(), size_t(40));
+        QVERIFY(s->w->windowTitle().endsWith(QStringLiteral(" - ") + QFileInfo(file).fileName()));
+        QVERIFY(s->w->windowTitle().startsWith(QStringLiteral("Quillmark v")));
+        QCOMPARE(s->read("Recent Files  1"), file);
+        QCOMPARE(s->read("Gedcom Folder"), dir_.path() + QLatin1Char('/'));
+        QCOMPARE(s->read("Default File"), QString());
+        QCOMPARE(peoplelist(*s->w)->model()->rowCount(), 40);
+        QVERIFY(s->w->findChild<QCheckBox*>(QStringLiteral("allpeoplechk"))->isChecked());
+        QVERIFY(!s->w->findChild<QCheckBox*>(QStringLiteral("allpeoplechk"))->isEnabled());
+        QVERIFY(s->w->watching());
+        QVERIFY(s->w->firststart()); // settings never saved
+        QCOMPARE(s->prompts.unexpected(), 0);
+    }
+
+    void startfromdefaultfileandfromdialog()
+    {
+        const QString file = sample();
+        const QString settingsfile = ini();
+        {
+            // No default: the Open dialog; Yes makes the file the default.
+            session s(settingsfile);
+            s.make();
+            s.prompts.expectfile(file);
+            s.prompts.expect(answer::yes, QStringLiteral("Do you want to open this file by default"));
+            QVERIFY(s.w->start({}));
+            QCOMPARE(s.read("Default File"), file);
+            QCOMPARE(s.prompts.unexpected(), 0);
+        }
+        {
+            // The default file opens without a question or dialog.
+            session s(settingsfile);
+            s.make();
+            QVERIFY(s.w->start({QStringLiteral("\"\"")})); // two quotes: no file named
+            QCOMPARE(s.w->gedcomfile(), file);
+            QCOMPARE(s.prompts.unexpected(), 0);
+        }
+        {
+            // A missing file named on the command line is reported; the
+            // default file still opens and stays the default.
+            session s(settingsfile);
+            s.make();
+            s.prompts.expect(answer::ok, QStringLiteral("The file selected does not exist. Please try again."));
+            QVERIFY(s.w->start({dir_.filePath(QStringLiteral("gone.ged"))}));
+            QCOMPARE(s.w->gedcomfile(), file);
+            QCOMPARE(s.read("Default File"), file);
+            QCOMPARE(s.prompts.unexpected(), 0);
+        }
+        QVERIFY(QFile::remove(file));
+        {
+            // A missing default file is dropped silently; cancelling the
+            // dialog ends the program.
+            session s(settingsfile);
+            s.make();
+            s.prompts.expectfile(std::nullopt);
+            QVERIFY(!s.w->start({}));
+            QCOMPARE(s.read("Default File"), QString());
+            QCOMPARE(s.prompts.unexpected(), 0);
+        }
+    }
+
+    void recentfilesmenu()
+    {
+        // Paths longer than 40 characters.
+        const QString folder = dir_.filePath(QStringLiteral("a folder with a rather long name"));
+        QVERIFY(QDir().mkpath(folder));
+        QStringList files;
+        for (const char* n : {"a.ged", "b.ged", "c.ged"}) {
+            files << QDir(folder).filePath(QString::fromLatin1(n));
+            QVERIFY(QFile::copy(sample(), files.back()));
+        }
+        const QString a = files[0], b = files[1], c = files[2];
+        auto s = opened(a);
+        QVERIFY(s);
+        QAction* open = s->w->findChild<QAction*>(QStringLiteral("openmen"));
+        // "File Open Default" is on: every file opened asks about the default.
+        for (const QString& f : {b, c}) {
+            s->prompts.expectfile(f);
+            s->prompts.expect(answer::no, QStringLiteral("by default"));
+            open->trigger();
+        }
+        QCOMPARE(s->w->recent().paths, (std::array<QString, 4>{c, b, a, QString()}));
+        // Re-opening the third moves it to the first slot.
+        QAction* third = s->w->findChild<QAction*>(QStringLiteral("RecentFilesmen3"));
+        QVERIFY(third->isVisible());
+        s->prompts.expect(answer::no, QStringLiteral("by default"));
+        third->trigger();
+        QCOMPARE(s->w->gedcomfile(), a);
+        QCOMPARE(s->w->recent().paths, (std::array<QString, 4>{a, c, b, QString()}));
+        QVERIFY(!s->w->findChild<QAction*>(QStringLiteral("RecentFilesmen4"))->isVisible());
+        // Captions: the temporary paths are longer than 40 characters.
+        QVERIFY(a.size() > 40);
+        QCOMPARE(s->w->findChild<QAction*>(QStringLiteral("RecentFilesmen1"))->text(),
+                 QStringLiteral("&1..") + a.right(40));
+        QCOMPARE(s->read("Recent Files  2"), c);
+
+        // A missing recent file can be removed from the list.
+        QVERIFY(QFile::remove(c));
+        s->prompts.expect(answer::yes, QStringLiteral("Do you want to remove it from the recent files list?"));
+        s->w->findChild<QAction*>(QStringLiteral("RecentFilesmen2"))->trigger();
+        QCOMPARE(s->prompts.history().back().m.title, QStringLiteral("Open Recent File"));
+        QCOMPARE(s->w->recent().paths, (std::array<QString, 4>{a, b, QString(), QString()}));
+        QCOMPARE(s->w->gedcomfile(), a);
+        QVERIFY(s->w->watching());
+        QCOMPARE(s->prompts.unexpected(), 0);
+    }
+
+    void chooseyearandindividuals()
+    {
+        auto s = opened(sample());
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        chooseyear(w, QStringLiteral("1881"));
+        QCOMPARE(w.panel()->fixeddatetxt->text(), QStringLiteral("3 APR 1881"));
+        QVERIFY(w.panel()->fixeddatetxt->isEnabled());
+        QVERIFY(w.findChild<QCheckBox*>(QStringLiteral("allpeoplechk"))->isEnabled());
+        QCOMPARE(w.findChild<QLabel*>(QStringLiteral("alllab"))->text(), QStringLiteral("All Individuals:"));
+
+        clickid(w, peoplelist(w), 11); // William Ashworth junior
+        QCOMPARE(w.household().selectioncount, 1);
+        QVERIFY(w.findChild<QLabel*>(QStringLiteral("immediatefamilylab"))->text().startsWith("Immediate Family of "));
+        QVERIFY(w.findChild<QPushButton*>(QStringLiteral("Autosourcebut"))->isEnabled());
+        QVERIFY(w.findChild<QLabel*>(QStringLiteral("infolab"))->text().contains(QStringLiteral("in this census would be aged")));
+        // Age box: digits only, three at most.
+        QLineEdit* age0 = rowcontrols<QLineEdit>(w, "agetxt")[0];
+        QCOMPARE(QApplication::focusWidget(), age0);
+        QTest::keyClicks(age0, QStringLiteral("3x45 6"));
+        QCOMPARE(age0->text(), QStringLiteral("345"));
+        age0->setText(QStringLiteral("28"));
+        // Unit box: D, M and Y only, upper-cased; a click cycles Y, M, D.
+        QLineEdit* unit0 = rowcontrols<QLineEdit>(w, "agetypetxt")[0];
+        QTest::keyClicks(unit0, QStringLiteral("q"));
+        QCOMPARE(unit0->text(), QStringLiteral("Y"));
+        QTest::keyClicks(unit0, QStringLiteral("m"));
+        QCOMPARE(unit0->text(), QStringLiteral("M"));
+        QTest::mouseClick(unit0, Qt::LeftButton);
+        QCOMPARE(unit0->text(), QStringLiteral("D"));
+        QTest::mouseClick(unit0, Qt::LeftButton);
+        QCOMPARE(unit0->text(), QStringLiteral("Y"));
+        // Empty rows take no typing.
+        QLineEdit* age5 = rowcontrols<QLineEdit>(w, "agetxt")[5];
+        QTest::keyClicks(age5, QStringLiteral("12"));
+        QCOMPARE(age5->text(), QString());
+
+        // The wife, from the immediate family list.
+        QListView* family = familylist(w);
+        QVERIFY(family->model()->rowCount() > 0);
+        const int wife = rowofid(w, family, 27);
+        QVERIFY(wife >= 0);
+        QVERIFY(static_cast<peoplelistmodel*>(family->model())->textat(wife).startsWith(QStringLiteral("WED ")));
+        clickrow(family, wife);
+        QCOMPARE(shownnames(w).size(), 2);
+        QCOMPARE(w.household().selectioncount, 2);
+
+        // A third choice before the second row has an age is refused.
+        s->prompts.expect(answer::ok, QStringLiteral("You must first enter an age for this individual"));
+        clickid(w, peoplelist(w), 28);
+        QCOMPARE(w.household().selectioncount, 2);
+        QCOMPARE(QApplication::focusWidget(), rowcontrols<QLineEdit>(w, "agetxt")[1]);
+        QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[1], QStringLiteral("26"));
+
+        // Choosing the same individual again.
+        s->prompts.expect(answer::ok, QStringLiteral("This individual has already been selected"));
+        clickid(w, peoplelist(w), 11);
+        QCOMPARE(w.household().selectioncount, 2);
+
+        // John Ashworth (I3) already has a census event on 3 APR 1881.
+        s->prompts.expect(answer::no, QStringLiteral("This individual already has a census record for 3 APR 1881 at "
+                                                     "Hebden Bridge, Yorkshire, England. Are you sure"));
+        clickid(w, peoplelist(w), 3);
+        QCOMPARE(w.household().selectioncount, 2);
+        QCOMPARE(s->prompts.history().back().m.kind, icon::exclamation);
+        s->prompts.expect(answer::yes, QStringLiteral("already has a census record"));
+        clickid(w, peoplelist(w), 3);
+        QCOMPARE(w.household().selectioncount, 3);
+        QCOMPARE(rowcontrols<QLabel>(w, "idlab")[2]->text(), QStringLiteral("3"));
+        QCOMPARE(s->prompts.unexpected(), 0);
+
+        // Closing with rows in use asks first.
+        s->prompts.expect(answer::no, QStringLiteral("You have a partial or full census entry"));
+        QVERIFY(!w.close());
+        QVERIFY(w.isVisible());
+        QCOMPARE(s->prompts.history().back().m.title, QStringLiteral("Leaving Quillmark?"));
+        s->prompts.expect(answer::yes, QStringLiteral("You have a partial or full census entry"));
+        QVERIFY(w.close());
+        QVERIFY(!s->read("Main Width").isEmpty());
+        QCOMPARE(s->prompts.unexpected(), 0);
+    }
+};
+
+QTEST_MAIN(mainfrm_test)
+#include "mainfrm_test.moc"
