@@ -651,11 +651,41 @@ rewriteresult refuse(const QString& message)
     return r;
 }
 
+// The flag lines a run will write come from the flag table, whose names the
+// user may have typed: they too must fit the file's encoding.
+QString checkflagnames(const gedcomindex& ix, const settings& s, const rewriterequest& rq, textencoding enc)
+{
+    if (enc == textencoding::other8bit)
+        enc = textencoding::windows1252; // names met in such a file come back to its own bytes
+    std::vector<size_t> flags;
+    if (rq.mode == rewritemode::censusentry && s.flaguse && !ix.flags.empty()) {
+        if (const auto f = findentryflag(ix.flags, u8(rq.entry.entrydate.trimmed()), u8(s.country)))
+            flags.push_back(*f);
+    } else if (rq.mode == rewritemode::flagchanges) {
+        for (const flagchange& c : rq.flagchanges)
+            if (c.add && c.flag >= 0 && c.flag < static_cast<int32_t>(ix.flags.size()))
+                flags.push_back(static_cast<size_t>(c.flag));
+    }
+    for (size_t f : flags) {
+        const QString name = qs(ix.flags[f].code) + QLatin1Char(' ') + qs(ix.flags[f].name);
+        if (const char32_t bad = unencodable(name, enc)) {
+            return QStringLiteral("The flag %1 holds the character \"%2\", which this family file cannot hold: it is "
+                                  "written in %3. Please rename the flag and try again. Nothing has been changed.")
+                .arg(qs(ix.flags[f].name), QString::fromUcs4(&bad, 1), encodingtitle(enc));
+        }
+    }
+    return {};
+}
+
 // Runs over an opened reader and writer. The writer is left to be committed
 // when the run went well, and cancelled otherwise.
 rewriteresult runrewrite(linereader& in, linewriter& out, const gedcomindex& ix, const settings& s,
                          const rewriterequest& rq)
 {
+    if (const QString bad = checkflagnames(ix, s, rq, in.encoding()); !bad.isEmpty()) {
+        out.cancel();
+        return refuse(bad);
+    }
     rewriterun run(in, out, ix, s, rq);
     rewriteresult r = run.run();
     if (r.error.isEmpty() && out.failed())

@@ -12,6 +12,16 @@
 // family file byte for byte as it was. The run never shows anything: it
 // returns the user's message, and the caller shows it (and, for a failed run,
 // ends the program as it always has).
+//
+// Where new records go: each after the record numbered one less (OBJE after
+// the last multimedia record, NOTE after the note maxnoteid, SOUR after the
+// source sourceid - 1), the first of its kind before the first record of the
+// kinds that follow it. A record whose anchor never comes is written before
+// "0 TRLR" rather than lost. The end of the file stands in for a missing
+// "0 TRLR": the census block and change stamp of an individual whose record
+// ends the file, and any new record still due, are written there. An
+// individual of the entry whose record is not in the file, or a source to
+// extend that is not there, refuses the run with the file untouched.
 
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"

@@ -220,6 +220,18 @@ TEST_F(RewriteEdges, FlagUseGivesTheFlagOnceAndCountsIt)
     EXPECT_EQ(std::count(x.out.begin(), x.out.end(), "2 __C1881 Census 1881"), 1);
 }
 
+TEST_F(RewriteEdges, AFlagNameTheFileCannotHoldIsRefused)
+{
+    flagtable defs{{"__SPIS_1881", "Spis ludno\xC5\x9B\x63i", "1881", 0, "UK"}};
+    const std::string input = "0 HEAD\r\n1 CHAR ANSI\r\n0 @I1@ INDI\r\n0 TRLR\r\n";
+    rewriterequest r;
+    r.mode = rewritemode::flagchanges;
+    r.flagchanges = {{0, 0, true}};
+    const run x = rewrite(input, settings{}, r, defs);
+    EXPECT_TRUE(x.result.refused);
+    EXPECT_TRUE(x.result.message.startsWith(QStringLiteral("The flag Spis"))) << x.result.message.toStdString();
+}
+
 TEST_F(RewriteEdges, FlagRemovalComparesWholeCodesAndKeepsOtherLines)
 {
     flagtable defs{{"__C1881", "Census 1881", "1881", 0, "UK"}};
