@@ -170,7 +170,7 @@ void mainfrm::buildform()
                 connect(e, &QLineEdit::textChanged, this, &mainfrm::refreshtitle);
         }
     }
-    v->addWidget(panels_, 4);
+    v->addWidget(panels_, 1);
 
     auto* buttons = new QHBoxLayout;
     addbut_ = new QPushButton(QStringLiteral("Save Census Entry"), central);
@@ -210,7 +210,7 @@ void mainfrm::buildform()
     v->addWidget(infolab_);
 
     household_ = new householdpanel(central);
-    v->addWidget(household_, 6);
+    v->addWidget(household_, 3);
     setCentralWidget(central);
 
     connect(household_->allpeoplechk, &QCheckBox::clicked, this, &mainfrm::showallclicked);
@@ -226,12 +226,14 @@ void mainfrm::buildform()
 void mainfrm::placewindow()
 {
     const double dpi = logicalDpiX() > 0 ? logicalDpiX() : 96;
-    QSize size(twipstopixels(12000, dpi), twipstopixels(8950, dpi));
-    size = size.expandedTo(sizeHint());
     const QScreen* screen = QGuiApplication::primaryScreen();
     const QRect avail = screen ? screen->availableGeometry() : QRect(0, 0, 1366, 728);
     // Room for the frame and title bar of the window manager.
     const QSize room(avail.width() - 16, avail.height() - 40);
+    // The classic 12000 x 8950 twips, grown to what the rows and lists need
+    // and to a comfortable 1280 x 760 where the screen allows.
+    QSize size(twipstopixels(12000, dpi), twipstopixels(8950, dpi));
+    size = size.expandedTo(sizeHint()).expandedTo(QSize(1280, 760));
     resize(size.boundedTo(room));
 
     const placement p = readplacement(store_);
@@ -605,6 +607,7 @@ void mainfrm::refreshtitle()
     p->titletxt->setText(maketitle(settings_.title, p->yearcom->currentText().trimmed(), p->fixeddatetxt->text(),
                                    p->locationtxt->text(), p->addresstxt->text(), p->othertxt->text(),
                                    p->referencetxt->text().trimmed(), settings_.country));
+    p->titletxt->setCursorPosition(0);
 }
 
 void mainfrm::datechanged()

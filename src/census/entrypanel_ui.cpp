@@ -79,11 +79,14 @@ entrypanel::entrypanel(int m, QWidget* parent) : QWidget(parent), mode(m)
         grid->addWidget(caption(this, QStringLiteral("Existing Source:"), sourcecom), row, 0);
         grid->addWidget(sourcecom, row, 1, 1, 2);
         auto* id = new QHBoxLayout;
+        id->setSpacing(6);
         id->addWidget(caption(this, QStringLiteral("Source ID:"), sourceidlab));
         id->addWidget(sourceidlab, 1);
         grid->addLayout(id, row, 3);
     } else {
         auto* id = new QHBoxLayout;
+        id->setSpacing(6);
+        id->addStretch(1);
         id->addWidget(caption(this, QStringLiteral("New Source ID:"), sourceidlab));
         id->addWidget(sourceidlab, 1);
         grid->addLayout(id, row, 2, 1, 2);
@@ -122,6 +125,8 @@ entrypanel::entrypanel(int m, QWidget* parent) : QWidget(parent), mode(m)
     dividerpic = new QSplitter(Qt::Vertical, this);
     dividerpic->setObjectName(QStringLiteral("dividerpic"));
     dividerpic->setChildrenCollapsible(false);
+    // The fields on the left decide the panel's height; the two boxes share it.
+    dividerpic->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);
     const auto half = [this](const QString& text, QPlainTextEdit* box) {
         auto* w = new QWidget(dividerpic);
         auto* v = new QVBoxLayout(w);
