@@ -13,6 +13,9 @@ const std::vector<clicommand>& clicommands()
     static const std::vector<clicommand> commands = {
         {"stats", "FILE [--settings S.ini]",
          "load FILE and print what it holds as one JSON object (individuals, sources, places, ...)", clistats},
+        {"add-entry", "FILE --entry ENTRY.json [--settings S.ini]",
+         "save the census entry described by ENTRY.json into FILE (backup, rewrite, census log); see docs/cli.md",
+         cliaddentry},
     };
     return commands;
 }

@@ -1,0 +1,336 @@
+// quillmark-cli add-entry: saves one census entry (a new census source, or a
+// citation of an existing one) into a family file without windows, through the
+// same checks and the same save road as "Save Census Entry".
+#include "app/cli.h"
+
+#include "census/birthdate.h"
+#include "census/censustable.h"
+#include "census/validateentry.h"
+#include "flags/flagtable.h"
+#include "model/dates.h"
+#include "model/loadgedcom.h"
+#include "writer/maketitle.h"
+#include "writer/saveroad.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QHash>
+#include <QJsonArray>
+#include <QJsonDocument>
+#include <QJsonObject>
+
+#include <cstdio>
+#include <optional>
+
+namespace qm {
+
+namespace {
+
+// One individual as the entry file gives it.
+struct entryperson {
+    int32_t id = 0;
+    QString age;
+    QChar agetype = u'Y';
+    QString occupation;
+    std::optional<QString> birthplace;
+};
+
+// The entry file's object, read but not yet checked against the family file.
+struct entryfile {
+    std::optional<int> year;
+    std::optional<QString> date;
+    QString place, address, reference, sourcetext, notetext, other;
+    std::optional<QString> title;
+    std::optional<int32_t> source;
+    std::vector<entryperson> people;
+};
+
+// Line breaks as the form's text boxes give them.
+QString crlf(QString text)
+{
+    text.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
+    text.replace(u'\r', u'\n');
+    text.replace(QStringLiteral("\n"), QStringLiteral("\r\n"));
+    return text;
+}
+
+bool readtext(const QJsonObject& o, const char* key, QString& out, QString& error)
+{
+    const QJsonValue v = o.value(QLatin1String(key));
+    if (v.isUndefined() || v.isNull())
+        return true;
+    if (!v.isString()) {
+        error = QStringLiteral("\"%1\" must be a text").arg(QLatin1String(key));
+        return false;
+    }
+    out = v.toString();
+    return true;
+}
+
+// A whole number given as a JSON number or as a text of digits.
+bool readnumber(const QJsonValue& v, const QString& what, int64_t& out, QString& error)
+{
+    bool ok = false;
+    if (v.isDouble()) {
+        const double d = v.toDouble();
+        ok = d == static_cast<double>(static_cast<int64_t>(d)) && d >= 0 && d < 2147483648.0;
+        out = static_cast<int64_t>(d);
+    } else if (v.isString()) {
+        out = v.toString().trimmed().toInt(&ok);
+        ok = ok && out >= 0;
+    }
+    if (!ok)
+        error = QStringLiteral("%1 must be a whole number").arg(what);
+    return ok;
+}
+
+bool readentry(const QByteArray& bytes, entryfile& e, QString& error)
+{
+    QJsonParseError perr;
+    const QJsonDocument doc = QJsonDocument::fromJson(bytes, &perr);
+    if (doc.isNull()) {
+        error = QStringLiteral("the entry file is not valid JSON: %1 at offset %2").arg(perr.errorString()).arg(perr.offset);
+        return false;
+    }
+    if (!doc.isObject()) {
+        error = QStringLiteral("the entry file must hold one JSON object");
+        return false;
+    }
+    const QJsonObject o = doc.object();
+    int64_t n = 0;
+    if (o.contains(QLatin1String("year"))) {
+        if (!readnumber(o.value(QLatin1String("year")), QStringLiteral("\"year\""), n, error))
+            return false;
+        e.year = static_cast<int>(n);
+    }
+    if (o.contains(QLatin1String("date"))) {
+        e.date.emplace();
+        if (!readtext(o, "date", *e.date, error))
+            return false;
+    }
+    if (o.contains(QLatin1String("title"))) {
+        e.title.emplace();
+        if (!readtext(o, "title", *e.title, error))
+            return false;
+    }
+    if (o.contains(QLatin1String("source"))) {
+        if (!readnumber(o.value(QLatin1String("source")), QStringLiteral("\"source\""), n, error))
+            return false;
+        e.source = static_cast<int32_t>(n);
+    }
+    if (!readtext(o, "place", e.place, error) || !readtext(o, "address", e.address, error)
+        || !readtext(o, "reference", e.reference, error) || !readtext(o, "source_text", e.sourcetext, error)
+        || !readtext(o, "note_text", e.notetext, error) || !readtext(o, "other", e.other, error))
+        return false;
+    e.sourcetext = crlf(e.sourcetext);
+    e.notetext = crlf(e.notetext);
+
+    const QJsonValue list = o.value(QLatin1String("individuals"));
+    if (!list.isUndefined() && !list.isNull() && !list.isArray()) {
+        error = QStringLiteral("\"individuals\" must be a list");
+        return false;
+    }
+    int k = 0;
+    for (const QJsonValue& v : list.toArray()) {
+        ++k;
+        if (!v.isObject()) {
+            error = QStringLiteral("individual %1 of the list must be an object").arg(k);
+            return false;
+        }
+        const QJsonObject p = v.toObject();
+        entryperson person;
+        if (!readnumber(p.value(QLatin1String("id")), QStringLiteral("\"id\" of individual %1").arg(k), n, error))
+            return false;
+        person.id = static_cast<int32_t>(n);
+        const QJsonValue age = p.value(QLatin1String("age"));
+        if (age.isDouble() && age.toDouble() >= 0 && age.toDouble() == static_cast<double>(age.toInt()))
+            person.age = QString::number(age.toInt());
+        else if (!readtext(p, "age", person.age, error))
+            return false;
+        QString type = QStringLiteral("Y");
+        if (!readtext(p, "agetype", type, error) || !readtext(p, "occupation", person.occupation, error))
+            return false;
+        // Anything but one letter Y, M or D is refused by the household check.
+        person.agetype = type.size() == 1 ? type[0] : QChar(u'?');
+        if (p.contains(QLatin1String("birthplace"))) {
+            person.birthplace.emplace();
+            if (!readtext(p, "birthplace", *person.birthplace, error))
+                return false;
+        }
+        e.people.push_back(std::move(person));
+    }
+    return true;
+}
+
+// The census the entry names: by its year, or else the one whose official day
+// (or, failing that, whose year) the date falls on.
+const censusdef* choosecensus(const entryfile& e, const QString& country)
+{
+    if (e.year)
+        return lookupcensus(country, *e.year);
+    if (!e.date)
+        return nullptr;
+    const std::optional<QDate> day = recognisedate(*e.date);
+    if (!day)
+        return nullptr;
+    for (const censusdef& c : censustable())
+        if (c.country == country && recognisedate(c.date) == day)
+            return &c;
+    return lookupcensus(country, day->year());
+}
+
+} // namespace
+
+int cliaddentry(QStringList args)
+{
+    QString inipath, error, entrypath;
+    if (!takesettingsoption(args, &inipath, &error))
+        return clifail(error);
+    for (qsizetype i = 0; i < args.size(); ++i) {
+        if (args[i] == QLatin1String("--entry") && i + 1 < args.size()) {
+            entrypath = args[i + 1];
+            args.remove(i, 2);
+            break;
+        }
+        if (args[i].startsWith(QLatin1String("--entry="))) {
+            entrypath = args[i].mid(8);
+            args.remove(i);
+            break;
+        }
+    }
+    for (const QString& a : args)
+        if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-"))
+            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
+    if (args.size() != 1 || entrypath.isEmpty())
+        return clifail(QStringLiteral("add-entry needs a family file and an entry: "
+                                      "quillmark-cli add-entry FILE --entry ENTRY.json [--settings S.ini]"));
+    const QString path = args.front();
+    if (!QFileInfo(path).isFile())
+        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
+
+    QFile ef(entrypath);
+    if (!ef.open(QIODevice::ReadOnly))
+        return clifail(QStringLiteral("cannot read the entry file %1: %2").arg(QDir::toNativeSeparators(entrypath), ef.errorString()));
+    entryfile e;
+    if (!readentry(ef.readAll(), e, error))
+        return clifail(error);
+
+    const auto cs = opensettings(inipath, &error);
+    if (!cs)
+        return clifail(error);
+    const settings& s = cs->values;
+    flagtable flagdefs;
+    if (!loadflagdefs(*cs->store, flagdefs))
+        std::fputs(("quillmark-cli: warning: " + flagloaderrormessage().toStdString() + "\n").c_str(), stderr);
+
+    const loadresult loaded = loadgedcom(path, flagdefs);
+    if (!loaded.index)
+        return clifail(loaded.error);
+    const gedcomindex& ix = *loaded.index;
+    if (!ix.hashead)
+        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
+                           .arg(QDir::toNativeSeparators(path)));
+
+    // The household, looked up in one pass over the individuals.
+    QHash<int32_t, int32_t> wanted;
+    for (const entryperson& p : e.people)
+        wanted.insert(p.id, -1);
+    for (size_t i = 0; i < ix.people.size(); ++i) {
+        const auto it = wanted.find(ix.people[i].id);
+        if (it != wanted.end() && *it < 0)
+            *it = static_cast<int32_t>(i);
+    }
+    entryform form;
+    for (const entryperson& p : e.people) {
+        selectionrec r;
+        r.id = p.id;
+        r.personindex = wanted.value(p.id, -1);
+        if (r.personindex >= 0)
+            r.name = qs(ix.people[static_cast<size_t>(r.personindex)].name);
+        r.age = p.age.trimmed();
+        r.agetype = p.agetype;
+        r.occupation = p.occupation.trimmed();
+        form.selection.push_back(r);
+    }
+    error = checkhousehold(form.selection);
+    if (!error.isEmpty())
+        return clifail(error);
+
+    const QString country = s.country;
+    const censusdef* census = choosecensus(e, country);
+    form.fullentry = s.fullentry;
+    form.yeartext = census ? QString::number(census->year) : QString();
+    form.officialdate = census ? census->date : QString();
+    form.datetext = e.date ? *e.date : form.officialdate;
+    form.place = e.place;
+    form.address = e.address;
+    form.reference = e.reference;
+    form.other = e.other;
+    form.sourcetext = e.sourcetext;
+    form.notetext = e.notetext;
+    int sourcepos = -1;
+    if (s.fullentry) {
+        form.sourceid = QString::number(ix.nextsourceid);
+        if (e.title) {
+            form.title = *e.title;
+        } else {
+            const datecheck d = validdate(form.datetext, form.officialdate);
+            form.title = maketitle(s.title, form.yeartext, d.newtext.value_or(form.datetext), form.place, form.address,
+                                   form.other, form.reference.trimmed(), country);
+        }
+    } else if (e.source) {
+        form.sourceid = QString::number(*e.source);
+    }
+    const entrycheck check = validateentry(form, s);
+    if (!check.ok)
+        return clifail(check.message);
+    if (!s.fullentry) {
+        sourcepos = findcensussource(ix, form.sourceid);
+        if (sourcepos < 0)
+            return clifail(notcensussourcemessage(form.sourceid));
+        form.title = qs(ix.sources[static_cast<size_t>(sourcepos)].title);
+    }
+
+    censusentry entry;
+    entry.sourceid = form.sourceid;
+    entry.title = form.title;
+    entry.place = form.place;
+    entry.address = form.address;
+    entry.reference = form.reference.trimmed();
+    entry.sourcetext = form.sourcetext;
+    entry.notetext = form.notetext;
+    entry.other = form.other;
+    entry.entrydate = check.entrydate;
+    entry.year = census ? census->year : 0;
+    entry.selection = form.selection;
+    // Birth details as the birth details dialog gives them: only to individuals
+    // with neither birth date nor birth place in the file.
+    for (size_t k = 0; k < e.people.size(); ++k) {
+        selectionrec& r = entry.selection[k];
+        const personrec& person = ix.people[static_cast<size_t>(r.personindex)];
+        if (!e.people[k].birthplace || person.hasbirthdate || person.hasbirthplace)
+            continue;
+        r.birthedited = true;
+        r.birthdate = calculatedbirthdate(entry.entrydate, r.age, r.agetype);
+        r.birthplace = e.people[k].birthplace->trimmed();
+    }
+
+    const saveoutcome out = saveentry(ix, s, entry);
+    if (!out.saved())
+        return clifail(out.message);
+    if (!out.logerror.isEmpty())
+        std::fputs(("quillmark-cli: warning: " + out.logerror.toStdString() + "\n").c_str(), stderr);
+
+    QJsonObject result;
+    result.insert(QStringLiteral("backup"), QDir::toNativeSeparators(out.backuppath));
+    result.insert(QStringLiteral("source"), entry.sourceid.toInt());
+    result.insert(QStringLiteral("individuals"), static_cast<int>(entry.selection.size()));
+    result.insert(QStringLiteral("log"), out.logwritten);
+    const QByteArray text = QJsonDocument(result).toJson(QJsonDocument::Compact) + '\n';
+    std::fwrite(text.constData(), 1, static_cast<size_t>(text.size()), stdout);
+    std::fflush(stdout);
+    return 0;
+}
+
+} // namespace qm

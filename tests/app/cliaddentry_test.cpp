@@ -1,0 +1,217 @@
+// quillmark-cli add-entry, run as a process on copies of family files.
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QJsonDocument>
+#include <QJsonObject>
+#include <QProcess>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using qmtest::readfile;
+using qmtest::writefile;
+
+namespace {
+
+// A small family: John has no birth details, Mary has; S1 is a census source,
+// S2 a parish register.
+const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
+                           "0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 FAMS @F1@\r\n"
+                           "0 @I2@ INDI\r\n1 NAME Mary /Smith/\r\n1 BIRT\r\n2 DATE 1812\r\n1 FAMS @F1@\r\n"
+                           "0 @I3@ INDI\r\n1 NAME Ann /Smith/\r\n1 FAMC @F1@\r\n"
+                           "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 WIFE @I2@\r\n1 CHIL @I3@\r\n"
+                           "0 @S1@ SOUR\r\n1 TITL Census 1851 Leeds HO107/2319\r\n"
+                           "0 @S2@ SOUR\r\n1 TITL Leeds Parish Register\r\n"
+                           "0 TRLR\r\n";
+
+struct run {
+    int status = -1;
+    std::string out, err;
+    QJsonObject json() const { return QJsonDocument::fromJson(QByteArray::fromStdString(out)).object(); }
+};
+
+class CliAddEntry : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        QDir(dir.path()).mkdir(QStringLiteral("backups"));
+        file = dir.filePath(QStringLiteral("family.ged"));
+        writefile(file, family);
+        ini = dir.filePath(QStringLiteral("settings.ini"));
+        // A complete store: an absent value would send its group and all later
+        // ones back to their defaults.
+        qm::settings s = qm::defaultsettings();
+        s.backupfolder = dir.filePath(QStringLiteral("backups"));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        qm::savesettings(*qm::settingsstore::onfile(ini), s);
+    }
+
+    void setting(const QString& name, const QString& value)
+    {
+        auto store = qm::settingsstore::onfile(ini);
+        store->write(name, value);
+        store->sync();
+    }
+
+    // The program's own folder lies inside the test's folder, should anything
+    // fall back to it.
+    static void start(QProcess& p, const QStringList& args, const QString& home)
+    {
+        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+        env.insert(QStringLiteral("XDG_DATA_HOME"), home);
+        p.setProcessEnvironment(env);
+        p.start(QStringLiteral(QM_CLI_PATH), args);
+        p.waitForFinished(60000);
+    }
+
+    run addentry(const std::string& json, const QString& target = QString())
+    {
+        const QString entry = dir.filePath(QStringLiteral("entry.json"));
+        writefile(entry, json);
+        QProcess p;
+        start(p,
+              {QStringLiteral("add-entry"), target.isEmpty() ? file : target, QStringLiteral("--entry"), entry,
+               QStringLiteral("--settings"), ini},
+              dir.path());
+        return {p.exitCode(), p.readAllStandardOutput().toStdString(), p.readAllStandardError().toStdString()};
+    }
+
+    // A refused entry: status 2, the message on standard error, nothing written.
+    void expectrefused(const std::string& json, const std::string& message)
+    {
+        const run r = addentry(json);
+        EXPECT_EQ(r.status, 2) << json;
+        EXPECT_EQ(r.err, "quillmark-cli: " + message + "\n") << json;
+        EXPECT_EQ(r.out, "");
+        EXPECT_EQ(readfile(file), family);
+        EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty());
+    }
+
+    QTemporaryDir dir;
+    QString file, ini;
+};
+
+const std::string household = R"("individuals": [{"id": 1, "age": "39", "agetype": "Y", "occupation": "Weaver"},
+                                                 {"id": 2, "age": 38, "occupation": "-"}])";
+
+} // namespace
+
+TEST_F(CliAddEntry, NewSourceFromTemplate)
+{
+    const run r = addentry(R"({"year": 1851, "place": "Leeds, Yorkshire", "reference": "HO107/2320",
+                               "other": "John Smith", "source_text": "John Smith 39\nMary Smith 38\n", )"
+                           + household + "}");
+    ASSERT_EQ(r.status, 0) << r.err;
+    const QJsonObject j = r.json();
+    EXPECT_EQ(j.value(QStringLiteral("source")).toInt(), 3);
+    EXPECT_EQ(j.value(QStringLiteral("individuals")).toInt(), 2);
+    EXPECT_TRUE(j.value(QStringLiteral("log")).toBool());
+    const QString backup = j.value(QStringLiteral("backup")).toString();
+    EXPECT_EQ(readfile(backup), family);
+
+    const std::string now = readfile(file);
+    EXPECT_NE(now.find("0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n2 PLAC Leeds, Yorkshire\r\n"
+                       "2 AGE 39y\r\n2 SOUR @S3@\r\n1 OCCU Weaver\r\n"),
+              std::string::npos)
+        << now;
+    EXPECT_NE(now.find("2 AGE 38y\r\n2 SOUR @S3@\r\n1 FAMS"), std::string::npos) << "no occupation of one character";
+    EXPECT_NE(now.find("0 @S3@ SOUR\r\n1 TITL Census 1851 Leeds, Yorkshire HO107/2320 (John Smith)\r\n"), std::string::npos);
+    EXPECT_NE(now.find("1 TEXT John Smith 39\r\n2 CONT Mary Smith 38\r\n1 "), std::string::npos) << now;
+    EXPECT_NE(readfile(dir.filePath(QStringLiteral("censuslog.txt"))).find("Name: Smith, Mary (2) : created census event\r\n"),
+              std::string::npos);
+}
+
+TEST_F(CliAddEntry, CitesExistingSourceWithBirthDetails)
+{
+    setting(QStringLiteral("Full Entry"), QStringLiteral("0"));
+    setting(QStringLiteral("Keep Log"), QStringLiteral("0"));
+    // The typed date wins over the year and is written the GEDCOM way.
+    const run r = addentry(R"({"year": 1851, "date": "1 apr 1851", "source": 1, "place": "Leeds",
+        "reference": "folio 12", "individuals": [
+            {"id": 1, "age": "6", "agetype": "M", "birthplace": " Leeds "},
+            {"id": 2, "age": "38", "birthplace": "York"},
+            {"id": 3, "age": "10", "agetype": "D", "birthplace": ""}]})");
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.json().value(QStringLiteral("source")).toInt(), 1);
+    EXPECT_FALSE(r.json().value(QStringLiteral("log")).toBool());
+    EXPECT_FALSE(QFileInfo::exists(dir.filePath(QStringLiteral("censuslog.txt"))));
+    const std::string now = readfile(file);
+    EXPECT_NE(now.find("1 NAME John /Smith/\r\n1 BIRT\r\n2 DATE CAL OCT 1850\r\n2 PLAC Leeds\r\n"), std::string::npos) << now;
+    EXPECT_NE(now.find("2 DATE 01 APR 1851\r\n2 PLAC Leeds\r\n2 AGE 6m\r\n2 SOUR @S1@\r\n3 PAGE folio 12\r\n"),
+              std::string::npos);
+    // Mary has a birth event already: she gets no second one.
+    EXPECT_EQ(now.find("2 PLAC York"), std::string::npos);
+    EXPECT_NE(now.find("1 NAME Ann /Smith/\r\n1 BIRT\r\n2 DATE CAL 22 MAR 1851\r\n2 SOUR"), std::string::npos)
+        << "an empty birth place gives no PLAC line";
+    EXPECT_EQ(now.find("0 @S3@"), std::string::npos) << "no new source when citing one";
+}
+
+TEST_F(CliAddEntry, RefusesWithTheFormsMessages)
+{
+    const std::string base = R"("year": 1851, "place": "Leeds", "reference": "HO107/1", )";
+    expectrefused(R"({"year": 1851, "place": ""})", "The census entry must refer to at least 1 person!");
+    expectrefused(R"({"year": 1851, "place": " ", )" + household + "}", "Location must be specified");
+    expectrefused(R"({"year": 1851, "place": "Leeds", "title": "Census 1851", )" + household + "}",
+                  "You must provide a full title for the entry");
+    expectrefused(R"({"year": 1852, "place": "Leeds", )" + household + "}", "You must select a census year from the list");
+    expectrefused("{" + base + R"("date": "31 FEB 1851", )" + household + "}",
+                  "Invalid date - reselect the year from the list box above to reset to original value");
+    expectrefused("{" + base + R"("individuals": [{"id": 1, "age": "4"}, {"id": 9, "age": "4"}]})",
+                  "There is no individual with the record number 9 in the family file");
+    expectrefused("{" + base + R"("individuals": [{"id": 1, "age": "4"}, {"id": 1, "age": "4"}]})",
+                  "The individual Smith, John (1) is in the census entry more than once");
+    expectrefused("{" + base + R"("individuals": [{"id": 1, "age": "1234"}]})",
+                  "The age of Smith, John (1) must be a number of at most 3 digits, not \"1234\"");
+    expectrefused("{" + base + R"("individuals": [{"id": 1, "age": "4", "agetype": "W"}]})",
+                  "The age type of Smith, John (1) must be Y (years), M (months) or D (days)");
+    expectrefused("{" + base + R"("individuals": [{"id": 1, "age": ""}]})",
+                  "You must first enter an age for this individual: Smith, John (1)");
+    const run bad = addentry(R"({"year": 1851, "place": "Leeds", "individuals": [{"id": 1, "age": "4", "occupation": "Weaver ∧"}]})");
+    EXPECT_EQ(bad.status, 2);
+    EXPECT_NE(bad.err.find("The occupation of Smith, John holds the character \"∧\""), std::string::npos) << bad.err;
+    EXPECT_EQ(readfile(file), family);
+    EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty()) << "refused before the backup";
+
+    setting(QStringLiteral("Full Entry"), QStringLiteral("0"));
+    expectrefused("{" + base + household + "}", "You must select a source from the drop-down list");
+    expectrefused(R"({"year": 1851, "place": "Leeds", "source": 1, "reference": "ab", )" + household + "}",
+                  "You must enter the text for the 'Where within Source' entry");
+    expectrefused("{" + base + R"("source": 2, )" + household + "}",
+                  "The source number 2 is not a census source of the family file");
+    expectrefused("{" + base + R"("source": 7, )" + household + "}",
+                  "The source number 7 is not a census source of the family file");
+}
+
+TEST_F(CliAddEntry, RefusesBadFilesAndArguments)
+{
+    EXPECT_EQ(addentry("[1, 2]").status, 2);
+    EXPECT_EQ(addentry("{\"year\": ").status, 2);
+    EXPECT_EQ(addentry(R"({"year": "soon"})").err, "quillmark-cli: \"year\" must be a whole number\n");
+    EXPECT_EQ(addentry(R"({"year": 1851, "individuals": {"id": 1}})").err, "quillmark-cli: \"individuals\" must be a list\n");
+    EXPECT_EQ(addentry("{}", dir.filePath(QStringLiteral("none.ged"))).status, 2);
+    EXPECT_EQ(readfile(file), family);
+
+    QProcess p;
+    start(p, {QStringLiteral("add-entry"), file}, dir.path());
+    EXPECT_EQ(p.exitCode(), 2);
+    EXPECT_NE(p.readAllStandardError().indexOf("--entry ENTRY.json"), -1);
+}
+
+TEST_F(CliAddEntry, ExampleEntryWorksOnSample)
+{
+    const QString sample = dir.filePath(QStringLiteral("sample.ged"));
+    ASSERT_TRUE(QFile::copy(qmtest::samplefile(), sample));
+    const std::string entry = readfile(QStringLiteral(QM_EXAMPLES_DIR "/entry.json"));
+    ASSERT_FALSE(entry.empty());
+    const run r = addentry(entry, sample);
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.json().value(QStringLiteral("individuals")).toInt(), 4);
+    EXPECT_NE(readfile(sample).find("2 DATE 3 APR 1881\r\n2 PLAC Hebden Bridge, Yorkshire, England\r\n2 ADDR 27 Hangingroyd Lane\r\n2 AGE 1m\r\n"),
+              std::string::npos);
+}
