@@ -90,7 +90,7 @@ void chooseyear(mainfrm& w, const QString& year)
     years->setCurrentIndex(i);
 }
 
-[[maybe_unused]] QStringList shownnames(mainfrm& w)
+QStringList shownnames(mainfrm& w)
 {
     QStringList out;
     for (QLabel* l : rowcontrols<QLabel>(w, "namelab"))
@@ -100,7 +100,7 @@ void chooseyear(mainfrm& w, const QString& year)
     return out;
 }
 
-[[maybe_unused]] bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
+bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
 {
     QFile f(path);
     if (!f.open(QIODevice::ReadOnly))
@@ -354,6 +354,189 @@ private slots:
         s->prompts.expect(answer::yes, QStringLiteral("You have a partial or full census entry"));
         QVERIFY(w.close());
         QVERIFY(!s->read("Main Width").isEmpty());
+        QCOMPARE(s->prompts.unexpected(), 0);
+    }
+
+    void elevenrowsscrollinganddeleting()
+    {
+        // Ireland 1911: nobody in the sample has a census event then.
+        settings ireland = defaultsettings();
+        ireland.country = QStringLiteral("Ireland");
+        auto s = opened(sample(), &ireland);
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        chooseyear(w, QStringLiteral("1911"));
+        QToolButton* up = w.findChild<QToolButton*>(QStringLiteral("upbut"));
+        QToolButton* down = w.findChild<QToolButton*>(QStringLiteral("downbut"));
+        const auto ages = [&] {
+            QStringList out;
+            for (QLineEdit* e : rowcontrols<QLineEdit>(w, "agetxt"))
+                out << e->text();
+            return out.join(QLatin1Char(','));
+        };
+        for (int i = 0; i < 11; ++i) {
+            clickrow(peoplelist(w), i);
+            QCOMPARE(w.household().selectioncount, i + 1);
+            QTest::keyClicks(qobject_cast<QLineEdit*>(QApplication::focusWidget()), QString::number(i + 1));
+        }
+        QCOMPARE(s->prompts.unexpected(), 0);
+        QCOMPARE(w.household().toprow, 1);
+        QVERIFY(up->isVisible());
+        QVERIFY(!down->isVisible());
+        QCOMPARE(ages(), QStringLiteral("2,3,4,5,6,7,8,9,10,11"));
+
+        up->click();
+        QCOMPARE(ages(), QStringLiteral("1,2,3,4,5,6,7,8,9,10"));
+        QVERIFY(!up->isVisible());
+        QVERIFY(down->isVisible());
+        // Deleting with a row hidden below pulls it into the last row.
+        rowcontrols<QToolButton>(w, "deleterowbut")[0]->click();
+        QCOMPARE(ages(), QStringLiteral("2,3,4,5,6,7,8,9,10,11"));
+        QCOMPARE(w.household().selectioncount, 10);
+        QVERIFY(!down->isVisible());
+
+        // An eleventh again, then delete while a row is hidden above.
+        clickrow(peoplelist(w), 20);
+        QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[9], QStringLiteral("21"));
+        QCOMPARE(ages(), QStringLiteral("3,4,5,6,7,8,9,10,11,21"));
+        rowcontrols<QToolButton>(w, "deleterowbut")[4]->click();
+        QCOMPARE(w.household().toprow, 0);
+        QCOMPARE(ages(), QStringLiteral("2,3,4,5,6,8,9,10,11,21"));
+        QVERIFY(!up->isVisible());
+        // Deleting in the middle with nothing hidden.
+        rowcontrols<QToolButton>(w, "deleterowbut")[1]->click();
+        QCOMPARE(ages(), QStringLiteral("2,4,5,6,8,9,10,11,21,"));
+        QVERIFY(!rowcontrols<QToolButton>(w, "deleterowbut")[9]->isVisible());
+        // The rows kept what was typed through all of this.
+        s->prompts.expect(answer::yes, QStringLiteral("partial or full census entry"));
+        QVERIFY(w.close());
+
+        // Deleting the only row empties the family list and disables Auto Text.
+        auto one = opened(sample());
+        mainfrm& v = *one->w;
+        chooseyear(v, QStringLiteral("1881"));
+        clickid(v, peoplelist(v), 11);
+        QVERIFY(familylist(v)->model()->rowCount() > 0);
+        rowcontrols<QToolButton>(v, "deleterowbut")[0]->click();
+        QCOMPARE(v.household().selectioncount, 0);
+        QCOMPARE(familylist(v)->model()->rowCount(), 0);
+        QCOMPARE(v.findChild<QLabel*>(QStringLiteral("immediatefamilylab"))->text(), QStringLiteral("Immediate Family:"));
+        QVERIFY(!v.findChild<QPushButton*>(QStringLiteral("Autosourcebut"))->isEnabled());
+        QVERIFY(v.findChild<QLabel*>(QStringLiteral("infolab"))->text().isEmpty());
+        QCOMPARE(one->prompts.unexpected(), 0);
+    }
+
+    void couldbealivelist()
+    {
+        auto s = opened(sample());
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        QCheckBox* all = w.findChild<QCheckBox*>(QStringLiteral("allpeoplechk"));
+        chooseyear(w, QStringLiteral("1841"));
+        all->click(); // unticked: who could be alive in 1841
+        QCOMPARE(w.findChild<QLabel*>(QStringLiteral("alllab"))->text(), QStringLiteral("Individuals in 1841:"));
+        QVERIFY(rowofid(w, peoplelist(w), 1) >= 0);  // born ABT 1808
+        QCOMPARE(rowofid(w, peoplelist(w), 28), -1); // born 1879
+        const int alive = peoplelist(w)->model()->rowCount();
+        QVERIFY(alive > 0 && alive < 40);
+        all->click();
+        QCOMPARE(peoplelist(w)->model()->rowCount(), 40);
+
+        // Not with a census date that is no date.
+        w.panel()->fixeddatetxt->setText(QStringLiteral("someday"));
+        s->prompts.expect(answer::ok, QStringLiteral("The current census date is not valid. This must be corrected first."));
+        all->click();
+        QVERIFY(all->isChecked());
+        QCOMPARE(peoplelist(w)->model()->rowCount(), 40);
+        QCOMPARE(s->prompts.unexpected(), 0);
+    }
+
+    void peoplelistlimit()
+    {
+        const QString full = generated(32000);
+        const QString over = generated(32001);
+        if (full.isEmpty() || over.isEmpty())
+            QSKIP("the family file generator did not run");
+        auto s = opened(full);
+        QVERIFY(s);
+        QCOMPARE(peoplelist(*s->w)->model()->rowCount(), 32000);
+        QVERIFY(peoplelist(*s->w)->isVisible());
+        QVERIFY(s->w->findChild<QPushButton*>(QStringLiteral("findbut"))->isEnabled());
+
+        auto t = opened(over);
+        QVERIFY(t);
+        mainfrm& w = *t->w;
+        QCheckBox* all = w.findChild<QCheckBox*>(QStringLiteral("allpeoplechk"));
+        QVERIFY(!peoplelist(w)->isVisible());
+        QVERIFY(w.findChild<QLabel*>(QStringLiteral("NopeopleLab"))->isVisible());
+        QVERIFY(!w.findChild<QPushButton*>(QStringLiteral("findbut"))->isEnabled());
+        QVERIFY(!all->isChecked());
+        QVERIFY(!all->isEnabled());
+
+        chooseyear(w, QStringLiteral("1881"));
+        QVERIFY(peoplelist(w)->isVisible());
+        QCOMPARE(w.findChild<QLabel*>(QStringLiteral("alllab"))->text(), QStringLiteral("Individuals in 1881:"));
+        const int listed = peoplelist(w)->model()->rowCount();
+        QVERIFY(listed > 0 && listed <= 32001);
+        const bool toomany = t->prompts.texts().contains(
+            QStringLiteral("There are too many people to display them all in the list."));
+        QCOMPARE(toomany, listed == 32001);
+        QCOMPARE(w.findChild<QPushButton*>(QStringLiteral("findbut"))->isEnabled(), !toomany);
+        QVERIFY(!all->isEnabled());
+    }
+
+    void reloadafteroutsidechange()
+    {
+        const QString file = sample();
+        auto s = opened(file);
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        chooseyear(w, QStringLiteral("1881"));
+        w.panel()->locationtxt->setText(QStringLiteral("Hebden Bridge"));
+        clickid(w, peoplelist(w), 27);
+        QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[0], QStringLiteral("26"));
+        clickid(w, peoplelist(w), 29);
+        QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[1], QStringLiteral("1"));
+        rowcontrols<QLineEdit>(w, "agetypetxt")[1]->setText(QStringLiteral("M"));
+
+        // Coming back without a change does nothing.
+        w.checkonactivate();
+        QCOMPARE(s->prompts.history().size(), size_t(1)); // the default-file question at start
+
+        // The name changed in the other program: reloaded, rows kept.
+        QVERIFY(replaceinfile(file, QStringLiteral("1 NAME Agnes /Schröder/").toUtf8(), "1 NAME Agnes /Schroeder/"));
+        s->prompts.expect(answer::ok, file + QStringLiteral(" has been modified by another application and will be reloaded."));
+        w.checkonactivate();
+        QCOMPARE(shownnames(w), (QStringList{QStringLiteral("Schroeder, Agnes"), QStringLiteral("Ashworth, Frederick")}));
+        QCOMPARE(rowcontrols<QLineEdit>(w, "agetxt")[0]->text(), QStringLiteral("26"));
+        QCOMPARE(rowcontrols<QLineEdit>(w, "agetypetxt")[1]->text(), QStringLiteral("M"));
+        QCOMPARE(w.panel()->locationtxt->text(), QStringLiteral("Hebden Bridge"));
+        QCOMPARE(w.panel()->fixeddatetxt->text(), QStringLiteral("3 APR 1881"));
+        QVERIFY(w.findChild<QCheckBox*>(QStringLiteral("allpeoplechk"))->isEnabled());
+        QVERIFY(familylist(w)->model()->rowCount() > 0);
+        QCOMPARE(s->prompts.unexpected(), 0);
+
+        // A chosen individual deleted in the other program: the rows are cleared.
+        {
+            QFile f(file);
+            QVERIFY(f.open(QIODevice::ReadOnly));
+            QByteArray b = f.readAll();
+            f.close();
+            const qsizetype from = b.indexOf("0 @I29@ INDI");
+            const qsizetype to = b.indexOf("\n0 @", from) + 1;
+            QVERIFY(from > 0 && to > from);
+            b.remove(from, to - from);
+            QVERIFY(f.open(QIODevice::WriteOnly | QIODevice::Truncate));
+            f.write(b);
+        }
+        s->prompts.expect(answer::ok, QStringLiteral("has been modified by another application"));
+        s->prompts.expect(answer::ok, QStringLiteral("At least one of the individuals already selected appears to no "
+                                                     "longer be in your file following changes made in another "
+                                                     "application. Therefore, the selections will be cleared"));
+        w.checkonactivate();
+        QCOMPARE(w.household().selectioncount, 0);
+        QVERIFY(shownnames(w).isEmpty());
+        QCOMPARE(w.index()->people.size(), size_t(39));
         QCOMPARE(s->prompts.unexpected(), 0);
     }
 
