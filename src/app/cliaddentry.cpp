@@ -21,6 +21,7 @@
 #include <QJsonObject>
 
 #include <cstdio>
+#include <future>
 #include <optional>
 
 namespace qm {
@@ -163,6 +164,16 @@ bool readentry(const QByteArray& bytes, entryfile& e, QString& error)
     return true;
 }
 
+// Removes a backup made ahead when the entry is refused before it was used.
+struct backupguard {
+    QString path;
+    ~backupguard()
+    {
+        if (!path.isEmpty())
+            QFile::remove(path);
+    }
+};
+
 // The census the entry names: by its year, or else the one whose official day
 // (or, failing that, whose year) the date falls on.
 const censusdef* choosecensus(const entryfile& e, const QString& country)
@@ -224,7 +235,14 @@ int cliaddentry(QStringList args)
     if (!loadflagdefs(*cs->store, flagdefs))
         std::fputs(("quillmark-cli: warning: " + flagloaderrormessage().toStdString() + "\n").c_str(), stderr);
 
-    const loadresult loaded = loadgedcom(path, flagdefs);
+    // The backup copy is made while the file loads: the copy is mostly the
+    // kernel's and the disk's work, the load the processor's. The save road
+    // takes it only if the file is still as loaded.
+    std::future<backupresult> early =
+        std::async(std::launch::async, [&path, folder = s.backupfolder] { return makebackup(path, folder); });
+    loadresult loaded = loadgedcom(path, flagdefs);
+    const backupresult made = early.get();
+    backupguard guard{made.path};
     if (!loaded.index)
         return clifail(loaded.error);
     const gedcomindex& ix = *loaded.index;
@@ -316,7 +334,8 @@ int cliaddentry(QStringList args)
         r.birthplace = e.people[k].birthplace->trimmed();
     }
 
-    const saveoutcome out = saveentry(ix, s, entry);
+    guard.path.clear(); // the save road uses the backup or removes it
+    const saveoutcome out = saveentry(ix, s, entry, &made);
     if (!out.saved())
         return clifail(out.message);
     if (!out.logerror.isEmpty())
@@ -330,6 +349,8 @@ int cliaddentry(QStringList args)
     const QByteArray text = QJsonDocument(result).toJson(QJsonDocument::Compact) + '\n';
     std::fwrite(text.constData(), 1, static_cast<size_t>(text.size()), stdout);
     std::fflush(stdout);
+    // The process ends here: taking a large index apart would only cost time.
+    (void)loaded.index.release();
     return 0;
 }
 

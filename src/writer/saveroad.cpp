@@ -4,7 +4,6 @@
 #include "model/filechanged.h"
 #include "model/gedcomindex.h"
 #include "settings/settings.h"
-#include "writer/backups.h"
 
 #include <QFile>
 
@@ -60,23 +59,38 @@ void setinputfaultfortests(bool on)
     inputfault() = on;
 }
 
-saveoutcome savechange(const gedcomindex& index, const settings& s, const rewriterequest& request)
+saveoutcome savechange(const gedcomindex& index, const settings& s, const rewriterequest& request,
+                       const backupresult* made)
 {
     saveoutcome out;
     const QString& family = index.gedcomfile;
+    // A backup made ahead is of no use when nothing is written.
+    const auto dropmade = [made] {
+        if (made && made->ok())
+            QFile::remove(made->path);
+    };
 
     out.message = checkencodable(request, s, index.encoding);
     if (!out.message.isEmpty()) {
+        dropmade();
         out.status = savestatus::refused;
         return out;
     }
     if (filechanged(index)) {
+        dropmade();
         out.status = savestatus::changed;
         out.message = changedonsavemessage(family, anyimages(request));
         return out;
     }
 
-    const backupresult backup = makebackup(family, s.backupfolder);
+    backupresult backup;
+    const filestamp madestamp = made && made->ok() ? stampof(made->path) : filestamp();
+    if (madestamp.exists && madestamp.modified == index.gedcomdate.modified && madestamp.size == index.gedcomdate.size) {
+        backup = *made;
+    } else {
+        dropmade();
+        backup = makebackup(family, s.backupfolder);
+    }
     if (!backup.ok()) {
         out.status = savestatus::backupfailed;
         out.message = backup.error;
@@ -109,12 +123,12 @@ saveoutcome savechange(const gedcomindex& index, const settings& s, const rewrit
     return out;
 }
 
-saveoutcome saveentry(const gedcomindex& index, const settings& s, const censusentry& entry)
+saveoutcome saveentry(const gedcomindex& index, const settings& s, const censusentry& entry, const backupresult* made)
 {
     rewriterequest rq;
     rq.mode = rewritemode::censusentry;
     rq.entry = entry;
-    return savechange(index, s, rq);
+    return savechange(index, s, rq, made);
 }
 
 } // namespace qm

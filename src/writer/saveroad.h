@@ -6,6 +6,7 @@
 // The caller shows the outcome's messages and reloads the file afterwards.
 
 #include "platform/filetime.h"
+#include "writer/backups.h"
 #include "writer/rewritefile.h"
 
 #include <QString>
@@ -38,10 +39,17 @@ struct saveoutcome {
 };
 
 // Runs the road for one rewrite request over the index's family file.
-saveoutcome savechange(const gedcomindex& index, const settings& s, const rewriterequest& request);
+//
+// `made` is a backup already made while the file was being loaded (the
+// command-line tool overlaps the two). It is taken when it holds the file as
+// loaded (same last-modified time and size); otherwise it is removed and a new
+// backup is made in its place.
+saveoutcome savechange(const gedcomindex& index, const settings& s, const rewriterequest& request,
+                       const backupresult* made = nullptr);
 
 // Census entry: mode 1 of the above.
-saveoutcome saveentry(const gedcomindex& index, const settings& s, const censusentry& entry);
+saveoutcome saveentry(const gedcomindex& index, const settings& s, const censusentry& entry,
+                      const backupresult* made = nullptr);
 
 // Tests: makes the rewrite meet an input it cannot open (as with a backup
 // taken away or made unreadable after it was written).

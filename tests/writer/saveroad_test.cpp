@@ -219,3 +219,32 @@ INSTANTIATE_TEST_SUITE_P(
                       faultcase{"WriteErrorInTheMiddle", false, {false, 1500000, false}},
                       faultcase{"CannotReplace", false, {false, -1, true}}),
     [](const ::testing::TestParamInfo<faultcase>& i) { return std::string(i.param.name); });
+
+TEST_F(SaveRoad, BackupMadeAheadIsUsedOnlyWhenItHoldsTheFileAsLoaded)
+{
+    backupresult made = makebackup(family, s.backupfolder);
+    ASSERT_TRUE(made.ok());
+    saveoutcome out = saveentry(index, s, entry, &made);
+    ASSERT_TRUE(out.saved());
+    EXPECT_EQ(out.backuppath, made.path);
+    EXPECT_EQ(backups().size(), 1);
+
+    // A copy of something else (here: the file as it is now) is replaced by a true backup.
+    setclockfortests(QDateTime(QDate(2026, 12, 5), QTime(1, 2, 3)));
+    const std::string saved = readfile(family);
+    made = makebackup(family, s.backupfolder);
+    qmtest::writefile(made.path, "junk");
+    index.gedcomdate = out.newstamp;
+    out = saveentry(index, s, entry, &made);
+    ASSERT_TRUE(out.saved());
+    EXPECT_EQ(readfile(out.backuppath), saved);
+    EXPECT_EQ(stampof(out.backuppath).modified, index.gedcomdate.modified);
+    EXPECT_EQ(backups().size(), 2);
+
+    // Refused: the backup made ahead goes too.
+    made = makebackup(family, s.backupfolder);
+    index.gedcomdate.size += 1;
+    EXPECT_EQ(saveentry(index, s, entry, &made).status, savestatus::changed);
+    EXPECT_FALSE(QFileInfo::exists(made.path));
+    EXPECT_EQ(backups().size(), 2);
+}
