@@ -74,10 +74,15 @@ backupresult makebackup(const QString& familyfile, const QString& folder)
 {
     backupresult r;
     const filestamp original = stampof(familyfile);
+    // No folder must never mean the current folder, wherever that is.
+    if (folder.trimmed().isEmpty() || !original.exists) {
+        r.error = backupfailedmessage();
+        return r;
+    }
     const QString path = freebackuppath(folder, stampnow());
     // A copy, not a move: the family file stays whole until its replacement is
     // complete on disk.
-    if (!original.exists || !QFile::copy(familyfile, path) || !keeptime(path, original.modified)) {
+    if (!QFile::copy(familyfile, path) || !keeptime(path, original.modified)) {
         QFile::remove(path);
         r.error = backupfailedmessage();
         return r;

@@ -82,6 +82,7 @@ TEST_F(Backups, FailureGivesMessageAndLeavesNothing)
     EXPECT_EQ(r.error, backupfailedmessage());
     EXPECT_TRUE(r.error.startsWith(QStringLiteral("There was an error when attempting to back up your family historian file.")));
     EXPECT_FALSE(makebackup(dir.filePath(QStringLiteral("nofile.ged")), folder).ok());
+    EXPECT_FALSE(makebackup(family, QStringLiteral(" ")).ok());
     EXPECT_TRUE(names().isEmpty());
 }
 
