@@ -1,5 +1,7 @@
 #include "census/birthdate.h"
 
+#include <QLocale>
+
 #include <gtest/gtest.h>
 
 using qm::calculatedbirthdate;
@@ -32,4 +34,13 @@ TEST(BirthDate, FromTexts)
     EXPECT_EQ(calculatedbirthdate(QStringLiteral("7 APR 1861"), QStringLiteral("x"), u'Y'), QString());
     EXPECT_EQ(calculatedbirthdate(QStringLiteral("1861"), QStringLiteral("3"), u'Y'), QString());
     EXPECT_EQ(calculatedbirthdate(QDate(1861, 4, 7), 3, u'W'), QString());
+}
+
+TEST(BirthDate, EnglishMonthsWhateverTheLocale)
+{
+    QLocale::setDefault(QLocale(QLocale::German, QLocale::Germany));
+    EXPECT_EQ(calculatedbirthdate(QDate(1851, 3, 30), 0, u'M'), QStringLiteral("MAR 1851"));
+    EXPECT_EQ(calculatedbirthdate(QDate(1851, 3, 30), 2, u'D'), QStringLiteral("28 MAR 1851"));
+    EXPECT_EQ(calculatedbirthdate(QStringLiteral("30 MAR 1851"), QStringLiteral("10"), u'M'), QStringLiteral("MAY 1850"));
+    QLocale::setDefault(QLocale::c());
 }
