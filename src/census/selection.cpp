@@ -234,7 +234,7 @@ alivelist couldbealive(const gedcomindex& index, const QDate& censusday, dateord
         int born = -9999;
         if (p.hasbirthdate) {
             text = qs(p.birthdate);
-            const datephraseresult d = datephrase(text, census, order);
+            const datephraseyears d = dateyears(text, census, order);
             born = d.agecomputed ? d.earliestyear : -9999;
         }
         if (born > upper)
@@ -244,7 +244,7 @@ alivelist couldbealive(const gedcomindex& index, const QDate& censusday, dateord
         int died = 9999;
         if (p.hasdeathdate) {
             text = qs(p.deathdate);
-            const datephraseresult d = datephrase(text, census, order);
+            const datephraseyears d = dateyears(text, census, order);
             if (d.agecomputed)
                 died = d.latestyear;
         }

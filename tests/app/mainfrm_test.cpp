@@ -9,10 +9,12 @@
 #include "settings/settings.h"
 #include "support/testfiles.h"
 
+#include <QAbstractButton>
 #include <QAction>
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDir>
+#include <QElapsedTimer>
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
@@ -181,6 +183,52 @@ private slots:
         QVERIFY(s->w->watching());
         QVERIFY(s->w->firststart()); // settings never saved
         QCOMPARE(s->prompts.unexpected(), 0);
+
+        // Every control carries its name, and every box and list an accessible name.
+        for (QWidget* c : s->w->findChildren<QWidget*>()) {
+            if (!qobject_cast<QLineEdit*>(c) && !qobject_cast<QPlainTextEdit*>(c) && !qobject_cast<QComboBox*>(c) &&
+                !qobject_cast<QListView*>(c) && !qobject_cast<QAbstractButton*>(c))
+                continue;
+            bool inner = false; // parts of a combo box
+            for (QObject* o = c->parent(); o; o = o->parent())
+                inner = inner || qobject_cast<QComboBox*>(o);
+            if (inner || c->objectName().startsWith(QLatin1String("qt_")))
+                continue; // Qt's own parts
+            QVERIFY2(!c->objectName().isEmpty(), c->metaObject()->className());
+            if (!qobject_cast<QAbstractButton*>(c) || static_cast<QAbstractButton*>(c)->text().isEmpty())
+                QVERIFY2(!c->accessibleName().isEmpty(), qPrintable(c->objectName()));
+        }
+    }
+
+    void clearallandopenanother()
+    {
+        auto s = opened(sample());
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        chooseyear(w, QStringLiteral("1881"));
+        w.panel()->locationtxt->setText(QStringLiteral("Hebden Bridge"));
+        clickid(w, peoplelist(w), 11);
+        QAction* clear = w.findChild<QAction*>(QStringLiteral("clearallmen"));
+        s->prompts.expect(answer::no, QStringLiteral("Are you sure you want to clear all of the data"));
+        clear->trigger();
+        QCOMPARE(w.household().selectioncount, 1);
+        QCOMPARE(s->prompts.history().back().m.defaultanswer, answer::no);
+        s->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to clear all of the data"));
+        clear->trigger();
+        QCOMPARE(w.household().selectioncount, 0);
+        QVERIFY(w.panel()->locationtxt->text().isEmpty());
+        QVERIFY(w.panel()->fixeddatetxt->text().isEmpty());
+        QCOMPARE(w.panel()->yearcom->currentIndex(), -1);
+        QCOMPARE(familylist(w)->model()->rowCount(), 0);
+
+        // Opening another file with rows in use asks first.
+        chooseyear(w, QStringLiteral("1881"));
+        clickid(w, peoplelist(w), 11);
+        s->prompts.expect(answer::no, QStringLiteral("Loading another family history file will cause you to lose"));
+        w.findChild<QAction*>(QStringLiteral("openmen"))->trigger();
+        QCOMPARE(w.household().selectioncount, 1);
+        QCOMPARE(s->prompts.unexpected(), 0);
+        rowcontrols<QToolButton>(w, "deleterowbut")[0]->click();
     }
 
     void startfromdefaultfileandfromdialog()
@@ -538,6 +586,29 @@ private slots:
         QVERIFY(shownnames(w).isEmpty());
         QCOMPARE(w.index()->people.size(), size_t(39));
         QCOMPARE(s->prompts.unexpected(), 0);
+    }
+
+    // Not a test: with QM_TIMING set, reports how long the real window takes to
+    // open a 30,000-individual file and to list who could be alive in 1881 in
+    // a 100,000-individual one (files of QM_BENCH_DIR, default /work/gen).
+    void timing()
+    {
+        if (qEnvironmentVariableIsEmpty("QM_TIMING"))
+            QSKIP("QM_TIMING not set");
+        const QString dir = qEnvironmentVariable("QM_BENCH_DIR", QStringLiteral("/work/gen"));
+        QElapsedTimer t;
+        t.start();
+        auto s = opened(dir + QStringLiteral("/fam30000.ged"));
+        QVERIFY(s);
+        qInfo("open 30,000 until the people list is filled: %lld ms (%d listed)", t.elapsed(),
+              peoplelist(*s->w)->model()->rowCount());
+        auto b = opened(dir + QStringLiteral("/fam100000.ged"));
+        QVERIFY(b);
+        t.restart();
+        chooseyear(*b->w, QStringLiteral("1881"));
+        QApplication::processEvents();
+        qInfo("choose 1881 in 100,000 until the list is filled: %lld ms (%d listed)", t.elapsed(),
+              peoplelist(*b->w)->model()->rowCount());
     }
 
     // Not a test: scripts/screenshot.sh runs it to picture the main window
