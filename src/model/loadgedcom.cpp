@@ -3,12 +3,14 @@
 #include "model/loadgedcom.h"
 
 #include "platform/linereader.h"
+#include "platform/memoryhint.h"
 
 #include <QElapsedTimer>
 #include <QFileInfo>
 
 #include <algorithm>
 #include <cstring>
+#include <deque>
 #include <limits>
 
 namespace qm {
@@ -206,7 +208,7 @@ private:
         int32_t group;
         std::string_view utf8;
     };
-    textarena keys_; // keys and raw spellings, dropped with the loader
+    std::deque<std::string> keys_; // keys and raw spellings, dropped with the loader
     viewmap<int32_t> groupbykey_;
     viewmap<spelling> spellings_;
     std::vector<placerec> groups_;
@@ -239,12 +241,12 @@ std::string_view loader::place(std::string_view raw)
     } else {
         group = static_cast<int32_t>(groups_.size());
         groups_.push_back({utf8, 0});
-        const std::string_view storedkey = keys_.store(key);
+        const std::string_view storedkey = keys_.emplace_back(key);
         groupkeys_.push_back(storedkey);
         groupbykey_.insert(kh, storedkey, group);
     }
     ++groups_[static_cast<size_t>(group)].count;
-    spellings_.insert(h, keys_.store(raw), {group, utf8});
+    spellings_.insert(h, keys_.emplace_back(raw), {group, utf8});
     return utf8;
 }
 
@@ -578,6 +580,7 @@ void reservetables(gedcomindex& index, int64_t bytes)
 {
     const auto room = [&](int64_t bytesper) { return static_cast<size_t>(std::max<int64_t>(bytes / bytesper, 64)); };
     index.people.reserve(room(256));
+    hintlargememory(index.people.data(), index.people.capacity() * sizeof(personrec));
     index.sources.reserve(room(2048));
     index.objects.reserve(room(2048));
 }

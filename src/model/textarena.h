@@ -4,6 +4,7 @@
 // life (also when the arena itself is moved), and a load makes a few large
 // allocations instead of one per value.
 
+#include <algorithm>
 #include <memory>
 #include <string_view>
 #include <vector>
@@ -23,8 +24,11 @@ public:
         if (text.empty())
             return {};
         if (text.size() > room_) {
-            const size_t size = text.size() > blocksize / 4 ? text.size() : blocksize;
-            blocks_.push_back(std::make_unique<char[]>(size));
+            // Blocks grow from small to large, so that a small file costs
+            // little; they are not zeroed, since every byte is written first.
+            const size_t block = std::min(blocksize, firstblock << std::min<size_t>(blocks_.size(), 8));
+            const size_t size = text.size() > block / 4 ? text.size() : block;
+            blocks_.push_back(std::unique_ptr<char[]>(new char[size]));
             next_ = blocks_.back().get();
             room_ = size;
             total_ += size;
@@ -41,6 +45,7 @@ public:
     size_t capacity() const { return total_; }
 
 private:
+    static constexpr size_t firstblock = 16 << 10;
     static constexpr size_t blocksize = 1 << 20;
     std::vector<std::unique_ptr<char[]>> blocks_;
     char* next_ = nullptr;

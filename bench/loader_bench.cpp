@@ -1,0 +1,47 @@
+// Loading generated family files of 10,000, 100,000 and 1,000,000 individuals
+// (made by gen_family_gedcom.py; the folder is QM_BENCH_DIR, else /work/gen).
+#include "model/loadgedcom.h"
+
+#include <QFileInfo>
+
+#include <benchmark/benchmark.h>
+
+#include <cstdlib>
+
+namespace {
+
+QString benchfile(const char* name)
+{
+    const char* dir = std::getenv("QM_BENCH_DIR");
+    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
+}
+
+void loadfile(benchmark::State& state, const char* name)
+{
+    const QString path = benchfile(name);
+    const QFileInfo info(path);
+    if (!info.isFile()) {
+        state.SkipWithError((path.toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+        return;
+    }
+    size_t people = 0;
+    for (auto _ : state) {
+        qm::loadresult r = qm::loadgedcom(path, {});
+        if (!r.index) {
+            state.SkipWithError(r.error.toStdString().c_str());
+            return;
+        }
+        people = r.index->people.size();
+        benchmark::DoNotOptimize(r.index.get());
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations()) * info.size());
+    state.counters["individuals"] = static_cast<double>(people);
+}
+
+} // namespace
+
+BENCHMARK_CAPTURE(loadfile, fam10000, "fam10000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(loadfile, fam100000, "fam100000.ged")->Unit(benchmark::kMillisecond)->Iterations(3);
+BENCHMARK_CAPTURE(loadfile, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(1);
+
+BENCHMARK_MAIN();
