@@ -153,7 +153,7 @@ bool readentry(const QByteArray& bytes, entryfile& e, QString& error)
         if (!readtext(p, "agetype", type, error) || !readtext(p, "occupation", person.occupation, error))
             return false;
         // Anything but one letter Y, M or D is refused by the household check.
-        person.agetype = type.size() == 1 ? type[0] : QChar(u'?');
+        person.agetype = type.trimmed().size() == 1 ? type.trimmed()[0].toUpper() : QChar(u'?');
         if (p.contains(QLatin1String("birthplace"))) {
             person.birthplace.emplace();
             if (!readtext(p, "birthplace", *person.birthplace, error))

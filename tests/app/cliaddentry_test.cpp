@@ -136,7 +136,7 @@ TEST_F(CliAddEntry, CitesExistingSourceWithBirthDetails)
         "reference": "folio 12", "individuals": [
             {"id": 1, "age": "6", "agetype": "M", "birthplace": " Leeds "},
             {"id": 2, "age": "38", "birthplace": "York"},
-            {"id": 3, "age": "10", "agetype": "D", "birthplace": ""}]})");
+            {"id": 3, "age": "10", "agetype": "d", "birthplace": ""}]})");
     ASSERT_EQ(r.status, 0) << r.err;
     EXPECT_EQ(r.json().value(QStringLiteral("source")).toInt(), 1);
     EXPECT_FALSE(r.json().value(QStringLiteral("log")).toBool());
