@@ -5,9 +5,19 @@ set -euo pipefail
 here="$(cd "$(dirname "$0")/.." && pwd)"
 "$here/scripts/deps.sh"
 "$here/scripts/build.sh" --target quillmark quillmark-cli
-file="${1:-$here/examples/sample.ged}"
+build="${QM_BUILD_DIR:-$here/build}"
+if [ $# -ge 1 ]; then
+  file="$1"
+else
+  # Work on a copy, so that saving entries never changes the bundled sample.
+  file="$build/sample/sample.ged"
+  if [ ! -f "$file" ]; then
+    mkdir -p "$build/sample"
+    cp "$here/examples/sample.ged" "$file"
+  fi
+fi
 if [ -z "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ] && [ -z "${QT_QPA_PLATFORM:-}" ]; then
   echo "No display found: printing the file's summary instead of opening the window."
-  exec "${QM_BUILD_DIR:-$here/build}/quillmark-cli" stats "$file"
+  exec "$build/quillmark-cli" stats "$file"
 fi
-exec "${QM_BUILD_DIR:-$here/build}/quillmark" "$file"
+exec "$build/quillmark" "$file"
