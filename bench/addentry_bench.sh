@@ -29,7 +29,7 @@ cp "$src" "$work/family.ged"
 cat "$work/family.ged" > /dev/null
 
 now() { date +%s.%N; }
-ddtimes=() clitimes=()
+ddtimes=() clitimes=() cputimes=()
 for ((i = 0; i < runs; i++)); do
     cat "$work/family.ged" > /dev/null
     t0=$(now); dd if="$work/family.ged" of="$work/copy.ged" bs=1M conv=fsync status=none; t1=$(now)
@@ -37,9 +37,11 @@ for ((i = 0; i < runs; i++)); do
     rm -f "$work/copy.ged"
     cat "$work/family.ged" > /dev/null
     t0=$(now)
-    "$cli" add-entry "$work/family.ged" --entry "$work/entry.json" --settings "$work/settings.ini" > "$work/out.json"
+    /usr/bin/time -o "$work/cpu" -f '%U %S' \
+        "$cli" add-entry "$work/family.ged" --entry "$work/entry.json" --settings "$work/settings.ini" > "$work/out.json"
     t1=$(now)
     clitimes+=("$(echo "$t1 - $t0" | bc)")
+    cputimes+=("$(awk '{print $1 + $2}' "$work/cpu")")
     rm -f "$work/data/Quillmark/QM Backup"*
 done
 
@@ -49,4 +51,6 @@ cli_m=$(median "${clitimes[@]}")
 echo "file:            $src ($(stat -c %s "$src") bytes)"
 echo "dd conv=fsync:   ${ddtimes[*]} s (median $dd_m s)"
 echo "add-entry:       ${clitimes[*]} s (median $cli_m s)"
+echo "add-entry CPU:   ${cputimes[*]} s (user + system; the wall time above includes waiting for the disk and for other processes)"
+echo "load average:    $(cut -d' ' -f1-3 /proc/loadavg)"
 echo "ratio:           $(echo "scale=2; $cli_m / $dd_m" | bc) (limit 4)"
