@@ -51,6 +51,7 @@ birthfrm::birthfrm(const selectionrec& row, const QString& entrydate, const std:
     intro->setWordWrap(true);
 
     auto* grid = new QGridLayout;
+    grid->setColumnStretch(1, 1);
     int line = 0;
     auto add = [&](QLabel* caption, QLabel* value) {
         grid->addWidget(caption, line, 0);
@@ -72,6 +73,9 @@ birthfrm::birthfrm(const selectionrec& row, const QString& entrydate, const std:
     auto* dobcaption = new QLabel(QStringLiteral("The calculated date of birth will be recorded as:"), this);
     const QString calculated = calculatedbirthdate(entrydate, row.age, row.agetype);
     doblab_ = valuelabel(QStringLiteral("doblab"), QStringLiteral("Calculated date of birth"), calculated, this);
+    QFont bold = doblab_->font();
+    bold.setBold(true);
+    doblab_->setFont(bold);
     auto* placecaption = new QLabel(QStringLiteral("Enter the place of birth:"), this);
     birthplacetxt_ = new QLineEdit(this);
     birthplacetxt_->setObjectName(QStringLiteral("birthplacetxt"));
