@@ -23,9 +23,12 @@ constexpr size_t maxlinebytes = 1 << 20;
 
 constexpr std::string_view noname = "<no name>";
 
-bool startswith(std::string_view s, std::string_view prefix)
+// Prefix tests against literals, of a length known when compiling so that the
+// comparison becomes a few plain loads.
+template <size_t N>
+bool startswith(std::string_view s, const char (&prefix)[N])
 {
-    return s.size() >= prefix.size() && std::memcmp(s.data(), prefix.data(), prefix.size()) == 0;
+    return s.size() >= N - 1 && std::memcmp(s.data(), prefix, N - 1) == 0;
 }
 
 bool asciionly(std::string_view s)
@@ -424,17 +427,24 @@ void loader::setname(std::string_view s)
     }
     std::string& n = conv_;
     n.clear();
+    const bool ascii = asciionly(value);
+    const auto append = [&](std::string_view part) {
+        if (ascii)
+            n.append(part);
+        else
+            appendutf8(part, enc_, n);
+    };
     if (hassurname) {
-        appendutf8(surname, enc_, n);
+        append(surname);
         if (!given.empty() || !suffix.empty()) {
             n += ", ";
-            appendutf8(given, enc_, n);
+            append(given);
             if (!given.empty() && !suffix.empty())
                 n += ' ';
-            appendutf8(suffix, enc_, n);
+            append(suffix);
         }
     } else {
-        appendutf8(given, enc_, n);
+        append(given);
     }
     if (!n.empty())
         person().name = ix_.arena.store(n);

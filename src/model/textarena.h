@@ -5,6 +5,7 @@
 // allocations instead of one per value.
 
 #include <algorithm>
+#include <cstring>
 #include <memory>
 #include <string_view>
 #include <vector>
@@ -34,8 +35,7 @@ public:
             total_ += size;
         }
         char* at = next_;
-        for (size_t i = 0; i < text.size(); ++i)
-            at[i] = text[i];
+        std::memcpy(at, text.data(), text.size());
         next_ += text.size();
         room_ -= text.size();
         return {at, text.size()};
