@@ -373,3 +373,27 @@ TEST(LoadGedcom, FromFile)
     EXPECT_FALSE(folder.error.isEmpty());
     EXPECT_EQ(r.index->people.size(), 1u); // the earlier index is untouched
 }
+
+TEST(LoadGedcom, ManyPlacesAndALastRecordWithoutTrailer)
+{
+    // Enough distinct names to make the place lookup grow several times, each
+    // met in two spellings; the file ends inside an individual.
+    std::string recs = "0 HEAD\n0 @F1@ FAM\n";
+    for (int i = 0; i < 5000; ++i)
+        recs += "2 PLAC Place " + std::to_string(i) + "\n2 PLAC PLACE " + std::to_string(i) + " \n";
+    recs += "0 @I1@ INDI\n1 FAMS @F1@\n1 CENS\n2 PLAC place 7\n2 SOUR @S3@";
+    auto ix = load(recs);
+    ASSERT_EQ(ix->places.size(), 5000u);
+    for (size_t i = 0; i < ix->places.size(); ++i) {
+        EXPECT_TRUE(ix->places[i].name.starts_with("Place "));
+        EXPECT_EQ(ix->places[i].count, ix->places[i].name == "Place 7" ? 3 : 2);
+        if (i > 0) {
+            EXPECT_LT(placekey(ix->places[i - 1].name), placekey(ix->places[i].name));
+        }
+    }
+    const personrec& p = ix->people.at(0);
+    EXPECT_EQ(p.fams, (std::vector<int32_t>{1}));
+    ASSERT_EQ(p.census.size(), 1u);
+    EXPECT_EQ(sv(p.census[0].place), "place 7");
+    EXPECT_EQ(p.census[0].sourceids, (std::vector<int32_t>{3}));
+}
