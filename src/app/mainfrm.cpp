@@ -182,7 +182,6 @@ void mainfrm::buildform()
         "This will generate source text from the individuals chosen below. You will almost certainly need to edit "
         "this to match the actual census entry."));
     Autosourcebut_->setEnabled(false);
-    connect(Autosourcebut_, &QPushButton::clicked, this, &mainfrm::comingsoon);
     findbut_ = new QPushButton(QStringLiteral("Find..."), central);
     findbut_->setObjectName(QStringLiteral("findbut"));
     findbut_->setToolTip(
@@ -221,6 +220,7 @@ void mainfrm::buildform()
     connect(rows, &censusrowsview::inforequested, this, &mainfrm::inforow);
     connect(rows, &censusrowsview::uprequested, this, &mainfrm::scrollup);
     connect(rows, &censusrowsview::downrequested, this, &mainfrm::scrolldown);
+    connectform();
 }
 
 void mainfrm::placewindow()
@@ -489,7 +489,7 @@ void mainfrm::openfamilyfile(const QString& path)
 
 void mainfrm::closeEvent(QCloseEvent* event)
 {
-    if (rows_.selectioncount >= 1 &&
+    if (rows_.selectioncount >= 1 && !ending_ &&
         !prompts_.yes(QStringLiteral("You have a partial or full census entry which has not been saved. Are you sure "
                                      "you want to leave Quillmark without saving it?"),
                       icon::question, answer::no, QStringLiteral("Leaving Quillmark?"))) {
@@ -540,12 +540,6 @@ int32_t mainfrm::runfind(int32_t)
     // The Find dialog comes with its own feature; until then nothing is found.
     comingsoon();
     return -1;
-}
-
-void mainfrm::saveentry()
-{
-    // The save of the entry (checks, backup, rewrite) belongs here.
-    comingsoon();
 }
 
 void mainfrm::fillyears()

@@ -21,6 +21,8 @@ class QStackedWidget;
 
 namespace qm {
 
+struct censusentry;
+struct entryform;
 class entrypanel;
 class householdpanel;
 class prompts;
@@ -53,7 +55,8 @@ public slots:
     // The application has become active: reload when the file changed.
     void checkonactivate();
     void reload();
-    // "Save Census Entry" (addbut, savemen): filled by the entry save.
+    // "Save Census Entry" (addbut, savemen): checks the form, asks for birth
+    // details, writes the entry and clears the form (entryform_ui.cpp).
     void saveentry();
 
 protected:
@@ -74,6 +77,24 @@ private:
     void clearall();
     void comingsoon();
     std::optional<QString> askforfile(bool startup);
+
+    // the entry form and its save (entryform_ui.cpp)
+    void connectform();
+    void sourcechosen(int item);
+    void autotextclicked();
+    void edittext(int mode);
+    void dividermoved(double share);
+    // The form as the save's checks read it (rows already stored).
+    entryform currentform() const;
+    // The birth details dialog for each individual of the entry who has no
+    // birth date, birth place or birth details yet.
+    void askbirthdetails(const QString& entrydate);
+    // The individuals of the entry, with the birth details given for them.
+    std::vector<selectionrec> currentselection() const;
+    censusentry gatherentry(const entryform& form, const QString& entrydate) const;
+    void raisecount();
+    // A failed rewrite: the message has been shown; the program ends.
+    void endprogram();
 
     // census year and form (mainfrm.cpp)
     void fillyears();
@@ -126,6 +147,7 @@ private:
     bool reloading_ = false;
     int32_t findresult_ = -1;
     bool fromfind_ = false;
+    bool ending_ = false; // closing after a failed rewrite: no questions
 
     // controls
     QStackedWidget* panels_ = nullptr;

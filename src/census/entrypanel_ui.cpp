@@ -3,15 +3,22 @@
 #include <QComboBox>
 #include <QGridLayout>
 #include <QHBoxLayout>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPlainTextEdit>
+#include <QPushButton>
 #include <QSplitter>
 #include <QVBoxLayout>
 
 namespace qm {
 
 namespace {
+// The divider's limits, as shares of the height of the two boxes: the source
+// text keeps at least a fifth; within 3 % of the bottom the note box closes.
+constexpr double minshare = 0.2;
+constexpr double closeshare = 0.97;
+
 // A caption label for a field: its buddy is the field, and the field's
 // accessible name is the caption without its colon.
 QLabel* caption(QWidget* parent, const QString& text, QWidget* field)
@@ -124,40 +131,100 @@ entrypanel::entrypanel(int m, QWidget* parent) : QWidget(parent), mode(m)
 
     dividerpic = new QSplitter(Qt::Vertical, this);
     dividerpic->setObjectName(QStringLiteral("dividerpic"));
-    dividerpic->setChildrenCollapsible(false);
     // The fields on the left decide the panel's height; the two boxes share it.
     dividerpic->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Ignored);
-    const auto half = [this](const QString& text, QPlainTextEdit* box) {
+    const auto half = [this](const QString& text, QPlainTextEdit* box, QPushButton*& editbut, const char* name,
+                             const QString& tip) {
         auto* w = new QWidget(dividerpic);
         auto* v = new QVBoxLayout(w);
         v->setContentsMargins(0, 0, 0, 0);
         v->setSpacing(1);
-        v->addWidget(caption(w, text, box));
+        auto* top = new QHBoxLayout;
+        top->setContentsMargins(0, 0, 0, 0);
+        top->addWidget(caption(w, text, box));
+        top->addStretch(1);
+        editbut = new QPushButton(QStringLiteral("Expand..."), w);
+        editbut->setObjectName(QString::fromLatin1(name));
+        editbut->setToolTip(tip);
+        editbut->setAutoDefault(false);
+        editbut->setFocusPolicy(Qt::TabFocus);
+        editbut->setSizePolicy(QSizePolicy::Fixed, QSizePolicy::Fixed);
+        editbut->setMaximumHeight(editbut->fontMetrics().height() + 6);
+        top->addWidget(editbut);
+        v->addLayout(top);
         v->addWidget(box);
         return w;
     };
     texttxt = textbox(this, "texttxt", true);
+    texttxt->installEventFilter(this);
     notetxt = textbox(this, "notetxt", false);
-    dividerpic->addWidget(half(QStringLiteral("Source Text:"), texttxt));
-    dividerpic->addWidget(half(QStringLiteral("Source Note:"), notetxt));
+    dividerpic->addWidget(half(QStringLiteral("Source Text:"), texttxt, fulltextbut, "fulltextbut",
+                               QStringLiteral("Show the source text in a large window")));
+    dividerpic->addWidget(half(QStringLiteral("Source Note:"), notetxt, notetextbut, "notetextbut",
+                               QStringLiteral("Show the source note in a large window")));
+    // The source text always stays; the note box can be closed by dragging
+    // the divider down.
+    dividerpic->setCollapsible(0, false);
+    dividerpic->setCollapsible(1, true);
+    dividerpic->setHandleWidth(7);
+    dividerpic->handle(1)->setToolTip(QStringLiteral("Drag up or down to reveal/resize the Source Note box"));
+    dividerpic->handle(1)->installEventFilter(this);
+    connect(dividerpic, &QSplitter::splitterMoved, this, [this] { settle(false); });
     outer->addWidget(dividerpic, 6);
+    setdivider(1);
 }
 
 double entrypanel::divider() const
 {
     const QList<int> s = dividerpic->sizes();
-    if (s.size() != 2 || s[0] <= 0 || s[1] <= 0)
+    if (s.size() != 2 || s[0] + s[1] <= 0)
+        return share_; // not laid out yet
+    if (s[1] <= 0)
         return 1;
-    return static_cast<double>(s[0]) / s[1];
+    return static_cast<double>(s[0]) / (s[0] + s[1]);
 }
 
-void entrypanel::setdivider(double ratio)
+void entrypanel::setdivider(double share)
 {
-    if (!(ratio > 0.05 && ratio < 20))
-        ratio = 1;
-    const int total = 1000;
-    const int top = static_cast<int>(total * ratio / (1 + ratio));
+    if (!(share >= minshare && share <= 1))
+        share = 1;
+    if (share > closeshare)
+        share = 1;
+    share_ = share;
+    const int total = std::max(1000, dividerpic->height());
+    const int top = static_cast<int>(total * share);
     dividerpic->setSizes({top, total - top});
+}
+
+void entrypanel::settle(bool released)
+{
+    const QList<int> s = dividerpic->sizes();
+    if (s.size() != 2 || s[0] + s[1] <= 0)
+        return;
+    const double share = divider();
+    if (share < minshare) {
+        setdivider(minshare);
+    } else if (released) {
+        setdivider(share);
+        emit dividermoved(share_);
+    }
+}
+
+bool entrypanel::eventFilter(QObject* watched, QEvent* event)
+{
+    if (watched == texttxt && event->type() == QEvent::KeyPress) {
+        // Tab types a tab (the columns of a transcription); Shift+Tab leaves
+        // the box as in any other field.
+        const auto* key = static_cast<QKeyEvent*>(event);
+        if (key->key() == Qt::Key_Backtab
+            || (key->key() == Qt::Key_Tab && key->modifiers().testFlag(Qt::ShiftModifier))) {
+            focusNextPrevChild(false);
+            return true;
+        }
+    } else if (watched == dividerpic->handle(1) && event->type() == QEvent::MouseButtonRelease) {
+        settle(true);
+    }
+    return QWidget::eventFilter(watched, event);
 }
 
 void entrypanel::clearfields(bool keepsourceid)

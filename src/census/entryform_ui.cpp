@@ -1,0 +1,331 @@
+// The main window's entry form: choosing an existing source, the large text
+// editor and the divider, Auto Text, the birth details asked for the
+// household, and "Save Census Entry".
+#include "app/mainfrm.h"
+
+#include "census/autotext.h"
+#include "census/birthfrm.h"
+#include "census/censustable.h"
+#include "census/entrypanel_ui.h"
+#include "census/householdpanel_ui.h"
+#include "census/sourcetextfrm.h"
+#include "census/validateentry.h"
+#include "model/filechanged.h"
+#include "model/loadgedcom.h"
+#include "platform/encoding.h"
+#include "platform/prompts.h"
+#include "platform/settingsstore.h"
+#include "writer/saveroad.h"
+
+#include <QApplication>
+#include <QComboBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListView>
+#include <QPlainTextEdit>
+#include <QPushButton>
+
+namespace qm {
+
+namespace {
+
+// The text boxes hold lines ending in LF; the entry and the family file have
+// CR LF, as the command-line tool gives them too.
+QString withcrlf(QString text)
+{
+    text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
+    text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
+    text.replace(QLatin1Char('\n'), QLatin1String("\r\n"));
+    return text;
+}
+
+QString withlf(QString text)
+{
+    text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
+    text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
+    return text;
+}
+
+} // namespace
+
+void mainfrm::connectform()
+{
+    for (entrypanel* p : panel_) {
+        connect(p->fulltextbut, &QPushButton::clicked, this, [this] { edittext(sourcetextfrm::sourcetext); });
+        connect(p->notetextbut, &QPushButton::clicked, this, [this] { edittext(sourcetextfrm::sourcenote); });
+        connect(p, &entrypanel::dividermoved, this, &mainfrm::dividermoved);
+        if (p->sourcecom)
+            connect(p->sourcecom, &QComboBox::currentIndexChanged, this, &mainfrm::sourcechosen);
+        // A date normalised on leaving the box is a change of the title too.
+        if (p->mode == 0)
+            connect(p->fixeddatetxt, &QLineEdit::textChanged, this, &mainfrm::refreshtitle);
+    }
+    connect(Autosourcebut_, &QPushButton::clicked, this, &mainfrm::autotextclicked);
+}
+
+void mainfrm::sourcechosen(int item)
+{
+    entrypanel* p = panel_[1];
+    if (item < 0 || sourcemode_ != 1 || !index_)
+        return;
+    const int position = p->sourcecom->itemData(item).toInt();
+    if (position < 0 || static_cast<size_t>(position) >= index_->sources.size())
+        return;
+    const sourcerec& source = index_->sources[static_cast<size_t>(position)];
+    p->sourceidlab->setText(QString::number(source.id));
+    const QString title = qs(source.title);
+    for (int y = 0; y < p->yearcom->count(); ++y) {
+        if (title.contains(p->yearcom->itemText(y))) {
+            p->yearcom->setCurrentIndex(y);
+            break;
+        }
+    }
+    p->locationtxt->setFocus();
+}
+
+void mainfrm::edittext(int mode)
+{
+    entrypanel* p = panel();
+    QPlainTextEdit* box = mode == sourcetextfrm::sourcetext ? p->texttxt : p->notetxt;
+    if (const std::optional<QString> text = sourcetextfrm::edit(mode, box->toPlainText(), this))
+        box->setPlainText(withlf(*text));
+}
+
+void mainfrm::dividermoved(double share)
+{
+    divider_ = share;
+    for (entrypanel* p : panel_)
+        if (p != sender())
+            p->setdivider(share);
+}
+
+std::vector<selectionrec> mainfrm::currentselection() const
+{
+    std::vector<selectionrec> out(rows_.selection.begin(),
+                                  rows_.selection.begin() + std::min<size_t>(rows_.selection.size(),
+                                                                             static_cast<size_t>(rows_.selectioncount)));
+    if (!index_)
+        return out;
+    // Details given before the row was deleted and chosen again still count.
+    for (selectionrec& r : out) {
+        if (r.birthedited || r.personindex < 0 || static_cast<size_t>(r.personindex) >= index_->people.size())
+            continue;
+        const personrec& person = index_->people[static_cast<size_t>(r.personindex)];
+        if (person.id == r.id && person.birthedited) {
+            r.birthedited = true;
+            r.birthdate = qs(person.birthdate);
+            r.birthplace = qs(person.birthplace);
+        }
+    }
+    return out;
+}
+
+void mainfrm::askbirthdetails(const QString& entrydate)
+{
+    if (!index_)
+        return;
+    const std::vector<selectionrec> current = currentselection();
+    for (size_t i = 0; i < current.size(); ++i) {
+        selectionrec& row = rows_.selection[i];
+        row = current[i];
+        switch (checkbirth(row, *index_)) {
+        case birthcheck::none:
+            break;
+        case birthcheck::idmismatch:
+            prompts_.tell(idmismatchmessage());
+            break;
+        case birthcheck::ask: {
+            const std::optional<birthdetails> d = birthfrm::ask(row, entrydate, index_->places, prompts_, this);
+            if (!d)
+                break;
+            d->applyto(row);
+            // Kept with the individual until the file is read again, so that
+            // the individual is not asked twice.
+            personrec& person = index_->people[static_cast<size_t>(row.personindex)];
+            person.birthedited = true;
+            person.birthdate = index_->arena.store(u8(d->birthdate));
+            person.birthplace = index_->arena.store(u8(d->birthplace));
+            if (!d->birthplace.isEmpty())
+                insertplace(*index_, u8(d->birthplace));
+            break;
+        }
+        }
+    }
+}
+
+void mainfrm::autotextclicked()
+{
+    if (!index_ || !checkages())
+        return;
+    entrypanel* p = panel();
+    const QString censusdate = p->fixeddatetxt->text();
+    if (const std::optional<autotextproblem> problem = checkautotextdate(censusdate)) {
+        prompts_.tell(problem->message);
+        if (problem->focusdate)
+            p->fixeddatetxt->setFocus();
+        return;
+    }
+    if (rows_.selectioncount < 1)
+        return;
+    storerows();
+    askbirthdetails(censusdate);
+    p->texttxt->setPlainText(
+        withlf(autotext(currentselection(), *index_, censusdate, settings_.country, settings_)));
+}
+
+entryform mainfrm::currentform() const
+{
+    const entrypanel* p = panel();
+    entryform f;
+    f.fullentry = sourcemode_ == 0;
+    if (p->yearcom->currentIndex() >= 0) {
+        f.yeartext = p->yearcom->currentText().trimmed();
+        if (const censusdef* def = lookupcensus(settings_.country, f.yeartext.toInt()))
+            f.officialdate = def->date;
+    }
+    f.datetext = p->fixeddatetxt->text();
+    f.place = p->locationtxt->text();
+    f.address = p->addresstxt->text();
+    if (f.fullentry) {
+        f.title = p->titletxt->text();
+        f.reference = p->referencetxt->text();
+        f.other = p->othertxt->text();
+    } else {
+        f.title = p->sourcecom->currentText();
+        f.reference = p->wherewithinsourcetxt->text();
+    }
+    f.sourceid = p->sourceidlab->text();
+    f.sourcetext = withcrlf(p->texttxt->toPlainText());
+    f.notetext = withcrlf(p->notetxt->toPlainText());
+    f.selection = currentselection();
+    return f;
+}
+
+censusentry mainfrm::gatherentry(const entryform& form, const QString& entrydate) const
+{
+    censusentry e;
+    e.sourceid = form.sourceid.trimmed();
+    e.title = form.title;
+    e.place = form.place;
+    e.address = form.address;
+    e.reference = form.reference.trimmed();
+    e.sourcetext = form.sourcetext;
+    e.notetext = form.notetext;
+    e.other = form.other;
+    e.entrydate = entrydate;
+    e.year = form.yeartext.toInt();
+    e.selection = currentselection();
+    return e;
+}
+
+void mainfrm::saveentry()
+{
+    if (!index_)
+        return;
+    if (!checkages())
+        return;
+    storerows();
+    QApplication::processEvents();
+
+    entrypanel* p = panel();
+    const entryform form = currentform();
+    const entrycheck check = validateentry(form, settings_, &prompts_);
+    if (check.datechanged)
+        p->fixeddatetxt->setText(check.entrydate);
+    if (!check.ok) {
+        if (!check.message.isEmpty())
+            prompts_.tell(check.message);
+        switch (check.focus) {
+        case entryfield::place:
+            p->locationtxt->setFocus();
+            break;
+        case entryfield::title:
+            p->titletxt->setFocus();
+            break;
+        case entryfield::wherewithinsource:
+            p->wherewithinsourcetxt->setFocus();
+            break;
+        case entryfield::date:
+            p->fixeddatetxt->setFocus();
+            break;
+        case entryfield::sourcetext:
+            p->texttxt->setFocus();
+            break;
+        case entryfield::none:
+            break;
+        }
+        return;
+    }
+    const QString entrydate = check.entrydate;
+
+    repaint();
+    // The place typed is offered by the place completion from now on.
+    insertplace(*index_, u8(form.place.trimmed()));
+    watchfile_ = false;
+
+    if (settings_.birthdate)
+        askbirthdetails(entrydate);
+
+    // The images of the entry are chosen with the images dialog, which comes
+    // with its own feature; until then no images are asked for or written.
+    const std::vector<imagechoice> chosenimages;
+
+    busycursor busy(prompts_);
+    repaint();
+    if (filechanged(*index_)) {
+        prompts_.tell(changedonsavemessage(index_->gedcomfile, !chosenimages.empty()));
+        reload();
+        watchfile_ = true;
+        return;
+    }
+    watchfile_ = true;
+
+    censusentry entry = gatherentry(form, entrydate);
+    entry.chosenimages = chosenimages;
+    const saveoutcome out = qm::saveentry(*index_, settings_, entry);
+    switch (out.status) {
+    case savestatus::saved:
+        break;
+    case savestatus::changed:
+        prompts_.tell(out.message);
+        reload();
+        return;
+    case savestatus::refused:
+    case savestatus::backupfailed:
+        prompts_.tell(out.message, icon::exclamation);
+        return;
+    case savestatus::rewritefailed:
+        prompts_.tell(out.message, icon::critical);
+        endprogram();
+        return;
+    }
+    if (!out.logerror.isEmpty())
+        prompts_.tell(out.logerror, icon::exclamation);
+
+    watchfile_ = false;
+    loadfile();
+    clearentry();
+    household_->allpeoplelst->clearSelection();
+    watchfile_ = true;
+    raisecount();
+    panel()->yearcom->setFocus();
+}
+
+void mainfrm::raisecount()
+{
+    ++settings_.count;
+    store_.write(QStringLiteral("Count"), QString::number(settings_.count));
+    store_.sync();
+    // The donation reminder after the 10th, the 20th and every 50th saved
+    // entry comes with the help feature and hooks in here.
+}
+
+void mainfrm::endprogram()
+{
+    ending_ = true;
+    watchfile_ = false;
+    close();
+    QCoreApplication::exit(1);
+}
+
+} // namespace qm

@@ -1,0 +1,171 @@
+#pragma once
+// Helpers for the end-to-end tests of the main window: one run of the program
+// (scripted prompts, settings store on an INI file, the window), finding the
+// census row controls, clicking individuals in the lists, choosing a year,
+// answering the window's own modal dialogs.
+//
+// Header only: the window tests link the windows library, the logic tests
+// (which share tests/support) do not.
+
+#include "app/mainfrm.h"
+#include "census/censusrows_ui.h"
+#include "census/entrypanel_ui.h"
+#include "census/peoplelist_ui.h"
+#include "platform/scriptedprompts.h"
+#include "platform/settingsstore.h"
+
+#include <QApplication>
+#include <QComboBox>
+#include <QDialog>
+#include <QFile>
+#include <QLabel>
+#include <QListView>
+#include <QPointer>
+#include <QTest>
+#include <QTimer>
+
+#include <deque>
+#include <functional>
+#include <memory>
+
+namespace qmtest {
+
+// One run of the program: prompts, settings store and window.
+struct session {
+    qm::scriptedprompts prompts;
+    std::unique_ptr<qm::settingsstore> store;
+    std::unique_ptr<qm::mainfrm> w;
+
+    explicit session(const QString& ini) : store(qm::settingsstore::onfile(ini)) {}
+
+    void make() { w = std::make_unique<qm::mainfrm>(prompts, *store); }
+    QString read(const char* name) const { return store->read(QString::fromLatin1(name)).value_or(QString()); }
+};
+
+template <class T>
+QList<T*> rowcontrols(qm::mainfrm& w, const char* name)
+{
+    return w.findChild<qm::censusrowsview*>()->findChildren<T*>(QString::fromLatin1(name));
+}
+
+inline QListView* peoplelist(qm::mainfrm& w)
+{
+    return w.findChild<QListView*>(QStringLiteral("allpeoplelst"));
+}
+
+inline QListView* familylist(qm::mainfrm& w)
+{
+    return w.findChild<QListView*>(QStringLiteral("familylst"));
+}
+
+// Row of the list entry of the individual with this record number, or -1.
+inline int rowofid(qm::mainfrm& w, QListView* view, int32_t id)
+{
+    auto* model = static_cast<qm::peoplelistmodel*>(view->model());
+    for (int r = 0; r < model->rowCount(); ++r) {
+        const int32_t k = model->personat(r);
+        if (w.index()->people[static_cast<size_t>(k)].id == id)
+            return r;
+    }
+    return -1;
+}
+
+inline void clickrow(QListView* view, int row)
+{
+    const QModelIndex i = view->model()->index(row, 0);
+    view->scrollTo(i);
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, view->visualRect(i).center());
+}
+
+inline void clickid(qm::mainfrm& w, QListView* view, int32_t id)
+{
+    const int r = rowofid(w, view, id);
+    QVERIFY2(r >= 0, qPrintable(QStringLiteral("no entry for ID %1").arg(id)));
+    clickrow(view, r);
+}
+
+inline void chooseyear(qm::mainfrm& w, const QString& year)
+{
+    QComboBox* years = w.panel()->yearcom;
+    const int i = years->findText(year);
+    QVERIFY(i >= 0);
+    years->setCurrentIndex(i);
+}
+
+inline QStringList shownnames(qm::mainfrm& w)
+{
+    QStringList out;
+    for (QLabel* l : rowcontrols<QLabel>(w, "namelab"))
+        out << l->text();
+    while (!out.isEmpty() && out.back().isEmpty())
+        out.removeLast();
+    return out;
+}
+
+inline bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
+{
+    QFile f(path);
+    if (!f.open(QIODevice::ReadOnly))
+        return false;
+    QByteArray b = f.readAll();
+    f.close();
+    if (!b.contains(from))
+        return false;
+    b.replace(from, to);
+    if (!f.open(QIODevice::WriteOnly | QIODevice::Truncate))
+        return false;
+    return f.write(b) == b.size();
+}
+
+// Answers the program's own modal dialogs (those not shown through the
+// prompts) while it lives: each dialog that opens is handed to the next queued
+// action, in order. A dialog with no action queued is rejected and counted as
+// unexpected, so that a test never hangs on one.
+class dialoganswers {
+public:
+    using action = std::function<void(QDialog*)>;
+
+    dialoganswers()
+    {
+        timer_.setInterval(5);
+        QObject::connect(&timer_, &QTimer::timeout, [this] { look(); });
+        timer_.start();
+    }
+
+    void expect(const QString& objectname, action a) { queued_.push_back({objectname, std::move(a)}); }
+
+    int unexpected = 0;
+    QStringList seen; // object names of the dialogs met, in order
+    int pending() const { return static_cast<int>(queued_.size()); }
+
+private:
+    void look()
+    {
+        auto* d = qobject_cast<QDialog*>(QApplication::activeModalWidget());
+        if (!d || d == last_ || !d->isVisible())
+            return;
+        // Message boxes are the prompts' own business.
+        if (d->objectName() == QLatin1String("messagebox"))
+            return;
+        last_ = d;
+        seen << d->objectName();
+        if (queued_.empty() || queued_.front().name != d->objectName()) {
+            ++unexpected;
+            d->reject();
+            return;
+        }
+        action a = std::move(queued_.front().a);
+        queued_.pop_front();
+        a(d);
+    }
+
+    struct entry {
+        QString name;
+        action a;
+    };
+    QTimer timer_;
+    QPointer<QDialog> last_;
+    std::deque<entry> queued_;
+};
+
+} // namespace qmtest
