@@ -18,10 +18,15 @@
 #include <QLineEdit>
 #include <QPlainTextEdit>
 #include <QProcess>
+#include <QRegularExpression>
 #include <QPushButton>
 #include <QSplitter>
+#include <QSplitterHandle>
 #include <QTemporaryDir>
 #include <QTest>
+#include <QTextCursor>
+
+#include <cmath>
 #include <QToolButton>
 
 using namespace qm;
@@ -45,35 +50,64 @@ QStringList filelines(const QString& path)
 // added lines.
 QStringList linediff(const QStringList& a, const QStringList& b)
 {
-    const qsizetype n = a.size(), m = b.size();
-    std::vector<int> lcs(static_cast<size_t>((n + 1) * (m + 1)), 0);
-    const auto at = [&](qsizetype i, qsizetype j) -> int& { return lcs[static_cast<size_t>(i * (m + 1) + j)]; };
-    for (qsizetype i = n - 1; i >= 0; --i)
-        for (qsizetype j = m - 1; j >= 0; --j)
-            at(i, j) = a[i] == b[j] ? at(i + 1, j + 1) + 1 : std::max(at(i + 1, j), at(i, j + 1));
-    QStringList out;
-    QString record;
-    bool inrun = false;
-    qsizetype i = 0, j = 0;
-    const auto head = [&] {
-        if (!inrun)
-            out << QStringLiteral("@ ") + record;
-        inrun = true;
-    };
-    while (i < n || j < m) {
-        if (i < n && j < m && a[i] == b[j]) {
-            if (a[i].startsWith(QLatin1String("0 ")))
-                record = a[i];
-            inrun = false;
-            ++i;
-            ++j;
-        } else if (j < m && (i == n || at(i, j + 1) >= at(i + 1, j))) {
-            head();
-            out << QStringLiteral("+") + b[j++];
-        } else {
-            head();
-            out << QStringLiteral("-") + a[i++];
+    // Myers' shortest edit script: the files differ in a few dozen lines, so
+    // the work stays small for large files.
+    const qsizetype n = a.size(), m = b.size(), max = n + m, off = max + 1;
+    std::vector<qsizetype> v(static_cast<size_t>(2 * max + 3), 0);
+    std::vector<std::vector<qsizetype>> trace;
+    qsizetype found = -1;
+    for (qsizetype d = 0; d <= max && found < 0; ++d) {
+        trace.push_back(v);
+        for (qsizetype k = -d; k <= d; k += 2) {
+            const auto at = [&](qsizetype kk) -> qsizetype& { return v[static_cast<size_t>(kk + off)]; };
+            qsizetype x = (k == -d || (k != d && at(k - 1) < at(k + 1))) ? at(k + 1) : at(k - 1) + 1;
+            qsizetype y = x - k;
+            while (x < n && y < m && a[x] == b[y]) {
+                ++x;
+                ++y;
+            }
+            at(k) = x;
+            if (x >= n && y >= m) {
+                found = d;
+                break;
+            }
         }
+    }
+    // Walk back through the trace to the edits, then list them in order.
+    struct edit {
+        qsizetype x, y; // where the edit starts: a[x], b[y]
+        bool add;       // b[y] inserted; otherwise a[x] removed
+    };
+    std::vector<edit> edits;
+    qsizetype x = n, y = m;
+    for (qsizetype d = found; d >= 0; --d) {
+        const std::vector<qsizetype>& w = trace[static_cast<size_t>(d)];
+        const auto at = [&](qsizetype kk) { return w[static_cast<size_t>(kk + off)]; };
+        const qsizetype k = x - y;
+        const qsizetype pk = (k == -d || (k != d && at(k - 1) < at(k + 1))) ? k + 1 : k - 1;
+        const qsizetype px = at(pk), py = px - pk;
+        while (x > px && y > py) {
+            --x;
+            --y;
+        }
+        if (d > 0)
+            edits.push_back({px, py, x == px});
+        x = px;
+        y = py;
+    }
+    std::reverse(edits.begin(), edits.end());
+    QStringList out;
+    qsizetype scanned = 0, endx = -1, endy = -1;
+    QString record;
+    for (const edit& e : edits) {
+        for (; scanned < e.x; ++scanned)
+            if (a[scanned].startsWith(QLatin1String("0 ")))
+                record = a[scanned];
+        if (e.x != endx || e.y != endy)
+            out << QStringLiteral("@ ") + record;
+        out << (e.add ? QStringLiteral("+") + b[e.y] : QStringLiteral("-") + a[e.x]);
+        endx = e.add ? e.x : e.x + 1;
+        endy = e.add ? e.y + 1 : e.y;
     }
     return out;
 }
@@ -224,13 +258,13 @@ private slots:
             QStringList{QStringLiteral("@ 0 @I11@ INDI")} + signed_(QStringLiteral("+"), event("28y"))
             + QStringList{QStringLiteral("+1 OCCU Fustian Cutter"), QStringLiteral("+") + date, QStringLiteral("+") + place,
                           QStringLiteral("+2 SOUR @S12@"), QStringLiteral("@ 0 @I11@ INDI")}
-            + stamp + oldstamp("20:31:58")
+            + oldstamp("20:31:58") + stamp
             + QStringList{QStringLiteral("@ 0 @I27@ INDI")} + signed_(QStringLiteral("+"), event("26y"))
-            + QStringList{QStringLiteral("@ 0 @I27@ INDI")} + stamp + oldstamp("20:33:12")
+            + QStringList{QStringLiteral("@ 0 @I27@ INDI")} + oldstamp("20:33:12") + stamp
             + QStringList{QStringLiteral("@ 0 @I28@ INDI")} + signed_(QStringLiteral("+"), event("2y"))
-            + QStringList{QStringLiteral("@ 0 @I28@ INDI")} + stamp + oldstamp("20:34:01")
+            + QStringList{QStringLiteral("@ 0 @I28@ INDI")} + oldstamp("20:34:01") + stamp
             + QStringList{QStringLiteral("@ 0 @I29@ INDI")} + signed_(QStringLiteral("+"), event("1m"))
-            + QStringList{QStringLiteral("@ 0 @I29@ INDI")} + stamp + oldstamp("20:35:26")
+            + QStringList{QStringLiteral("@ 0 @I29@ INDI")} + oldstamp("20:35:26") + stamp
             + QStringList{QStringLiteral("@ 0 @S11@ SOUR"), QStringLiteral("+0 @S12@ SOUR"),
                           QStringLiteral("+1 TITL Census 1881 Hebden Bridge, Yorkshire, England RG11/4426/52 (William Ashworth)"),
                           QStringLiteral("+1 _TYPE Census"), QStringLiteral("+1 TEXT William Ashworth\tHead"),
@@ -311,15 +345,16 @@ private slots:
         const QStringList stamp = {QStringLiteral("+2 DATE 04 DEC 2026"), QStringLiteral("+3 TIME 13:05:09")};
         const QStringList expected =
             QStringList{QStringLiteral("@ 0 @I11@ INDI")} + citation("28y")
-            + QStringList{QStringLiteral("@ 0 @I11@ INDI")} + stamp
-            + QStringList{QStringLiteral("-2 DATE 11 NOV 2023"), QStringLiteral("-3 TIME 20:31:58"),
-                          QStringLiteral("@ 0 @I27@ INDI")}
+            + QStringList{QStringLiteral("@ 0 @I11@ INDI"), QStringLiteral("-2 DATE 11 NOV 2023"),
+                          QStringLiteral("-3 TIME 20:31:58")}
+            + stamp + QStringList{QStringLiteral("@ 0 @I27@ INDI")}
             + citation("26y")
             + QStringList{QStringLiteral("+1 OCCU Weaver"), QStringLiteral("+2 DATE 3 APR 1881"),
                           QStringLiteral("+2 PLAC Hebden Bridge, Yorkshire, England"), QStringLiteral("+2 SOUR @S7@"),
                           QStringLiteral("+3 PAGE RG11/4426/88 p 23"), QStringLiteral("+3 DATA"),
-                          QStringLiteral("+4 DATE 3 APR 1881"), QStringLiteral("@ 0 @I27@ INDI")}
-            + stamp + QStringList{QStringLiteral("-2 DATE 11 NOV 2023"), QStringLiteral("-3 TIME 20:33:12")};
+                          QStringLiteral("+4 DATE 3 APR 1881"), QStringLiteral("@ 0 @I27@ INDI"),
+                          QStringLiteral("-2 DATE 11 NOV 2023"), QStringLiteral("-3 TIME 20:33:12")}
+            + stamp;
         QCOMPARE(linediff(before, filelines(file)), expected);
         QCOMPARE(filelines(s.logpath),
                  (QStringList{QString(78, u'='), QStringLiteral("Census entry added: 2026-12-04 13:05:09"),
@@ -595,6 +630,162 @@ private slots:
         QCOMPARE(run->prompts.unexpected(), 0);
         run->prompts.expect(answer::yes, QStringLiteral("partial or full census entry"));
         w.close();
+    }
+
+    // The large editor for the source text and note, Tab in the source text,
+    // and the divider between the two boxes.
+    void texteditoranddivider()
+    {
+        const settings s = testsettings();
+        auto run = opened(sample(), s);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        entrypanel* p = w.panel();
+        p->texttxt->setFocus();
+        QTest::keyClicks(p->texttxt, QStringLiteral("Name"));
+        QTest::keyClick(p->texttxt, Qt::Key_Tab);
+        QCOMPARE(QApplication::focusWidget(), p->texttxt);
+        QTest::keyClick(p->texttxt, Qt::Key_Backtab, Qt::ShiftModifier);
+        QVERIFY(QApplication::focusWidget() != p->texttxt);
+        QCOMPARE(p->texttxt->toPlainText(), QStringLiteral("Name\t"));
+
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("sourcetextfrm"), [&](QDialog* d) {
+            QCOMPARE(d->windowTitle(), QStringLiteral("Source Text"));
+            auto* box = d->findChild<QPlainTextEdit*>(QStringLiteral("sourcetxt"));
+            QCOMPARE(box->toPlainText(), QStringLiteral("Name\t"));
+            box->moveCursor(QTextCursor::End);
+            QTest::keyClicks(box, QStringLiteral("Age"));
+            QTest::keyClick(box, Qt::Key_Return);
+            QTest::keyClicks(box, QStringLiteral("John Smith"));
+            QTest::keyClick(box, Qt::Key_Tab);
+            QTest::keyClicks(box, QStringLiteral("45"));
+            d->findChild<QPushButton*>(QStringLiteral("okbut"))->click();
+        });
+        p->fulltextbut->click();
+        QCOMPARE(p->texttxt->toPlainText(), QStringLiteral("Name\tAge\nJohn Smith\t45"));
+
+        p->notetxt->setPlainText(QStringLiteral("Page torn"));
+        dialogs.expect(QStringLiteral("sourcetextfrm"), [&](QDialog* d) {
+            QCOMPARE(d->windowTitle(), QStringLiteral("Source Note"));
+            auto* box = d->findChild<QPlainTextEdit*>(QStringLiteral("sourcetxt"));
+            QCOMPARE(box->toPlainText(), QStringLiteral("Page torn"));
+            box->setPlainText(QStringLiteral("changed"));
+            d->findChild<QPushButton*>(QStringLiteral("cancelbut"))->click();
+        });
+        p->notetextbut->click();
+        QCOMPARE(p->notetxt->toPlainText(), QStringLiteral("Page torn"));
+        QCOMPARE(dialogs.seen.size(), 2);
+        QCOMPARE(dialogs.unexpected, 0);
+
+        // The note box starts closed ("Divider Percent" never stored).
+        QSplitter* divider = p->dividerpic;
+        QCOMPARE(divider->sizes().value(1), 0);
+        QCOMPARE(p->divider(), 1.0);
+        QCOMPARE(divider->handle(1)->toolTip(), QStringLiteral("Drag up or down to reveal/resize the Source Note box"));
+
+        // Dragged up it opens; not above a fifth of the height.
+        QSplitterHandle* handle = divider->handle(1);
+        const auto drag = [&](int dy) {
+            const QPoint from = handle->rect().center();
+            QTest::mousePress(handle, Qt::LeftButton, {}, from);
+            QTest::mouseMove(handle, from + QPoint(0, dy));
+            QTest::mouseRelease(handle, Qt::LeftButton, {}, from + QPoint(0, dy));
+        };
+        const int total = divider->sizes().value(0) + divider->sizes().value(1);
+        drag(-total / 2);
+        QVERIFY2(p->divider() > 0.4 && p->divider() < 0.6, qPrintable(QString::number(p->divider())));
+        QVERIFY(p->notetxt->isVisible());
+        drag(-total);
+        QVERIFY2(p->divider() >= 0.2 && p->divider() < 0.45, qPrintable(QString::number(p->divider())));
+        // Within 3 % of the bottom the note box closes.
+        const int down = static_cast<int>(total * (0.985 - p->divider()));
+        drag(down);
+        QCOMPARE(p->divider(), 1.0);
+        QCOMPARE(divider->sizes().value(1), 0);
+
+        drag(-total / 3);
+        const double share = p->divider();
+        QVERIFY(share < 0.97);
+        w.close();
+        QCOMPARE(run->read("Divider Percent").toDouble(), std::round(share * 1e4) / 1e4);
+    }
+
+    // A rewrite that fails: the message, the family file as it was, and the
+    // program ends.
+    void failedrewriteendstheprogram()
+    {
+        const QString file = sample();
+        const std::string bytes = readfile(file);
+        const settings s = testsettings();
+        auto run = opened(file, s);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        entrypanel* p = w.panel();
+        chooseyear(w, QStringLiteral("1881"));
+        p->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
+        p->referencetxt->setText(QStringLiteral("RG11/4426/52"));
+        p->texttxt->setPlainText(QStringLiteral("William Ashworth"));
+        clickid(w, peoplelist(w), 11);
+        typerow(w, 0, QStringLiteral("28"));
+        setinputfaultfortests(true);
+        run->prompts.expect(answer::ok, QStringLiteral("program will close"));
+        button(w, "addbut")->click();
+        setinputfaultfortests(false);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QCOMPARE(run->prompts.history().back().m.kind, icon::critical);
+        QVERIFY(!w.isVisible());
+        QCOMPARE(readfile(file), bytes);
+        QCOMPARE(run->read("Count"), QString());
+    }
+
+    // A generated family file: the entry is saved among thousands of records.
+    void generatedfile()
+    {
+        const QString file = dir_.filePath(QStringLiteral("generated.ged"));
+        const int rc = QProcess::execute(QStringLiteral("python3"),
+                                         {QStringLiteral(QM_GENERATOR), QStringLiteral("--individuals"),
+                                          QStringLiteral("3000"), QStringLiteral("-o"), file});
+        if (rc != 0)
+            QSKIP("the family file generator did not run");
+        const QStringList before = filelines(file);
+        settings s = testsettings();
+        s.birthdate = false;
+        auto run = opened(file, s);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        entrypanel* p = w.panel();
+        chooseyear(w, QStringLiteral("1851"));
+        QTest::keyClicks(p->locationtxt, QStringLiteral("Quillby"));
+        QTest::keyClick(p->locationtxt, Qt::Key_End);
+        p->locationtxt->setText(QStringLiteral("Quillby, Testshire"));
+        p->referencetxt->setText(QStringLiteral("HO107/1/2"));
+        p->texttxt->setPlainText(QStringLiteral("a household"));
+        // Two individuals without any census event.
+        QList<int32_t> chosen;
+        for (const personrec& person : w.index()->people) {
+            if (person.census.empty())
+                chosen << person.id;
+            if (chosen.size() == 2)
+                break;
+        }
+        QCOMPARE(chosen.size(), 2);
+        const QString next = p->sourceidlab->text();
+        for (int32_t id : chosen) {
+            clickid(w, peoplelist(w), id);
+            typerow(w, w.household().selectioncount - 1, QStringLiteral("30"));
+        }
+        button(w, "addbut")->click();
+        QCOMPARE(run->prompts.unexpected(), 0);
+        const QStringList diff = linediff(before, filelines(file));
+        QCOMPARE(diff.count(QStringLiteral("+1 CENS")), 2);
+        QCOMPARE(diff.count(QStringLiteral("+2 PLAC Quillby, Testshire")), 2);
+        QVERIFY(diff.contains(QStringLiteral("+0 @S") + next + QStringLiteral("@ SOUR")));
+        QVERIFY(diff.contains(QStringLiteral("+1 TITL Census 1851 Quillby, Testshire HO107/1/2")));
+        QCOMPARE(diff.filter(QRegularExpression(QStringLiteral("^-(?!2 DATE|3 TIME)"))), QStringList());
+        QCOMPARE(filelines(s.logpath).filter(QStringLiteral("Name: ")).size(), 2);
+        QCOMPARE(w.index()->people.size(), size_t(3000));
+        QCOMPARE(p->sourceidlab->text(), QString::number(next.toInt() + 1));
     }
 };
 
