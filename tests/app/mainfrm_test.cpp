@@ -7,6 +7,7 @@
 #include "platform/scriptedprompts.h"
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
+#include "support/mainfrmfixture.h"
 #include "support/testfiles.h"
 
 #include <QAbstractButton>
@@ -27,97 +28,7 @@
 #include <QToolButton>
 
 using namespace qm;
-
-namespace {
-
-// One run of the program: prompts, settings store and window.
-struct session {
-    scriptedprompts prompts;
-    std::unique_ptr<settingsstore> store;
-    std::unique_ptr<mainfrm> w;
-
-    explicit session(const QString& ini) : store(settingsstore::onfile(ini)) {}
-
-    void make() { w = std::make_unique<mainfrm>(prompts, *store); }
-    QString read(const char* name) const { return store->read(QString::fromLatin1(name)).value_or(QString()); }
-};
-
-template <class T>
-QList<T*> rowcontrols(mainfrm& w, const char* name)
-{
-    return w.findChild<censusrowsview*>()->findChildren<T*>(QString::fromLatin1(name));
-}
-
-QListView* peoplelist(mainfrm& w)
-{
-    return w.findChild<QListView*>(QStringLiteral("allpeoplelst"));
-}
-
-QListView* familylist(mainfrm& w)
-{
-    return w.findChild<QListView*>(QStringLiteral("familylst"));
-}
-
-// Row of the list entry of the individual with this record number, or -1.
-int rowofid(mainfrm& w, QListView* view, int32_t id)
-{
-    auto* model = static_cast<peoplelistmodel*>(view->model());
-    for (int r = 0; r < model->rowCount(); ++r) {
-        const int32_t k = model->personat(r);
-        if (w.index()->people[static_cast<size_t>(k)].id == id)
-            return r;
-    }
-    return -1;
-}
-
-void clickrow(QListView* view, int row)
-{
-    const QModelIndex i = view->model()->index(row, 0);
-    view->scrollTo(i);
-    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, view->visualRect(i).center());
-}
-
-void clickid(mainfrm& w, QListView* view, int32_t id)
-{
-    const int r = rowofid(w, view, id);
-    QVERIFY2(r >= 0, qPrintable(QStringLiteral("no entry for ID %1").arg(id)));
-    clickrow(view, r);
-}
-
-void chooseyear(mainfrm& w, const QString& year)
-{
-    QComboBox* years = w.panel()->yearcom;
-    const int i = years->findText(year);
-    QVERIFY(i >= 0);
-    years->setCurrentIndex(i);
-}
-
-QStringList shownnames(mainfrm& w)
-{
-    QStringList out;
-    for (QLabel* l : rowcontrols<QLabel>(w, "namelab"))
-        out << l->text();
-    while (!out.isEmpty() && out.back().isEmpty())
-        out.removeLast();
-    return out;
-}
-
-bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
-{
-    QFile f(path);
-    if (!f.open(QIODevice::ReadOnly))
-        return false;
-    QByteArray b = f.readAll();
-    f.close();
-    if (!b.contains(from))
-        return false;
-    b.replace(from, to);
-    if (!f.open(QIODevice::WriteOnly | QIODevice::Truncate))
-        return false;
-    return f.write(b) == b.size();
-}
-
-} // namespace
+using namespace qmtest;
 
 class mainfrm_test : public QObject {
     Q_OBJECT
