@@ -148,6 +148,7 @@ private:
     int32_t findresult_ = -1;
     bool fromfind_ = false;
     bool ending_ = false; // closing after a failed rewrite: no questions
+    bool saving_ = false; // a save is running (a second click waits its turn)
 
     // controls
     QStackedWidget* panels_ = nullptr;

@@ -220,8 +220,15 @@ censusentry mainfrm::gatherentry(const entryform& form, const QString& entrydate
 
 void mainfrm::saveentry()
 {
-    if (!index_)
+    // Pending clicks are let through below: a second click on Save must not
+    // start a second save of the same entry.
+    if (!index_ || saving_)
         return;
+    saving_ = true;
+    const struct done {
+        bool& flag;
+        ~done() { flag = false; }
+    } guard{saving_};
     if (!checkages())
         return;
     storerows();

@@ -425,6 +425,11 @@ private slots:
         save->click();
         QCOMPARE(QApplication::focusWidget(), p->fixeddatetxt);
 
+        // A date typed is checked and written the GEDCOM way on leaving the box.
+        p->fixeddatetxt->setFocus();
+        QTest::keyClicks(p->fixeddatetxt, QStringLiteral("4 apr 1881"));
+        p->addresstxt->setFocus();
+        QCOMPARE(p->fixeddatetxt->text(), QStringLiteral("04 APR 1881"));
         p->fixeddatetxt->setText(QStringLiteral("3 APR 1881"));
         p->texttxt->setPlainText(QStringLiteral(" ab "));
         prompts.expect(answer::no, QStringLiteral("The Source Text hasn't been filled in. Are you sure you want to "
