@@ -235,10 +235,14 @@ void mainfrm::saveentry()
     QApplication::processEvents();
 
     entrypanel* p = panel();
-    const entryform form = currentform();
+    entryform form = currentform();
     const entrycheck check = validateentry(form, settings_, &prompts_);
-    if (check.datechanged)
+    if (check.datechanged) {
+        // The date as written into the file; the title follows it.
         p->fixeddatetxt->setText(check.entrydate);
+        if (form.fullentry)
+            form.title = p->titletxt->text();
+    }
     if (!check.ok) {
         if (!check.message.isEmpty())
             prompts_.tell(check.message);
