@@ -24,7 +24,7 @@ void loadfile(benchmark::State& state, const char* name)
         state.SkipWithError((path.toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
         return;
     }
-    size_t people = 0;
+    size_t people = 0, arena = 0;
     for (auto _ : state) {
         qm::loadresult r = qm::loadgedcom(path, {});
         if (!r.index) {
@@ -32,10 +32,12 @@ void loadfile(benchmark::State& state, const char* name)
             return;
         }
         people = r.index->people.size();
+        arena = r.index->arena.capacity();
         benchmark::DoNotOptimize(r.index.get());
     }
     state.SetBytesProcessed(static_cast<int64_t>(state.iterations()) * info.size());
     state.counters["individuals"] = static_cast<double>(people);
+    state.counters["arena_MB"] = static_cast<double>(arena) / (1 << 20);
 }
 
 } // namespace

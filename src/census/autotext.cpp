@@ -39,7 +39,7 @@ const personrec* personof(const selectionrec& row, const gedcomindex& index)
     return &index.people[static_cast<size_t>(row.personindex)];
 }
 
-bool isspouseof(const std::vector<int32_t>& fams, int32_t family)
+bool isspouseof(const indexlist<int32_t>& fams, int32_t family)
 {
     return family != 0 && std::find(fams.begin(), fams.end(), family) != fams.end();
 }

@@ -8,9 +8,10 @@
 // objects) are record numbers, the digits of an identifier such as 12 in @I12@.
 //
 // All texts are UTF-8, whatever the file's encoding, and are views into the
-// index's own arena: they live as long as the index.
+// index's own arena: they live as long as the index. So do the records' lists.
 
 #include "flags/flagtable.h"
+#include "model/indexlist.h"
 #include "model/textarena.h"
 #include "platform/encoding.h"
 #include "platform/filetime.h"
@@ -29,7 +30,7 @@ struct censusrec {
     std::string_view place;   // "2 PLAC" value
     std::string_view address; // "2 ADDR" value
     std::string_view age;     // "2 AGE" value
-    std::vector<int32_t> sourceids; // sources cited under the event, in file order
+    indexlist<int32_t> sourceids; // sources cited under the event, in file order
 
     int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
 };
@@ -37,20 +38,20 @@ struct censusrec {
 // One individual ("0 @I...").
 struct personrec {
     int32_t id = 0;
-    std::string_view name; // "Surname, Given names", or "<no name>"
-    std::string_view sex;
+    int32_t famc = 0; // family as a child (last "1 FAMC"), 0 if none
     bool hasbirthdate = false;
     bool hasbirthplace = false;
     bool birthedited = false; // birth details given on the form since the load
     bool hasdeathdate = false;
+    std::string_view name; // "Surname, Given names", or "<no name>"
+    std::string_view sex;
     std::string_view birthplace;
     std::string_view birthdate;
     std::string_view deathdate;
-    int32_t famc = 0;               // family as a child (last "1 FAMC"), 0 if none
-    std::vector<int32_t> fams;      // families as a spouse, in file order
-    std::vector<int32_t> sourceids; // every "2 SOUR @" citation of the record, in file order
-    std::vector<int32_t> flagids;   // flags held: positions in the index's flag table
-    std::vector<censusrec> census;  // "1 CENS" events, in file order
+    indexlist<int32_t> fams;      // families as a spouse, in file order
+    indexlist<int32_t> sourceids; // every "2 SOUR @" citation of the record, in file order
+    indexlist<int32_t> flagids;   // flags held: positions in the index's flag table
+    indexlist<censusrec> census;  // "1 CENS" events, in file order
 
     int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
 };
@@ -98,11 +99,15 @@ struct gedcomindex {
     int32_t maxnoteid = -1;
     int32_t nextsourceid = 1; // highest source number + 1
 
+    // Last: a move assignment replaces the records before the storage their
+    // texts and lists live in.
     textarena arena;
 
     gedcomindex() = default;
     gedcomindex(gedcomindex&&) = default;
     gedcomindex& operator=(gedcomindex&&) = default;
+    // The records go before the arena, which members declared before it would outlive.
+    ~gedcomindex() { people.clear(); }
 };
 
 } // namespace qm

@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <cstring>
 #include <deque>
+#include <memory>
 #include <limits>
 
 namespace qm {
@@ -181,6 +182,8 @@ private:
     void personline(std::string_view s);
     void setname(std::string_view s);
     void flagline(std::string_view s);
+    template <typename T>
+    void putlist(indexlist<T>& list, std::vector<T>& items);
 
     personrec& person() { return ix_.people.back(); }
     censusrec& lastcensus() { return census_.back(); }
@@ -195,8 +198,8 @@ private:
     bool inbirthdate = false, inbirthplace = false, indeath = false;
     bool inflags = false, incensus = false, titlepending = false;
 
-    // The current individual's lists, gathered here and copied out at the end
-    // of the record so that each list is one allocation of its exact size.
+    // The current individual's lists, gathered here and moved into the arena
+    // at the end of the record, each as one piece of its exact size.
     std::vector<int32_t> fams_, sourceids_, flagids_;
     std::vector<censusrec> census_;
     std::vector<int32_t> censuscites_;      // citations of all its census events, in order
@@ -335,33 +338,38 @@ void loader::startrecord(std::string_view s)
     }
 }
 
+// Moves the gathered items into one piece of the arena, owned by list.
+template <typename T>
+void loader::putlist(indexlist<T>& list, std::vector<T>& items)
+{
+    if (items.empty())
+        return;
+    T* at = static_cast<T*>(ix_.arena.allocate(items.size() * sizeof(T), alignof(T)));
+    std::uninitialized_move(items.begin(), items.end(), at);
+    list.adopt(at, items.size());
+    items.clear();
+}
+
 void loader::endrecord()
 {
     if (kind_ != kind::person)
         return;
     personrec& p = person();
-    if (!fams_.empty())
-        p.fams.assign(fams_.begin(), fams_.end());
-    if (!sourceids_.empty())
-        p.sourceids.assign(sourceids_.begin(), sourceids_.end());
-    if (!flagids_.empty())
-        p.flagids.assign(flagids_.begin(), flagids_.end());
+    putlist(p.fams, fams_);
+    putlist(p.sourceids, sourceids_);
+    putlist(p.flagids, flagids_);
     if (!census_.empty()) {
         censuscitestart_.push_back(censuscites_.size());
         for (size_t i = 0; i < census_.size(); ++i) {
-            const auto from = censuscites_.begin() + static_cast<std::ptrdiff_t>(censuscitestart_[i]);
-            const auto to = censuscites_.begin() + static_cast<std::ptrdiff_t>(censuscitestart_[i + 1]);
-            if (from != to)
-                census_[i].sourceids.assign(from, to);
+            const size_t from = censuscitestart_[i], to = censuscitestart_[i + 1];
+            if (from == to)
+                continue;
+            auto* at = static_cast<int32_t*>(ix_.arena.allocate((to - from) * sizeof(int32_t), alignof(int32_t)));
+            std::memcpy(at, censuscites_.data() + from, (to - from) * sizeof(int32_t));
+            census_[i].sourceids.adopt(at, to - from);
         }
-        p.census.reserve(census_.size());
-        for (censusrec& c : census_)
-            p.census.push_back(std::move(c));
+        putlist(p.census, census_);
     }
-    fams_.clear();
-    sourceids_.clear();
-    flagids_.clear();
-    census_.clear();
     censuscites_.clear();
     censuscitestart_.clear();
 }

@@ -1,12 +1,16 @@
 #pragma once
-// Storage for the many short texts of the index. Texts are appended to large
-// blocks that never move, so the views handed out stay valid for the arena's
-// life (also when the arena itself is moved), and a load makes a few large
-// allocations instead of one per value.
+// Storage for the many short texts and lists of the index. They are appended
+// to large blocks that never move, so the views handed out stay valid for the
+// arena's life (also when the arena itself is moved), and a load makes a few
+// large allocations instead of one per value.
+
+#include "platform/memoryhint.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <cstring>
 #include <memory>
+#include <new>
 #include <string_view>
 #include <vector>
 
@@ -24,21 +28,27 @@ public:
     {
         if (text.empty())
             return {};
-        if (text.size() > room_) {
-            // Blocks grow from small to large, so that a small file costs
-            // little; they are not zeroed, since every byte is written first.
-            const size_t block = std::min(blocksize, firstblock << std::min<size_t>(blocks_.size(), 8));
-            const size_t size = text.size() > block / 4 ? text.size() : block;
-            blocks_.push_back(std::unique_ptr<char[]>(new char[size]));
-            next_ = blocks_.back().get();
-            room_ = size;
-            total_ += size;
-        }
-        char* at = next_;
+        char* at = static_cast<char*>(allocate(text.size(), 1));
         std::memcpy(at, text.data(), text.size());
-        next_ += text.size();
-        room_ -= text.size();
         return {at, text.size()};
+    }
+
+    // Uninitialised room for `bytes` bytes aligned to `align` (a power of two
+    // no larger than that of max_align_t).
+    void* allocate(size_t bytes, size_t align)
+    {
+        size_t pad = static_cast<size_t>(-reinterpret_cast<uintptr_t>(next_)) & (align - 1);
+        if (bytes + pad > room_) {
+            // A large piece gets a block of its own; the current one stays in use.
+            if (bytes > blocksize / 4)
+                return addblock(bytes, false);
+            addblock(bytes, true);
+            pad = 0;
+        }
+        char* at = next_ + pad;
+        next_ = at + bytes;
+        room_ -= bytes + pad;
+        return at;
     }
 
     // Bytes held in blocks, for memory accounting.
@@ -46,8 +56,37 @@ public:
 
 private:
     static constexpr size_t firstblock = 16 << 10;
-    static constexpr size_t blocksize = 1 << 20;
-    std::vector<std::unique_ptr<char[]>> blocks_;
+    static constexpr size_t blocksize = 4 << 20;
+    static constexpr size_t largepage = 2 << 20;
+
+    struct freeblock {
+        size_t align;
+        void operator()(char* p) const { ::operator delete(p, std::align_val_t(align)); }
+    };
+    using block = std::unique_ptr<char, freeblock>;
+
+    char* addblock(size_t need, bool current)
+    {
+        // Blocks grow from small to large, so that a small file costs little.
+        // Large ones start on a large page and ask for large pages: touching
+        // fresh memory a small page at a time is much of a big load's time.
+        // They are not zeroed, since every byte is written first.
+        const size_t size =
+            current ? std::max(need, std::min(blocksize, firstblock << std::min<size_t>(blocks_.size(), 8))) : need;
+        const size_t align = size >= largepage ? largepage : alignof(std::max_align_t);
+        char* const at = static_cast<char*>(::operator new(size, std::align_val_t(align)));
+        blocks_.emplace_back(at, freeblock{align});
+        total_ += size;
+        if (align == largepage)
+            hintlargememory(at, size);
+        if (current) {
+            next_ = at;
+            room_ = size;
+        }
+        return at;
+    }
+
+    std::vector<block> blocks_;
     char* next_ = nullptr;
     size_t room_ = 0;
     size_t total_ = 0;

@@ -12,7 +12,7 @@ void hintlargememory(void* data, size_t bytes)
 {
 #if defined(__linux__) && defined(MADV_HUGEPAGE)
     constexpr uintptr_t huge = 2u << 20;
-    if (bytes < 4 * huge)
+    if (bytes < huge)
         return;
     // Only whole large pages inside the block.
     const uintptr_t from = (reinterpret_cast<uintptr_t>(data) + huge - 1) & ~(huge - 1);
