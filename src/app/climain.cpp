@@ -4,13 +4,6 @@
 #include <QCoreApplication>
 
 #include <cstdio>
-#include <cstdlib>
-#include <cstring>
-#include <string>
-
-#if defined(__linux__) && defined(__GLIBC__)
-#include <unistd.h>
-#endif
 
 namespace qm {
 
@@ -27,32 +20,10 @@ const std::vector<clicommand>& clicommands()
     return commands;
 }
 
-// A big family file fills hundreds of megabytes with small blocks, and
-// fetching that memory a small page at a time is much of the load's time.
-// glibc serves its heap from large pages only when told so as the process
-// starts (GLIBC_TUNABLES), so the tool starts itself afresh once with that
-// setting. When that cannot be done it simply carries on.
-void uselargepages(char** argv)
-{
-#if defined(__linux__) && defined(__GLIBC__)
-    const char* tunables = std::getenv("GLIBC_TUNABLES");
-    if (tunables && std::strstr(tunables, "glibc.malloc.hugetlb"))
-        return;
-    std::string value = "glibc.malloc.hugetlb=1";
-    if (tunables && *tunables)
-        value = std::string(tunables) + ":" + value;
-    if (setenv("GLIBC_TUNABLES", value.c_str(), 1) == 0)
-        execv("/proc/self/exe", argv);
-#else
-    (void)argv;
-#endif
-}
-
 } // namespace qm
 
 int main(int argc, char** argv)
 {
-    qm::uselargepages(argv);
     QCoreApplication app(argc, argv);
     QCoreApplication::setApplicationName(QStringLiteral("quillmark-cli"));
     QStringList args = QCoreApplication::arguments();
