@@ -766,13 +766,16 @@ private slots:
         p->locationtxt->setText(QStringLiteral("Quillby, Testshire"));
         p->referencetxt->setText(QStringLiteral("HO107/1/2"));
         p->texttxt->setPlainText(QStringLiteral("a household"));
-        // Two individuals without any census event.
+        // Two individuals without any census event, one of them without a
+        // birth date or place: with "Birthdate" off nobody is asked about births.
         QList<int32_t> chosen;
-        for (const personrec& person : w.index()->people) {
-            if (person.census.empty())
-                chosen << person.id;
-            if (chosen.size() == 2)
-                break;
+        for (bool born : {false, true}) {
+            for (const personrec& person : w.index()->people) {
+                if (person.census.empty() && (person.hasbirthdate || person.hasbirthplace) == born) {
+                    chosen << person.id;
+                    break;
+                }
+            }
         }
         QCOMPARE(chosen.size(), 2);
         const QString next = p->sourceidlab->text();
@@ -780,10 +783,13 @@ private slots:
             clickid(w, peoplelist(w), id);
             typerow(w, w.household().selectioncount - 1, QStringLiteral("30"));
         }
+        dialoganswers dialogs;
         button(w, "addbut")->click();
+        QCOMPARE(dialogs.seen, QStringList());
         QCOMPARE(run->prompts.unexpected(), 0);
         const QStringList diff = linediff(before, filelines(file));
         QCOMPARE(diff.count(QStringLiteral("+1 CENS")), 2);
+        QCOMPARE(diff.filter(QStringLiteral("BIRT")), QStringList());
         QCOMPARE(diff.count(QStringLiteral("+2 PLAC Quillby, Testshire")), 2);
         QVERIFY(diff.contains(QStringLiteral("+0 @S") + next + QStringLiteral("@ SOUR")));
         QVERIFY(diff.contains(QStringLiteral("+1 TITL Census 1851 Quillby, Testshire HO107/1/2")));
