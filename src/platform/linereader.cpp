@@ -22,35 +22,61 @@ bool isspace_(char c)
     return c == ' ' || c == '\t';
 }
 
-// Position of the first CR or LF in data[from, end), or end. Lines are short
-// and files long, so this scan is most of the reader's time: it looks at 16
-// bytes at once where the processor allows.
-size_t findeol(const char* data, size_t from, size_t end)
+// Bit i set where data[i] is CR or LF, for 64 bytes.
+uint64_t eolmask(const char* data)
 {
-    size_t i = from;
+    uint64_t mask = 0;
 #if defined(__SSE2__) || defined(_M_X64)
     const __m128i lf = _mm_set1_epi8('\n');
     const __m128i cr = _mm_set1_epi8('\r');
-    while (i + 16 <= end) {
-        const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + i));
-        const int mask = _mm_movemask_epi8(_mm_or_si128(_mm_cmpeq_epi8(v, lf), _mm_cmpeq_epi8(v, cr)));
-        if (mask) {
-#if defined(_MSC_VER) && !defined(__clang__)
-            unsigned long bit;
-            _BitScanForward(&bit, static_cast<unsigned long>(mask));
-            return i + bit;
-#else
-            return i + static_cast<size_t>(__builtin_ctz(static_cast<unsigned>(mask)));
-#endif
-        }
-        i += 16;
+    for (int k = 0; k < 4; ++k) {
+        const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + 16 * k));
+        const int m = _mm_movemask_epi8(_mm_or_si128(_mm_cmpeq_epi8(v, lf), _mm_cmpeq_epi8(v, cr)));
+        mask |= static_cast<uint64_t>(static_cast<uint16_t>(m)) << (16 * k);
     }
+#else
+    for (int i = 0; i < 64; ++i)
+        if (data[i] == '\n' || data[i] == '\r')
+            mask |= uint64_t{1} << i;
 #endif
-    while (i < end && data[i] != '\n' && data[i] != '\r')
-        ++i;
-    return i;
+    return mask;
+}
+
+int lowestbit(uint64_t bits)
+{
+#if defined(_MSC_VER) && !defined(__clang__)
+    unsigned long bit;
+    _BitScanForward64(&bit, bits);
+    return static_cast<int>(bit);
+#else
+    return __builtin_ctzll(bits);
+#endif
 }
 } // namespace
+
+// Position of the first CR or LF in data[from, end), or end. Lines are short
+// and files long, so this scan is most of the reader's time: it looks at 64
+// bytes at once and keeps their bit mask, so that the next few lines cost a
+// bit scan each. The mask stays valid while the buffer's bytes stay where
+// they are (fill() forgets it).
+size_t linereader::findeol(const char* data, size_t from, size_t end)
+{
+    for (;;) {
+        if (from >= eolbase_ && from - eolbase_ < 64) {
+            const uint64_t bits = eolmask_ & (~uint64_t{0} << (from - eolbase_));
+            if (bits)
+                return eolbase_ + static_cast<size_t>(lowestbit(bits));
+            from = eolbase_ + 64;
+        }
+        if (from + 64 > end) {
+            while (from < end && data[from] != '\n' && data[from] != '\r')
+                ++from;
+            return std::min(from, end);
+        }
+        eolbase_ = from;
+        eolmask_ = eolmask(data + from);
+    }
+}
 
 linereader::linereader() = default;
 linereader::~linereader() = default;
@@ -97,6 +123,7 @@ size_t linereader::readraw(char* dest, size_t max)
 // Reads the first chunk and decides the encoding from it.
 void linereader::detect()
 {
+    eolbase_ = nomask;
     buf_.resize(chunk);
     end_ = readraw(buf_.data(), chunk);
     // Top the first read up so that the header is seen whole even from a pipe-like device.
@@ -166,6 +193,7 @@ bool linereader::fill()
 {
     if (eof_ || failed_)
         return false;
+    eolbase_ = nomask;
     if (begin_ > 0) {
         std::memmove(buf_.data(), buf_.data() + begin_, end_ - begin_);
         end_ -= begin_;
@@ -280,6 +308,34 @@ bool linereader::next(std::string_view& line)
         }
         scan = begin_ + off;
     }
+}
+
+std::string_view linereader::nextcrlflines(std::string_view stopfirst, int64_t& count)
+{
+    count = 0;
+    const char* data = buf_.data();
+    const size_t from = begin_;
+    size_t at = begin_;
+    const auto stops = [stopfirst](char c) {
+        for (const char s : stopfirst)
+            if (c == s)
+                return true;
+        return false;
+    };
+    while (at < end_ && !stops(data[at])) {
+        const size_t i = findeol(data, at, end_);
+        if (i + 1 >= end_ || data[i] != '\r' || data[i + 1] != '\n' || (maxline_ && i - at > maxline_))
+            break;
+        at = i + 2;
+        ++count;
+    }
+    if (count == 0)
+        return {};
+    begin_ = at;
+    linenumber_ += count;
+    lineend_ = std::string_view(data + at - 2, 2);
+    truncated_ = false;
+    return std::string_view(data + from, at - from);
 }
 
 } // namespace qm

@@ -43,6 +43,14 @@ public:
     // after a read error (see failed()).
     bool next(std::string_view& line);
 
+    // For a caller that copies most lines through unchanged: the buffered
+    // lines that follow, whole with their line ends, as long as each ends in
+    // CR LF, does not begin with a byte of `stopfirst` and is not cut by the
+    // line limit. The caller reads the others with next(). The bytes are in
+    // the form lines are handed out, valid until the next call; `count` gets
+    // the number of lines. Often empty.
+    std::string_view nextcrlflines(std::string_view stopfirst, int64_t& count);
+
     // The line end that followed the line last returned, in the form lines are
     // handed out: "\r\n", "\n", "\r", "\n\r", or "" for a last line without one.
     std::string_view lineend() const { return lineend_; }
@@ -55,6 +63,9 @@ public:
     int64_t linenumber() const { return linenumber_; }
 
 private:
+    static constexpr size_t nomask = static_cast<size_t>(-1);
+
+    size_t findeol(const char* data, size_t from, size_t end);
     size_t readraw(char* dest, size_t max);
     bool fill();
     void detect();
@@ -66,6 +77,8 @@ private:
 
     std::vector<char> buf_;
     size_t begin_ = 0, end_ = 0;
+    size_t eolbase_ = nomask; // where the bytes of eolmask_ start in buf_
+    uint64_t eolmask_ = 0;    // CR and LF among the 64 bytes from eolbase_
     bool eof_ = false;
     bool failed_ = false;
     QString error_;

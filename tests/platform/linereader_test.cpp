@@ -129,3 +129,51 @@ TEST(LineReader, DecodesUtf16)
         EXPECT_EQ(r.ends[1], "\r\n");
     }
 }
+
+TEST(LineReader, RunsOfCrLfLinesMatchLineByLine)
+{
+    // Mostly CR LF lines, with lines that stop a run (a "0" or a blank first,
+    // other line ends, empty lines, lines over the limit) spread over several
+    // buffers.
+    std::string bytes;
+    for (int i = 0; bytes.size() < 3u * 1024 * 1024; ++i) {
+        std::string line = (i % 11 == 0 ? "0 @I" : "2 DATE ") + std::to_string(i);
+        if (i % 53 == 7)
+            line = "  " + line;
+        if (i % 67 == 5)
+            line.clear();
+        if (i % 89 == 3)
+            line += std::string(300, 'x');
+        bytes += line;
+        bytes += i % 41 == 9 ? "\n" : (i % 43 == 8 ? "\r" : "\r\n");
+    }
+    for (const size_t maxline : {size_t(0), size_t(200)}) {
+        const auto whole = readall(bytes, maxline);
+        linereader r;
+        r.setmaxline(maxline);
+        r.openbytes(bytes);
+        std::vector<std::string> lines, ends;
+        std::string_view line;
+        size_t runs = 0;
+        while (r.next(line)) {
+            lines.emplace_back(line);
+            ends.emplace_back(r.lineend());
+            int64_t count = 0;
+            std::string_view run = r.nextcrlflines("0 \t", count);
+            runs += count > 0;
+            for (int64_t k = 0; k < count; ++k) {
+                const size_t end = run.find("\r\n");
+                ASSERT_NE(end, std::string_view::npos);
+                lines.emplace_back(run.substr(0, end));
+                ends.emplace_back("\r\n");
+                ASSERT_TRUE(lines.back().empty() || (lines.back()[0] != '0' && lines.back()[0] != ' '));
+                run.remove_prefix(end + 2);
+            }
+            EXPECT_TRUE(run.empty());
+        }
+        EXPECT_GT(runs, 1000u);
+        EXPECT_EQ(lines, whole.lines);
+        EXPECT_EQ(ends, whole.ends);
+        EXPECT_EQ(r.linenumber(), static_cast<int64_t>(whole.lines.size()));
+    }
+}
