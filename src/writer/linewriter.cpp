@@ -195,6 +195,23 @@ void linewriter::writeline(std::string_view line)
     put(line);
 }
 
+void linewriter::writelines(std::string_view lines, int64_t count)
+{
+    if (failed_ || lines.empty())
+        return;
+    start();
+    std::string& out = memory_ ? mem_ : buf_;
+    // Line by line UTF-16 is the same as all at once: the conversion keeps no
+    // state from one character to the next.
+    if (isutf16(enc_))
+        appendutf16(lines, enc_ == textencoding::utf16be, out);
+    else
+        out.append(lines);
+    lines_ += count;
+    if (!memory_ && buf_.size() >= flushsize)
+        flush();
+}
+
 bool linewriter::writetext(std::string_view utf8)
 {
     if (failed_)

@@ -52,6 +52,9 @@ public:
 
     // A line kept from the input, as the line reader handed it out.
     void writeline(std::string_view line);
+    // Lines kept from the input, each with its CR LF line end, in the form
+    // the line reader hands them out (linereader::nextcrlflines).
+    void writelines(std::string_view lines, int64_t count);
     // A new line of UTF-8 text. False (and the writer failed) when a
     // character cannot be held by the file's encoding: callers check typed
     // text before writing, so this is a fault.

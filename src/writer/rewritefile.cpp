@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <cstring>
 #include <memory>
 #include <unordered_map>
 
@@ -16,9 +17,12 @@ namespace qm {
 
 namespace {
 
-bool startswith(std::string_view s, std::string_view p)
+// Prefix tests against literals, of a length known when compiling so that the
+// comparison becomes a few plain loads.
+template <size_t N>
+bool startswith(std::string_view s, const char (&p)[N])
 {
-    return s.substr(0, p.size()) == p;
+    return s.size() >= N - 1 && std::memcmp(s.data(), p, N - 1) == 0;
 }
 
 bool startswithnocase(std::string_view s, std::string_view p)
@@ -100,6 +104,18 @@ private:
     void flagblock(std::string_view t);
     const personrec* personwithid(int32_t id, int32_t hint) const;
     bool placeatend(std::string_view t) const { return startswith(t, "0 TRLR"); }
+    // Nothing is due before the next record starts: every line up to it is
+    // written as read. (Census dates look at lines inside records.)
+    bool quiet() const
+    {
+        return entryperson_ < 0 && !sourcefound_ && !recordchanged_ && !flagperson_
+            && mode_ != rewritemode::censusdates;
+    }
+    static bool startsrecord(std::string_view line)
+    {
+        const std::string_view t = lefttrim(line);
+        return !t.empty() && t[0] == '0';
+    }
 
     linereader& in_;
     linewriter& out_;
@@ -231,6 +247,16 @@ rewriteresult rewriterun::run()
     while (reuse_ || fetch()) {
         reuse_ = false;
         drop_ = false;
+        // Most lines are kept as they are: a line inside a record when nothing
+        // is due within the record needs none of the checks below.
+        if (quiet() && !startsrecord(line_)) {
+            out_.writeline(line_);
+            // And so are the lines after it, up to a line that may start a record.
+            int64_t count = 0;
+            const std::string_view kept = in_.nextcrlflines("0 \t", count);
+            out_.writelines(kept, count);
+            continue;
+        }
         iteration();
     }
     if (in_.failed())
