@@ -6,9 +6,6 @@
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
-#if defined(__SSE2__) || defined(_M_X64)
-#include <emmintrin.h>
-#endif
 
 namespace qm {
 
@@ -22,36 +19,6 @@ bool isspace_(char c)
     return c == ' ' || c == '\t';
 }
 
-// Bit i set where data[i] is CR or LF, for 64 bytes.
-uint64_t eolmask(const char* data)
-{
-    uint64_t mask = 0;
-#if defined(__SSE2__) || defined(_M_X64)
-    const __m128i lf = _mm_set1_epi8('\n');
-    const __m128i cr = _mm_set1_epi8('\r');
-    for (int k = 0; k < 4; ++k) {
-        const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + 16 * k));
-        const int m = _mm_movemask_epi8(_mm_or_si128(_mm_cmpeq_epi8(v, lf), _mm_cmpeq_epi8(v, cr)));
-        mask |= static_cast<uint64_t>(static_cast<uint16_t>(m)) << (16 * k);
-    }
-#else
-    for (int i = 0; i < 64; ++i)
-        if (data[i] == '\n' || data[i] == '\r')
-            mask |= uint64_t{1} << i;
-#endif
-    return mask;
-}
-
-int lowestbit(uint64_t bits)
-{
-#if defined(_MSC_VER) && !defined(__clang__)
-    unsigned long bit;
-    _BitScanForward64(&bit, bits);
-    return static_cast<int>(bit);
-#else
-    return __builtin_ctzll(bits);
-#endif
-}
 } // namespace
 
 // Position of the first CR or LF in data[from, end), or end. Lines are short
@@ -226,7 +193,7 @@ bool linereader::fill()
     return true;
 }
 
-bool linereader::next(std::string_view& line)
+bool linereader::nextline(std::string_view& line)
 {
     truncated_ = false;
     size_t scan = begin_;

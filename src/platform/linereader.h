@@ -16,6 +16,12 @@
 #include <string>
 #include <string_view>
 #include <vector>
+#if defined(__SSE2__) || defined(_M_X64)
+#include <emmintrin.h>
+#endif
+#if defined(_MSC_VER) && !defined(__clang__)
+#include <intrin.h>
+#endif
 
 class QIODevice;
 class QStringDecoder;
@@ -41,7 +47,34 @@ public:
 
     // The next line, without its line end. False at the end of the file or
     // after a read error (see failed()).
-    bool next(std::string_view& line);
+    bool next(std::string_view& line)
+    {
+        // Most lines end in CR LF within the buffer: those are taken here,
+        // everything else by nextline().
+        for (size_t from = begin_;;) {
+            if (from >= eolbase_ && from - eolbase_ < 64) {
+                const uint64_t bits = eolmask_ & (~uint64_t{0} << (from - eolbase_));
+                if (bits) {
+                    const size_t i = eolbase_ + static_cast<size_t>(lowestbit(bits));
+                    const char* data = buf_.data();
+                    if (data[i] != '\r' || i + 1 >= end_ || data[i + 1] != '\n' || (maxline_ && i - begin_ > maxline_))
+                        break;
+                    line = std::string_view(data + begin_, i - begin_);
+                    lineend_ = std::string_view(data + i, 2);
+                    begin_ = i + 2;
+                    truncated_ = false;
+                    ++linenumber_;
+                    return true;
+                }
+                from = eolbase_ + 64;
+            }
+            if (from + 64 > end_)
+                break;
+            eolbase_ = from;
+            eolmask_ = eolmask(buf_.data() + from);
+        }
+        return nextline(line);
+    }
 
     // For a caller that copies most lines through unchanged: the buffered
     // lines that follow, whole with their line ends, as long as each ends in
@@ -64,6 +97,38 @@ public:
 
 private:
     static constexpr size_t nomask = static_cast<size_t>(-1);
+
+    // Bit i set where data[i] is CR or LF, for 64 bytes.
+    static uint64_t eolmask(const char* data)
+    {
+        uint64_t mask = 0;
+#if defined(__SSE2__) || defined(_M_X64)
+        const __m128i lf = _mm_set1_epi8('\n');
+        const __m128i cr = _mm_set1_epi8('\r');
+        for (int k = 0; k < 4; ++k) {
+            const __m128i v = _mm_loadu_si128(reinterpret_cast<const __m128i*>(data + 16 * k));
+            const int m = _mm_movemask_epi8(_mm_or_si128(_mm_cmpeq_epi8(v, lf), _mm_cmpeq_epi8(v, cr)));
+            mask |= static_cast<uint64_t>(static_cast<uint16_t>(m)) << (16 * k);
+        }
+#else
+        for (int i = 0; i < 64; ++i)
+            if (data[i] == '\n' || data[i] == '\r')
+                mask |= uint64_t{1} << i;
+#endif
+        return mask;
+    }
+    static int lowestbit(uint64_t bits)
+    {
+#if defined(_MSC_VER) && !defined(__clang__)
+        unsigned long bit;
+        _BitScanForward64(&bit, bits);
+        return static_cast<int>(bit);
+#else
+        return __builtin_ctzll(bits);
+#endif
+    }
+
+    bool nextline(std::string_view& line);
 
     size_t findeol(const char* data, size_t from, size_t end);
     size_t readraw(char* dest, size_t max);
