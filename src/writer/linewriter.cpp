@@ -1,5 +1,7 @@
 #include "writer/linewriter.h"
 
+#include "platform/writeback.h"
+
 #include <QSaveFile>
 
 #include <algorithm>
@@ -9,6 +11,9 @@ namespace qm {
 namespace {
 
 constexpr size_t flushsize = 1 << 20;
+// Written bytes are sent on to the disk in steps of this size while the
+// rewrite goes on, rather than all at the commit.
+constexpr int64_t writebackstep = 8 << 20;
 
 writefault& faultstate()
 {
@@ -182,6 +187,10 @@ void linewriter::flush()
             return;
         }
         written_ += n;
+        if (written_ - sentback_ >= writebackstep && file_->flush()) {
+            startwriteback(static_cast<int>(file_->handle()), sentback_, written_ - sentback_);
+            sentback_ = written_;
+        }
     }
     if (full) {
         fail(QStringLiteral("No space left on device"));

@@ -88,7 +88,8 @@ private:
     std::string mem_;
     std::string buf_;
     std::string scratch_;
-    int64_t written_ = 0; // bytes handed to the device
+    int64_t written_ = 0;  // bytes handed to the device
+    int64_t sentback_ = 0; // bytes of them sent on to the disk
     int64_t lines_ = 0;
     bool failed_ = false;
     bool started_ = false;
