@@ -3,6 +3,7 @@
 #include "model/gedcomindex.h"
 #include "platform/scriptedprompts.h"
 #include "settings/settings.h"
+#include "support/censusentries.h"
 
 #include <QLocale>
 
@@ -26,11 +27,7 @@ protected:
         f.reference = QStringLiteral("RG11/4");
         f.sourceid = QStringLiteral("7");
         f.sourcetext = QStringLiteral("John Smith Head 40");
-        selectionrec r;
-        r.id = 1;
-        r.age = QStringLiteral("40");
-        r.personindex = 0;
-        f.selection = {r};
+        f.selection = {qmtest::chosen(1, 0, "", "40")};
     }
     void TearDown() override { QLocale::setDefault(QLocale::c()); }
 
@@ -134,14 +131,8 @@ TEST_F(ValidateEntry, EmptySourceTextIsAskedAbout)
 
 TEST(CheckHousehold, RowsGivenByRecordNumber)
 {
-    auto row = [](int id, const char* age, QChar type = u'Y', int index = 0) {
-        selectionrec r;
-        r.id = id;
-        r.name = QStringLiteral("Smith, John");
-        r.age = QString::fromLatin1(age);
-        r.agetype = type;
-        r.personindex = index;
-        return r;
+    auto row = [](int id, const char* age, char16_t type = u'Y', int index = 0) {
+        return qmtest::chosen(id, index, "Smith, John", age, "", type);
     };
     EXPECT_EQ(checkhousehold({row(1, "40"), row(2, "3", u'M', 1), row(3, "123", u'D', 2)}), QString());
     EXPECT_EQ(checkhousehold({row(9, "4", u'Y', -1)}),

@@ -7,12 +7,15 @@
 #include "platform/clock.h"
 #include "writer/linewriter.h"
 #include "writer/recordwriters.h"
+#include "support/censusentries.h"
 
 #include <QLocale>
 
 #include <gtest/gtest.h>
 
 using namespace qm;
+using qmtest::censusof;
+using qmtest::chosen;
 
 namespace {
 
@@ -39,17 +42,6 @@ std::vector<std::string> multiline(std::string_view text, std::string_view first
     w.openmemory();
     writemultiline(w, text, first, cont);
     return lines(w.memory());
-}
-
-selectionrec who(int32_t id, int32_t personindex, const char* occupation = "")
-{
-    selectionrec s;
-    s.id = id;
-    s.personindex = personindex;
-    s.name = QStringLiteral("Someone");
-    s.age = QStringLiteral("40");
-    s.occupation = QString::fromUtf8(occupation);
-    return s;
 }
 
 struct run {
@@ -114,11 +106,8 @@ TEST_F(RewriteEdges, FirstSourceAndFirstImagesGoBeforeTheirFirstFollowers)
     // before the first submitter record, the images before the first note.
     const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME A\r\n0 @N1@ NOTE x\r\n0 @U1@ SUBM\r\n0 TRLR\r\n";
     rewriterequest r;
-    r.entry.sourceid = QStringLiteral("1");
-    r.entry.title = QStringLiteral("Census 1881 Leeds");
-    r.entry.place = QStringLiteral("Leeds\r\nYorkshire");
-    r.entry.entrydate = QStringLiteral("3 APR 1881");
-    r.entry.selection = {who(1, 0, "-")};
+    r.entry = censusof(QStringLiteral("1"), "Census 1881 Leeds", "Leeds\r\nYorkshire");
+    r.entry.selection = {chosen(1, 0, "Someone", "40", "-")};
     imagechoice img;
     img.objectid = 1;
     img.isnew = true;
@@ -142,9 +131,8 @@ TEST_F(RewriteEdges, TheFirstSharedNoteIsNumberOneAndTheCountersComeBack)
     s.fullentry = false;
     s.sharednote = true;
     rewriterequest r;
-    r.entry.sourceid = QStringLiteral("7");
-    r.entry.entrydate = QStringLiteral("3 APR 1881");
-    r.entry.selection = {who(1, 0)};
+    r.entry = censusof(QStringLiteral("7"), "", "");
+    r.entry.selection = {chosen(1, 0)};
     const run x = rewrite(input, s, r);
     ASSERT_TRUE(x.result.ok);
     EXPECT_EQ(x.result.maxnoteid, 1);
@@ -159,9 +147,8 @@ TEST_F(RewriteEdges, IndentedLinesAreRecognisedAndKept)
 {
     const std::string input = "0 HEAD\r\n  0 @I1@ INDI\r\n\t1 NAME A\r\n  1 CHAN\r\n    2 DATE 1 JAN 2000\r\n  0 TRLR\r\n";
     rewriterequest r;
-    r.entry.sourceid = QStringLiteral("1");
-    r.entry.entrydate = QStringLiteral("3 APR 1881");
-    r.entry.selection = {who(1, 0)};
+    r.entry = censusof(QStringLiteral("1"), "", "");
+    r.entry.selection = {chosen(1, 0)};
     const run x = rewrite(input, settings{}, r);
     ASSERT_TRUE(x.result.ok);
     EXPECT_EQ(x.out[2], "\t1 NAME A");
@@ -174,9 +161,8 @@ TEST_F(RewriteEdges, WhatCannotBeFoundStopsTheRunWithTheFileUntouched)
 {
     const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n0 @S1@ SOUR\r\n0 TRLR\r\n";
     rewriterequest r;
-    r.entry.sourceid = QStringLiteral("2");
-    r.entry.entrydate = QStringLiteral("3 APR 1881");
-    r.entry.selection = {who(1, 0), who(9, -1)};
+    r.entry = censusof(QStringLiteral("2"), "", "");
+    r.entry.selection = {chosen(1, 0), chosen(9, -1)};
     run x = rewrite(input, settings{}, r);
     EXPECT_FALSE(x.result.ok);
     EXPECT_TRUE(x.result.refused);
@@ -203,9 +189,8 @@ TEST_F(RewriteEdges, FlagUseGivesTheFlagOnceAndCountsIt)
     settings s;
     s.flaguse = true;
     rewriterequest r;
-    r.entry.sourceid = QStringLiteral("1");
-    r.entry.entrydate = QStringLiteral("3 APR 1881");
-    r.entry.selection = {who(1, 0), who(2, 1)};
+    r.entry = censusof(QStringLiteral("1"), "", "");
+    r.entry.selection = {chosen(1, 0), chosen(2, 1)};
     run x = rewrite(input, s, r, defs);
     ASSERT_TRUE(x.result.ok);
     EXPECT_EQ(x.result.entryflag, std::optional<size_t>(0));

@@ -5,6 +5,7 @@
 
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
+#include "support/censusentries.h"
 #include "support/goldenfiles.h"
 #include "support/testfiles.h"
 
@@ -15,6 +16,8 @@
 #include <functional>
 
 using namespace qm;
+using qmtest::censusof;
+using qmtest::chosen;
 using qmtest::readfile;
 using qmtest::writefile;
 
@@ -30,35 +33,21 @@ flagtable flagdefs()
     return t;
 }
 
-selectionrec person(int32_t id, const char* name, const char* age, char16_t agetype, const char* occupation)
-{
-    selectionrec r;
-    r.id = id;
-    r.name = QString::fromUtf8(name);
-    r.age = QString::fromUtf8(age);
-    r.agetype = agetype;
-    r.occupation = QString::fromUtf8(occupation);
-    return r;
-}
-
 // The census entry most cases start from: three individuals of family.ged,
 // one with an occupation, one with a one-character occupation, one given
 // birth details whose record is the last before the trailer.
 censusentry baseentry(const gedcomindex& ix)
 {
-    censusentry e;
-    e.sourceid = QString::number(ix.nextsourceid);
-    e.title = QStringLiteral("Census 1881 Leeds RG11/4523/12 (John Smith)");
-    e.place = QStringLiteral("Leeds, Yorkshire");
+    censusentry e = censusof(QString::number(ix.nextsourceid), "Census 1881 Leeds RG11/4523/12 (John Smith)",
+                             "Leeds, Yorkshire");
     e.address = QStringLiteral("12 High Street");
     e.reference = QStringLiteral("RG11/4523/12");
     e.sourcetext = QStringLiteral("John Smith\tHead\t61\r\n\r\nTom Smith\tSon\t9");
     e.notetext = QStringLiteral("Page torn\n");
-    e.entrydate = QStringLiteral("3 APR 1881");
     e.year = 1881;
-    e.selection.push_back(person(1, "Smith, John", "61", u'Y', "Weaver"));
-    e.selection.push_back(person(3, "Smith, Tom", "9", u'Y', "-"));
-    selectionrec ann = person(4, "Lee, Ann", "3", u'M', "");
+    e.selection.push_back(chosen(1, -1, "Smith, John", "61", "Weaver"));
+    e.selection.push_back(chosen(3, -1, "Smith, Tom", "9", "-"));
+    selectionrec ann = chosen(4, -1, "Lee, Ann", "3", "", u'M');
     ann.birthedited = true;
     ann.birthdate = QStringLiteral("1880 ");
     ann.birthplace = QStringLiteral(" Leeds");
@@ -157,9 +146,7 @@ const goldencase goldencases[] = {
          s.flaguse = true;
          r.entry = baseentry(ix);
          r.entry.selection.pop_back();
-         selectionrec mary = person(2, "Renee, Mary", "30", u'Y', "Weaver");
-         mary.personindex = 1;
-         r.entry.selection.push_back(mary);
+         r.entry.selection.push_back(chosen(2, 1, "Renee, Mary", "30", "Weaver"));
      }},
     {"attachimages", "family.ged",
      [](const gedcomindex&, settings&, rewriterequest& r) {
@@ -191,28 +178,20 @@ const goldencase goldencases[] = {
      [](const gedcomindex&, settings&, rewriterequest& r) {
          // The anchor source (S4) is missing and the file has no trailer:
          // the new source goes at the end, after the last individual's block.
-         r.entry.sourceid = QStringLiteral("5");
-         r.entry.title = QStringLiteral("Census 1881 Leeds (Jane Doe)");
-         r.entry.place = QStringLiteral("Leeds");
-         r.entry.entrydate = QStringLiteral("3 APR 1881");
+         r.entry = censusof(QStringLiteral("5"), "Census 1881 Leeds (Jane Doe)", "Leeds");
          r.entry.sourcetext = QString::fromUtf8("Jane Doe\tHead\t40\tZo\xC3\xAB's mother");
-         r.entry.selection.push_back(person(1, "Doe, Jane", "40", u'Y', "Laundress"));
-         r.entry.selection.back().personindex = 0;
+         r.entry.selection.push_back(chosen(1, 0, "Doe, Jane", "40", "Laundress"));
          r.entry.chosenimages = {image(1, "jpg", "Leeds p1", true)};
      }},
     {"notrlr_sharednote", "notrlr.ged",
      [](const gedcomindex&, settings& s, rewriterequest& r) {
          s.fullentry = false;
          s.sharednote = true;
-         r.entry.sourceid = QStringLiteral("1");
-         r.entry.title = QStringLiteral("Census 1881 Leeds");
-         r.entry.place = QStringLiteral("Leeds");
+         r.entry = censusof(QStringLiteral("1"), "Census 1881 Leeds", "Leeds");
          r.entry.reference = QStringLiteral("Folio 3");
-         r.entry.entrydate = QStringLiteral("3 APR 1881");
          r.entry.sourcetext = QStringLiteral("Jane Doe\r\n");
          r.entry.notetext = QStringLiteral("Faint");
-         r.entry.selection.push_back(person(1, "Doe, Jane", "40", u'Y', ""));
-         r.entry.selection.back().personindex = 0;
+         r.entry.selection.push_back(chosen(1, 0, "Doe, Jane", "40"));
      }},
 };
 

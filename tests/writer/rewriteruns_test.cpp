@@ -6,23 +6,14 @@
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
 #include "platform/linereader.h"
+#include "support/censusentries.h"
 
 #include <gtest/gtest.h>
 
 using namespace qm;
+using qmtest::chosen;
 
 namespace {
-
-selectionrec who(int32_t id, int32_t personindex, const char* occupation = "")
-{
-    selectionrec s;
-    s.id = id;
-    s.personindex = personindex;
-    s.name = QStringLiteral("Someone");
-    s.age = QStringLiteral("40");
-    s.occupation = QString::fromUtf8(occupation);
-    return s;
-}
 
 // The same lines, each ending in LF.
 std::string lfform(const std::string& bytes)
@@ -61,11 +52,8 @@ TEST(RewriteRuns, CrLfFileGivesTheSameBytesAsItsLfForm)
     ASSERT_GT(crlf.size(), 2u << 20);
 
     rewriterequest r;
-    r.entry.sourceid = QStringLiteral("2");
-    r.entry.title = QStringLiteral("Census 1891");
-    r.entry.place = QStringLiteral("Leeds");
-    r.entry.entrydate = QStringLiteral("5 APR 1891");
-    r.entry.selection = {who(5, 4, "Weaver"), who(19999, 19998)};
+    r.entry = qmtest::censusof(QStringLiteral("2"), "Census 1891", "Leeds", "5 APR 1891");
+    r.entry.selection = {chosen(5, 4, "Someone", "40", "Weaver"), chosen(19999, 19998)};
     std::string a, b;
     const rewriteresult ra = rewrite(crlf, r, a);
     const rewriteresult rb = rewrite(lfform(crlf), r, b);

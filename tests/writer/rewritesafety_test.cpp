@@ -6,6 +6,7 @@
 
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
+#include "support/censusentries.h"
 #include "support/goldenfiles.h"
 #include "support/testfiles.h"
 #include "writer/linewriter.h"
@@ -65,18 +66,9 @@ std::string encoded(const std::string& utf8, textencoding enc, bool bom)
 rewriterequest entry(const gedcomindex& ix)
 {
     rewriterequest r;
-    r.entry.sourceid = QString::number(ix.nextsourceid);
-    r.entry.title = QStringLiteral("Census 1881 Haworth");
-    r.entry.place = QStringLiteral("Haworth");
-    r.entry.entrydate = QStringLiteral("3 APR 1881");
+    r.entry = qmtest::censusof(QString::number(ix.nextsourceid), "Census 1881 Haworth", "Haworth");
     r.entry.sourcetext = QString::fromUtf8("Zo\xC3\xAB Bront\xC3\xAB\tHead");
-    selectionrec p;
-    p.id = 1;
-    p.name = QStringLiteral("Bronte, Zoe");
-    p.age = QStringLiteral("30");
-    p.occupation = QString::fromUtf8("Cur\xC3\xA9");
-    p.personindex = 0;
-    r.entry.selection.push_back(p);
+    r.entry.selection.push_back(qmtest::chosen(1, 0, "Bronte, Zoe", "30", "Cur\xC3\xA9"));
     return r;
 }
 

@@ -4,6 +4,7 @@
 #include "model/gedcomindex.h"
 #include "platform/clock.h"
 #include "settings/settings.h"
+#include "support/censusentries.h"
 #include "support/testfiles.h"
 #include "writer/linewriter.h"
 
@@ -66,22 +67,12 @@ protected:
         s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
         s.keeplog = true;
 
-        entry = censusentry();
-        entry.sourceid = QStringLiteral("2");
-        entry.title = QStringLiteral("Census 1851 Leeds HO107/2319 (John Smith)");
-        entry.place = QStringLiteral("Leeds, Yorkshire");
+        entry = qmtest::censusof(QStringLiteral("2"), "Census 1851 Leeds HO107/2319 (John Smith)", "Leeds, Yorkshire",
+                                 "30 MAR 1851");
         entry.reference = QStringLiteral("HO107/2319");
         entry.sourcetext = QStringLiteral("John Smith Head 40\r\nMary Smith Wife 38");
-        entry.entrydate = QStringLiteral("30 MAR 1851");
         entry.year = 1851;
-        for (int id : {1, 2}) {
-            selectionrec r;
-            r.id = id;
-            r.name = id == 1 ? QStringLiteral("Smith, John") : QStringLiteral("Smith, Mary");
-            r.age = id == 1 ? QStringLiteral("40") : QStringLiteral("38");
-            r.personindex = id - 1;
-            entry.selection.push_back(r);
-        }
+        entry.selection = {qmtest::chosen(1, 0, "Smith, John", "40"), qmtest::chosen(2, 1, "Smith, Mary", "38")};
     }
 
     QStringList backups() const { return QDir(s.backupfolder).entryList(QDir::Files); }
