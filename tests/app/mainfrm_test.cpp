@@ -21,9 +21,7 @@
 #include <QLineEdit>
 #include <QListView>
 #include <QPlainTextEdit>
-#include <QProcess>
 #include <QPushButton>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QToolButton>
 
@@ -34,59 +32,21 @@ class mainfrm_test : public QObject {
     Q_OBJECT
 
 private:
-    QTemporaryDir dir_;
-    int runs_ = 0;
-
-    QString sample()
-    {
-        const QString to = dir_.filePath(QStringLiteral("sample%1.ged").arg(++runs_));
-        QFile::copy(qmtest::samplefile(), to);
-        QFile(to).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-        return to;
-    }
-    QString ini() { return dir_.filePath(QStringLiteral("settings%1.ini").arg(++runs_)); }
-
-    // A window started on `file` from the command line, the default-file
-    // question answered No; shown, so that lists can be clicked.
-    std::unique_ptr<session> opened(const QString& file, const settings* s = nullptr)
-    {
-        auto r = std::make_unique<session>(ini());
-        if (s)
-            savesettings(*r->store, *s);
-        r->make();
-        r->prompts.expect(answer::no, QStringLiteral("by default"));
-        if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
-            return nullptr;
-        r->w->show();
-        if (!QTest::qWaitForWindowExposed(r->w.get()))
-            return nullptr;
-        return r;
-    }
-
-    QString generated(int individuals)
-    {
-        const QString out = dir_.filePath(QStringLiteral("gen%1.ged").arg(individuals));
-        if (QFile::exists(out))
-            return out;
-        const int rc = QProcess::execute(QStringLiteral("python3"),
-                                         {QStringLiteral(QM_GENERATOR), QStringLiteral("--individuals"),
-                                          QString::number(individuals), QStringLiteral("-o"), out});
-        return rc == 0 ? out : QString();
-    }
+    windowfiles files_;
 
 private slots:
-    void initTestCase() { QVERIFY(dir_.isValid()); }
+    void initTestCase() { QVERIFY(files_.valid()); }
 
     void startfromcommandline()
     {
-        const QString file = sample();
-        auto s = opened(file);
+        const QString file = files_.sample();
+        auto s = files_.opened(file);
         QVERIFY(s);
         QCOMPARE(s->w->index()->people.size(), size_t(40));
         QVERIFY(s->w->windowTitle().endsWith(QStringLiteral(" - ") + QFileInfo(file).fileName()));
         QVERIFY(s->w->windowTitle().startsWith(QStringLiteral("Quillmark v")));
         QCOMPARE(s->read("Recent Files  1"), file);
-        QCOMPARE(s->read("Gedcom Folder"), dir_.path() + QLatin1Char('/'));
+        QCOMPARE(s->read("Gedcom Folder"), files_.path() + QLatin1Char('/'));
         QCOMPARE(s->read("Default File"), QString());
         QCOMPARE(peoplelist(*s->w)->model()->rowCount(), 40);
         QVERIFY(s->w->findChild<QCheckBox*>(QStringLiteral("allpeoplechk"))->isChecked());
@@ -113,7 +73,7 @@ private slots:
 
     void clearallandopenanother()
     {
-        auto s = opened(sample());
+        auto s = files_.opened(files_.sample());
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1881"));
@@ -144,8 +104,8 @@ private slots:
 
     void startfromdefaultfileandfromdialog()
     {
-        const QString file = sample();
-        const QString settingsfile = ini();
+        const QString file = files_.sample();
+        const QString settingsfile = files_.ini();
         {
             // No default: the Open dialog; Yes makes the file the default.
             session s(settingsfile);
@@ -170,7 +130,7 @@ private slots:
             session s(settingsfile);
             s.make();
             s.prompts.expect(answer::ok, QStringLiteral("The file selected does not exist. Please try again."));
-            QVERIFY(s.w->start({dir_.filePath(QStringLiteral("gone.ged"))}));
+            QVERIFY(s.w->start({files_.filepath(QStringLiteral("gone.ged"))}));
             QCOMPARE(s.w->gedcomfile(), file);
             QCOMPARE(s.read("Default File"), file);
             QCOMPARE(s.prompts.unexpected(), 0);
@@ -191,15 +151,15 @@ private slots:
     void recentfilesmenu()
     {
         // Paths longer than 40 characters.
-        const QString folder = dir_.filePath(QStringLiteral("a folder with a rather long name"));
+        const QString folder = files_.filepath(QStringLiteral("a folder with a rather long name"));
         QVERIFY(QDir().mkpath(folder));
         QStringList files;
         for (const char* n : {"a.ged", "b.ged", "c.ged"}) {
             files << QDir(folder).filePath(QString::fromLatin1(n));
-            QVERIFY(QFile::copy(sample(), files.back()));
+            QVERIFY(QFile::copy(files_.sample(), files.back()));
         }
         const QString a = files[0], b = files[1], c = files[2];
-        auto s = opened(a);
+        auto s = files_.opened(a);
         QVERIFY(s);
         QAction* open = s->w->findChild<QAction*>(QStringLiteral("openmen"));
         // "File Open Default" is on: every file opened asks about the default.
@@ -236,7 +196,7 @@ private slots:
 
     void chooseyearandindividuals()
     {
-        auto s = opened(sample());
+        auto s = files_.opened(files_.sample());
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1881"));
@@ -321,7 +281,7 @@ private slots:
         // Ireland 1911: nobody in the sample has a census event then.
         settings ireland = defaultsettings();
         ireland.country = QStringLiteral("Ireland");
-        auto s = opened(sample(), &ireland);
+        auto s = files_.opened(files_.sample(), &ireland);
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1911"));
@@ -371,7 +331,7 @@ private slots:
         QVERIFY(w.close());
 
         // Deleting the only row empties the family list and disables Auto Text.
-        auto one = opened(sample());
+        auto one = files_.opened(files_.sample());
         mainfrm& v = *one->w;
         chooseyear(v, QStringLiteral("1881"));
         clickid(v, peoplelist(v), 11);
@@ -387,7 +347,7 @@ private slots:
 
     void couldbealivelist()
     {
-        auto s = opened(sample());
+        auto s = files_.opened(files_.sample());
         QVERIFY(s);
         mainfrm& w = *s->w;
         QCheckBox* all = w.findChild<QCheckBox*>(QStringLiteral("allpeoplechk"));
@@ -412,17 +372,17 @@ private slots:
 
     void peoplelistlimit()
     {
-        const QString full = generated(32000);
-        const QString over = generated(32001);
+        const QString full = files_.generated(32000);
+        const QString over = files_.generated(32001);
         if (full.isEmpty() || over.isEmpty())
             QSKIP("the family file generator did not run");
-        auto s = opened(full);
+        auto s = files_.opened(full);
         QVERIFY(s);
         QCOMPARE(peoplelist(*s->w)->model()->rowCount(), 32000);
         QVERIFY(peoplelist(*s->w)->isVisible());
         QVERIFY(s->w->findChild<QPushButton*>(QStringLiteral("findbut"))->isEnabled());
 
-        auto t = opened(over);
+        auto t = files_.opened(over);
         QVERIFY(t);
         mainfrm& w = *t->w;
         QCheckBox* all = w.findChild<QCheckBox*>(QStringLiteral("allpeoplechk"));
@@ -446,17 +406,16 @@ private slots:
 
     void reloadafteroutsidechange()
     {
-        const QString file = sample();
-        auto s = opened(file);
+        const QString file = files_.sample();
+        auto s = files_.opened(file);
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1881"));
         w.panel()->locationtxt->setText(QStringLiteral("Hebden Bridge"));
         clickid(w, peoplelist(w), 27);
-        QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[0], QStringLiteral("26"));
+        typerow(w, 0, QStringLiteral("26"));
         clickid(w, peoplelist(w), 29);
-        QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[1], QStringLiteral("1"));
-        rowcontrols<QLineEdit>(w, "agetypetxt")[1]->setText(QStringLiteral("M"));
+        typerow(w, 1, QStringLiteral("1"), QStringLiteral("M"));
 
         // Coming back without a change does nothing.
         w.checkonactivate();
@@ -509,11 +468,11 @@ private slots:
         const QString dir = qEnvironmentVariable("QM_BENCH_DIR", QStringLiteral("/work/gen"));
         QElapsedTimer t;
         t.start();
-        auto s = opened(dir + QStringLiteral("/fam30000.ged"));
+        auto s = files_.opened(dir + QStringLiteral("/fam30000.ged"));
         QVERIFY(s);
         qInfo("open 30,000 until the people list is filled: %lld ms (%d listed)", t.elapsed(),
               peoplelist(*s->w)->model()->rowCount());
-        auto b = opened(dir + QStringLiteral("/fam100000.ged"));
+        auto b = files_.opened(dir + QStringLiteral("/fam100000.ged"));
         QVERIFY(b);
         t.restart();
         chooseyear(*b->w, QStringLiteral("1881"));
@@ -529,7 +488,7 @@ private slots:
         const QString out = qEnvironmentVariable("QM_SCREENSHOT");
         if (out.isEmpty())
             QSKIP("QM_SCREENSHOT names no file");
-        auto s = opened(sample());
+        auto s = files_.opened(files_.sample());
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1881"));
@@ -545,9 +504,8 @@ private slots:
         } household[] = {{11, "28", "Fustian Cutter"}, {27, "26", ""}, {28, "2", ""}};
         for (const auto& h : household) {
             clickid(w, peoplelist(w), h.id);
-            const int r = w.household().selectioncount - 1;
-            QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[r], QString::fromLatin1(h.age));
-            QTest::keyClicks(rowcontrols<QLineEdit>(w, "occtxt")[r], QString::fromLatin1(h.occupation));
+            typerow(w, w.household().selectioncount - 1, QString::fromLatin1(h.age), QString(),
+                    QString::fromLatin1(h.occupation));
         }
         QTest::keyClicks(w.panel()->texttxt, QStringLiteral("William Ashworth\tHead\tMar\t28\tFustian Cutter"));
         w.panel()->texttxt->setPlainText(w.panel()->texttxt->toPlainText());

@@ -17,12 +17,10 @@
 #include <QDir>
 #include <QLineEdit>
 #include <QPlainTextEdit>
-#include <QProcess>
 #include <QRegularExpression>
 #include <QPushButton>
 #include <QSplitter>
 #include <QSplitterHandle>
-#include <QTemporaryDir>
 #include <QTest>
 #include <QTextCursor>
 
@@ -120,16 +118,6 @@ QStringList signed_(const QString& sign, const QStringList& lines)
     return out;
 }
 
-// Types into the age, unit and occupation boxes of the census row r.
-void typerow(mainfrm& w, int r, const QString& age, const QString& unit = QString(),
-             const QString& occupation = QString())
-{
-    QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[r], age);
-    if (!unit.isEmpty())
-        rowcontrols<QLineEdit>(w, "agetypetxt")[r]->setText(unit);
-    QTest::keyClicks(rowcontrols<QLineEdit>(w, "occtxt")[r], occupation);
-}
-
 QPushButton* button(mainfrm& w, const char* name)
 {
     return w.findChild<QPushButton*>(QString::fromLatin1(name));
@@ -141,43 +129,41 @@ class saveentryfrm_test : public QObject {
     Q_OBJECT
 
 private:
-    QTemporaryDir dir_;
-    int runs_ = 0;
-
-    QString sample()
-    {
-        const QString to = dir_.filePath(QStringLiteral("sample%1.ged").arg(++runs_));
-        QFile::copy(qmtest::samplefile(), to);
-        QFile(to).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-        return to;
-    }
+    windowfiles files_;
 
     // Settings of one run: backups and the log in a folder of their own.
     settings testsettings()
     {
         settings s = defaultsettings();
-        const QString folder = dir_.filePath(QStringLiteral("run%1").arg(++runs_));
+        const QString folder = files_.filepath(QStringLiteral("run%1").arg(++runs_));
         QDir().mkpath(folder + QStringLiteral("/backups"));
         s.backupfolder = folder + QStringLiteral("/backups");
         s.logpath = folder + QStringLiteral("/censuslog.txt");
         return s;
     }
+    int runs_ = 0;
 
-    // A window started on `file` from the command line with settings s, the
-    // default-file question answered No; shown, so that lists can be clicked.
-    std::unique_ptr<session> opened(const QString& file, const settings& s)
+    std::unique_ptr<session> opened(const QString& file, const settings& s) { return files_.opened(file, &s); }
+
+    // The sample opened with settings s and an 1881 entry at Hebden Bridge
+    // typed: the individual `id` aged `age` in the first row, and the source
+    // text when given.
+    std::unique_ptr<session> typedentry(const QString& file, const settings& s, int32_t id, const char* age,
+                                        const QString& text = QString())
     {
-        auto r = std::make_unique<session>(dir_.filePath(QStringLiteral("settings%1.ini").arg(++runs_)));
-        savesettings(*r->store, s);
-        saveflagsettings(*r->store, s);
-        r->make();
-        r->prompts.expect(answer::no, QStringLiteral("by default"));
-        if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
+        auto run = opened(file, s);
+        if (!run)
             return nullptr;
-        r->w->show();
-        if (!QTest::qWaitForWindowExposed(r->w.get()))
-            return nullptr;
-        return r;
+        mainfrm& w = *run->w;
+        entrypanel* p = w.panel();
+        chooseyear(w, QStringLiteral("1881"));
+        p->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
+        p->referencetxt->setText(QStringLiteral("RG11/4426/52"));
+        if (!text.isEmpty())
+            p->texttxt->setPlainText(text);
+        clickid(w, peoplelist(w), id);
+        typerow(w, 0, QString::fromLatin1(age));
+        return run;
     }
 
     static QStringList backups(const settings& s) { return QDir(s.backupfolder).entryList(QDir::Files); }
@@ -185,7 +171,7 @@ private:
 private slots:
     void initTestCase()
     {
-        QVERIFY(dir_.isValid());
+        QVERIFY(files_.valid());
         setclockfortests(QDateTime(QDate(2026, 12, 4), QTime(13, 5, 9)));
     }
     void cleanupTestCase() { setclockfortests(QDateTime()); }
@@ -194,7 +180,7 @@ private slots:
     // census source, typed as a user would.
     void fullentry()
     {
-        const QString file = sample();
+        const QString file = files_.sample();
         const QStringList before = filelines(file);
         const settings s = testsettings();
         auto run = opened(file, s);
@@ -300,7 +286,7 @@ private slots:
     // Method 2: the entry cites an existing census source.
     void existingsource()
     {
-        const QString file = sample();
+        const QString file = files_.sample();
         const QStringList before = filelines(file);
         settings s = testsettings();
         s.fullentry = false;
@@ -375,7 +361,7 @@ private slots:
     // The save's checks, each in its turn, with nothing written.
     void checksintheirorder()
     {
-        const QString file = sample();
+        const QString file = files_.sample();
         const std::string bytes = readfile(file);
         const settings s = testsettings();
         auto run = opened(file, s);
@@ -452,7 +438,7 @@ private slots:
         // Citing an existing source: the where-within-source text and the source.
         settings cite = testsettings();
         cite.fullentry = false;
-        auto other = opened(sample(), cite);
+        auto other = opened(files_.sample(), cite);
         QVERIFY(other);
         mainfrm& v = *other->w;
         entrypanel* q = v.panel();
@@ -476,21 +462,16 @@ private slots:
     // writes the calculated birth event.
     void birthdetailsaskedandwritten()
     {
-        const QString file = sample();
+        const QString file = files_.sample();
         QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/\r\n1 SEX M\r\n1 BIRT\r\n2 DATE 1879\r\n2 PLAC Hebden Bridge, "
                                     "Yorkshire, England\r\n",
                               "1 NAME John /Ashworth/\r\n1 SEX M\r\n"));
         const QStringList before = filelines(file);
         const settings s = testsettings();
-        auto run = opened(file, s);
+        auto run = typedentry(file, s, 11, "28");
         QVERIFY(run);
         mainfrm& w = *run->w;
         entrypanel* p = w.panel();
-        chooseyear(w, QStringLiteral("1881"));
-        p->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
-        p->referencetxt->setText(QStringLiteral("RG11/4426/52"));
-        clickid(w, peoplelist(w), 11);
-        typerow(w, 0, QStringLiteral("28"));
         clickid(w, familylist(w), 28);
         typerow(w, 1, QStringLiteral("2"));
 
@@ -545,18 +526,12 @@ private slots:
     // is written, the file is read again and the entry stays to be saved.
     void outsidechangestopsthesave()
     {
-        const QString file = sample();
+        const QString file = files_.sample();
         const settings s = testsettings();
-        auto run = opened(file, s);
+        auto run = typedentry(file, s, 27, "26", QStringLiteral("Agnes Ashworth\tHead"));
         QVERIFY(run);
         mainfrm& w = *run->w;
         entrypanel* p = w.panel();
-        chooseyear(w, QStringLiteral("1881"));
-        p->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
-        p->referencetxt->setText(QStringLiteral("RG11/4426/52"));
-        p->texttxt->setPlainText(QStringLiteral("Agnes Ashworth\tHead"));
-        clickid(w, peoplelist(w), 27);
-        typerow(w, 0, QStringLiteral("26"));
 
         QVERIFY(replaceinfile(file, QStringLiteral("1 NAME Agnes /Schröder/").toUtf8(), "1 NAME Agnes /Schroeder/"));
         const std::string changed = readfile(file);
@@ -590,7 +565,7 @@ private slots:
         settings s = testsettings();
         s.marriagecondition = true;
         s.occscholar = false;
-        auto run = opened(sample(), s);
+        auto run = opened(files_.sample(), s);
         QVERIFY(run);
         mainfrm& w = *run->w;
         entrypanel* p = w.panel();
@@ -642,7 +617,7 @@ private slots:
     void texteditoranddivider()
     {
         const settings s = testsettings();
-        auto run = opened(sample(), s);
+        auto run = opened(files_.sample(), s);
         QVERIFY(run);
         mainfrm& w = *run->w;
         entrypanel* p = w.panel();
@@ -720,19 +695,12 @@ private slots:
     // program ends.
     void failedrewriteendstheprogram()
     {
-        const QString file = sample();
+        const QString file = files_.sample();
         const std::string bytes = readfile(file);
         const settings s = testsettings();
-        auto run = opened(file, s);
+        auto run = typedentry(file, s, 11, "28", QStringLiteral("William Ashworth"));
         QVERIFY(run);
         mainfrm& w = *run->w;
-        entrypanel* p = w.panel();
-        chooseyear(w, QStringLiteral("1881"));
-        p->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
-        p->referencetxt->setText(QStringLiteral("RG11/4426/52"));
-        p->texttxt->setPlainText(QStringLiteral("William Ashworth"));
-        clickid(w, peoplelist(w), 11);
-        typerow(w, 0, QStringLiteral("28"));
         setinputfaultfortests(true);
         run->prompts.expect(answer::ok, QStringLiteral("program will close"));
         button(w, "addbut")->click();
@@ -747,11 +715,8 @@ private slots:
     // A generated family file: the entry is saved among thousands of records.
     void generatedfile()
     {
-        const QString file = dir_.filePath(QStringLiteral("generated.ged"));
-        const int rc = QProcess::execute(QStringLiteral("python3"),
-                                         {QStringLiteral(QM_GENERATOR), QStringLiteral("--individuals"),
-                                          QStringLiteral("3000"), QStringLiteral("-o"), file});
-        if (rc != 0)
+        const QString file = files_.generated(3000);
+        if (file.isEmpty())
             QSKIP("the family file generator did not run");
         const QStringList before = filelines(file);
         settings s = testsettings();

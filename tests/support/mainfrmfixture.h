@@ -13,14 +13,19 @@
 #include "census/peoplelist_ui.h"
 #include "platform/scriptedprompts.h"
 #include "platform/settingsstore.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
 
 #include <QApplication>
 #include <QComboBox>
 #include <QDialog>
 #include <QFile>
 #include <QLabel>
+#include <QLineEdit>
 #include <QListView>
 #include <QPointer>
+#include <QProcess>
+#include <QTemporaryDir>
 #include <QTest>
 #include <QTimer>
 
@@ -40,6 +45,47 @@ struct session {
 
     void make() { w = std::make_unique<qm::mainfrm>(prompts, *store); }
     QString read(const char* name) const { return store->read(QString::fromLatin1(name)).value_or(QString()); }
+};
+
+// Files of one window test program: copies of the sample, settings files and
+// generated family files in a temporary folder, and windows started on them.
+class windowfiles {
+public:
+    bool valid() const { return dir_.isValid(); }
+    QString path() const { return dir_.path(); }
+    QString filepath(const QString& name) const { return dir_.filePath(name); }
+
+    // A writable copy of the bundled sample.
+    QString sample()
+    {
+        const QString to = dir_.filePath(QStringLiteral("sample%1.ged").arg(++runs_));
+        QFile::copy(samplefile(), to);
+        QFile(to).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+        return to;
+    }
+    QString ini() { return dir_.filePath(QStringLiteral("settings%1.ini").arg(++runs_)); }
+
+    // A family file of this many individuals from the generator ("" when it
+    // did not run), made once.
+    QString generated(int individuals)
+    {
+        const QString out = dir_.filePath(QStringLiteral("gen%1.ged").arg(individuals));
+        if (QFile::exists(out))
+            return out;
+        const int rc = QProcess::execute(QStringLiteral("python3"),
+                                         {QStringLiteral(QM_GENERATOR), QStringLiteral("--individuals"),
+                                          QString::number(individuals), QStringLiteral("-o"), out});
+        return rc == 0 ? out : QString();
+    }
+
+    // A window started on `file` from the command line (with settings s when
+    // given), the default-file question answered No; shown, so that lists can
+    // be clicked.
+    std::unique_ptr<session> opened(const QString& file, const qm::settings* s = nullptr);
+
+private:
+    QTemporaryDir dir_;
+    int runs_ = 0;
 };
 
 template <class T>
@@ -100,6 +146,33 @@ inline QStringList shownnames(qm::mainfrm& w)
     while (!out.isEmpty() && out.back().isEmpty())
         out.removeLast();
     return out;
+}
+
+inline std::unique_ptr<session> windowfiles::opened(const QString& file, const qm::settings* s)
+{
+    auto r = std::make_unique<session>(ini());
+    if (s) {
+        qm::savesettings(*r->store, *s);
+        qm::saveflagsettings(*r->store, *s);
+    }
+    r->make();
+    r->prompts.expect(qm::answer::no, QStringLiteral("by default"));
+    if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
+        return nullptr;
+    r->w->show();
+    if (!QTest::qWaitForWindowExposed(r->w.get()))
+        return nullptr;
+    return r;
+}
+
+// Types into the age, unit and occupation boxes of the census row r.
+inline void typerow(qm::mainfrm& w, int r, const QString& age, const QString& unit = QString(),
+                    const QString& occupation = QString())
+{
+    QTest::keyClicks(rowcontrols<QLineEdit>(w, "agetxt")[r], age);
+    if (!unit.isEmpty())
+        rowcontrols<QLineEdit>(w, "agetypetxt")[r]->setText(unit);
+    QTest::keyClicks(rowcontrols<QLineEdit>(w, "occtxt")[r], occupation);
 }
 
 inline bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
