@@ -310,18 +310,7 @@ int cliaddentry(QStringList args)
         form.title = qs(ix.sources[static_cast<size_t>(sourcepos)].title);
     }
 
-    censusentry entry;
-    entry.sourceid = form.sourceid;
-    entry.title = form.title;
-    entry.place = form.place;
-    entry.address = form.address;
-    entry.reference = form.reference.trimmed();
-    entry.sourcetext = form.sourcetext;
-    entry.notetext = form.notetext;
-    entry.other = form.other;
-    entry.entrydate = check.entrydate;
-    entry.year = census ? census->year : 0;
-    entry.selection = form.selection;
+    censusentry entry = entryfromform(form, check.entrydate);
     // Birth details as the birth details dialog gives them: only to individuals
     // with neither birth date nor birth place in the file.
     for (size_t k = 0; k < e.people.size(); ++k) {

@@ -204,17 +204,8 @@ entryform mainfrm::currentform() const
 
 censusentry mainfrm::gatherentry(const entryform& form, const QString& entrydate) const
 {
-    censusentry e;
-    e.sourceid = form.sourceid.trimmed();
-    e.title = form.title;
-    e.place = form.place;
-    e.address = form.address;
-    e.reference = form.reference.trimmed();
-    e.sourcetext = form.sourcetext;
-    e.notetext = form.notetext;
-    e.other = form.other;
-    e.entrydate = entrydate;
-    e.year = form.yeartext.toInt();
+    // The rows as they are now: birth details asked during the save are in them.
+    censusentry e = entryfromform(form, entrydate);
     e.selection = currentselection();
     return e;
 }

@@ -111,4 +111,21 @@ QString notcensussourcemessage(const QString& sourceid)
     return QStringLiteral("The source number %1 is not a census source of the family file").arg(sourceid);
 }
 
+censusentry entryfromform(const entryform& form, const QString& entrydate)
+{
+    censusentry e;
+    e.sourceid = form.sourceid.trimmed();
+    e.title = form.title;
+    e.place = form.place;
+    e.address = form.address;
+    e.reference = form.reference.trimmed();
+    e.sourcetext = form.sourcetext;
+    e.notetext = form.notetext;
+    e.other = form.other;
+    e.entrydate = entrydate;
+    e.year = form.yeartext.toInt();
+    e.selection = form.selection;
+    return e;
+}
+
 } // namespace qm

@@ -62,4 +62,8 @@ QString checkhousehold(const std::vector<selectionrec>& selection);
 int findcensussource(const gedcomindex& index, const QString& sourceid);
 QString notcensussourcemessage(const QString& sourceid);
 
+// The entry the rewrite is given for a form that passed the checks, dated
+// `entrydate` (the census date as the checks wrote it).
+censusentry entryfromform(const entryform& form, const QString& entrydate);
+
 } // namespace qm
