@@ -103,68 +103,46 @@ TEST(Completedyears, CountsWholeYears)
     EXPECT_EQ(completedyears(d(1883, 5, 1), d(1881, 4, 3)), -2);
 }
 
-TEST(Datephrase, PlainDatesAndTheirAges)
+TEST(Datephrase, PhrasesAndAges)
 {
-    auto r = datephrase(u"3 MAR 1851", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "on 3 Mar 1851");
-    EXPECT_TRUE(r.agecomputed);
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 30");
-    EXPECT_EQ(r.earliestyear, 1851);
-    EXPECT_EQ(r.latestyear, 1851);
-
-    // Born on 31 or on 1 March: 30 either way, so one age.
-    r = datephrase(u"MAR 1851", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "in Mar 1851");
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 30");
-
-    r = datephrase(u"1851", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "in 1851");
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 29 or 30");
-
-    r = datephrase(u"  12 apr 1851 ", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "on 12 Apr 1851");
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 29");
-}
-
-TEST(Datephrase, MonthYearLatestDayIsTheMonthsLast)
-{
-    // 29 FEB 1852 turns 29 on census day 1 MAR 1881; 1 FEB 1852 already has.
-    const std::optional<QDate> census = d(1881, 2, 29 - 1);
-    auto r = datephrase(u"FEB 1852", census, dateorder::dmy);
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 28 or 29");
-    r = datephrase(u"FEB 1852", d(1881, 3, 1), dateorder::dmy);
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 29");
-    r = datephrase(u"FEB 1851", d(1880, 2, 28), dateorder::dmy);
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 29"); // 28 days in 1851
-    r = datephrase(u"APR 1851", d(1881, 4, 30), dateorder::dmy);
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 30");
-}
-
-TEST(Datephrase, Qualifiers)
-{
-    auto r = datephrase(u"BET 1850 AND 1852", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "between 1850 and 1852");
-    EXPECT_FALSE(r.agecomputed);
-    EXPECT_EQ(r.agephrase, "");
-    EXPECT_EQ(r.earliestyear, -9999);
-
-    EXPECT_EQ(datephrase(u"aft 1851", census1881, dateorder::dmy).phrase, "after 1851");
-    EXPECT_EQ(datephrase(u"BEF 3 MAR 1851", census1881, dateorder::dmy).phrase, "before 3 Mar 1851");
-    EXPECT_EQ(datephrase(u"FROM 1850 TO 1852", census1881, dateorder::dmy).phrase,
-              "during a period from 1850 To 1852");
-    EXPECT_EQ(datephrase(u"TO 1852", census1881, dateorder::dmy).phrase, "during a period to 1852");
-    EXPECT_FALSE(datephrase(u"BEF 3 MAR 1851", census1881, dateorder::dmy).agecomputed);
-
-    r = datephrase(u"ABT 1851", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "in 1851 (approx.)");
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 29 or 30 (approx.)");
-    r = datephrase(u"EST 3 MAR 1851", census1881, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "on 3 Mar 1851 (estimated)");
-    EXPECT_EQ(r.agephrase, " and in this census would be aged 30 (estimated)");
-    r = datephrase(u"CAL MAR 1851", std::nullopt, dateorder::dmy);
-    EXPECT_EQ(r.phrase, "in Mar 1851 (calculated)");
-    EXPECT_EQ(r.agephrase, "");
-    EXPECT_EQ(datephrase(u"ABT", census1881, dateorder::dmy).phrase, "in (approx.)");
+    const std::optional<QDate> none;
+    const struct {
+        const char* text;
+        std::optional<QDate> census;
+        const char* phrase;
+        const char* age; // "" when no age is given
+    } cases[] = {
+        {"3 MAR 1851", census1881, "on 3 Mar 1851", "30"},
+        {"MAR 1851", census1881, "in Mar 1851", "30"}, // born on 1 or on 31 March: 30 either way
+        {"1851", census1881, "in 1851", "29 or 30"},
+        {"  12 apr 1851 ", census1881, "on 12 Apr 1851", "29"},
+        // A month's latest day is its last: 29 FEB 1852 turns 29 on 1 MAR 1881.
+        {"FEB 1852", d(1881, 2, 28), "in Feb 1852", "28 or 29"},
+        {"FEB 1852", d(1881, 3, 1), "in Feb 1852", "29"},
+        {"FEB 1851", d(1880, 2, 28), "in Feb 1851", "29"}, // 28 days in 1851
+        {"APR 1851", d(1881, 4, 30), "in Apr 1851", "30"},
+        // Qualifiers.
+        {"BET 1850 AND 1852", census1881, "between 1850 and 1852", ""},
+        {"aft 1851", census1881, "after 1851", ""},
+        {"BEF 3 MAR 1851", census1881, "before 3 Mar 1851", ""},
+        {"FROM 1850 TO 1852", census1881, "during a period from 1850 To 1852", ""},
+        {"TO 1852", census1881, "during a period to 1852", ""},
+        {"ABT 1851", census1881, "in 1851 (approx.)", "29 or 30 (approx.)"},
+        {"EST 3 MAR 1851", census1881, "on 3 Mar 1851 (estimated)", "30 (estimated)"},
+        {"CAL MAR 1851", none, "in Mar 1851 (calculated)", ""},
+        {"ABT", census1881, "in (approx.)", ""},
+    };
+    for (const auto& c : cases) {
+        const auto r = datephrase(QString::fromLatin1(c.text), c.census, dateorder::dmy);
+        EXPECT_EQ(r.phrase, QString::fromLatin1(c.phrase)) << c.text;
+        EXPECT_EQ(r.agephrase, *c.age ? " and in this census would be aged " + QString::fromLatin1(c.age) : QString())
+            << c.text;
+        EXPECT_EQ(r.agecomputed, *c.age != 0) << c.text;
+    }
+    const auto plain = datephrase(u"3 MAR 1851", census1881, dateorder::dmy);
+    EXPECT_EQ(plain.earliestyear, 1851);
+    EXPECT_EQ(plain.latestyear, 1851);
+    EXPECT_EQ(datephrase(u"BET 1850 AND 1852", census1881, dateorder::dmy).earliestyear, -9999);
 }
 
 TEST(Datephrase, NoAgeWithoutCensusDayOrUsableDate)
