@@ -4,6 +4,7 @@
 
 #include "platform/linereader.h"
 #include "platform/memoryhint.h"
+#include "platform/prefaulter.h"
 
 #include <QElapsedTimer>
 #include <QFileInfo>
@@ -165,7 +166,18 @@ private:
 
 class loader {
 public:
-    loader(gedcomindex& ix, textencoding enc) : ix_(ix), enc_(enc) {}
+    loader(gedcomindex& ix, textencoding enc, bool prefault) : ix_(ix), enc_(enc)
+    {
+        if (prefault) {
+            pf_ = std::make_unique<prefaulter>();
+            ix_.arena.prefaultwith(pf_.get());
+        }
+    }
+    ~loader()
+    {
+        if (pf_)
+            ix_.arena.prefaultwith(nullptr);
+    }
 
     void line(std::string_view s);
     void finish();
@@ -188,8 +200,14 @@ private:
     personrec& person() { return ix_.people.back(); }
     censusrec& lastcensus() { return census_.back(); }
 
+    void newperson();
+
     gedcomindex& ix_;
     const textencoding enc_;
+    // For a big file: the people table and the arena are brought in ahead of
+    // the load on another thread. The table is asked for in steps.
+    std::unique_ptr<prefaulter> pf_;
+    size_t peopleasked_ = 0; // records of the table asked for so far
     std::string conv_, flagcode_, flagname_; // conversion scratch
 
     kind kind_ = kind::none;
@@ -317,7 +335,8 @@ void loader::startrecord(std::string_view s)
     }
     case 'I': {
         kind_ = kind::person;
-        personrec& p = ix_.people.emplace_back();
+        newperson();
+        personrec& p = ix_.people.back();
         p.id = id;
         p.name = noname;
         namepending = birthpending = deathpending = true;
@@ -348,6 +367,24 @@ void loader::putlist(indexlist<T>& list, std::vector<T>& items)
     std::uninitialized_move(items.begin(), items.end(), at);
     list.adopt(at, items.size());
     items.clear();
+}
+
+void loader::newperson()
+{
+    std::vector<personrec>& people = ix_.people;
+    if (pf_ && people.size() == people.capacity()) {
+        // The table is about to move: nothing more is asked for it.
+        pf_->finish();
+        pf_.reset();
+        ix_.arena.prefaultwith(nullptr);
+    }
+    people.emplace_back();
+    constexpr size_t step = 16384;
+    if (pf_ && people.size() + step / 2 >= peopleasked_ && peopleasked_ < people.capacity()) {
+        const size_t to = std::min(people.capacity(), std::max(peopleasked_, people.size()) + step);
+        pf_->request(people.data() + peopleasked_, (to - peopleasked_) * sizeof(personrec));
+        peopleasked_ = to;
+    }
 }
 
 void loader::endrecord()
@@ -603,11 +640,14 @@ void reservetables(gedcomindex& index, int64_t bytes)
     index.objects.reserve(room(2048));
 }
 
-void loadlines(linereader& reader, gedcomindex& index)
+// Files smaller than this load too quickly for a second thread to help.
+constexpr int64_t prefaultfrom = 64 << 20;
+
+void loadlines(linereader& reader, gedcomindex& index, int64_t bytes)
 {
     index.encoding = reader.encoding();
     index.bom = reader.hasbom();
-    loader l(index, reader.encoding());
+    loader l(index, reader.encoding(), bytes >= prefaultfrom);
     std::string_view s;
     while (reader.next(s))
         l.line(s);
@@ -633,7 +673,7 @@ loadresult loadgedcom(const QString& path, const flagtable& flagdefs)
     index->gedcomdate = stampof(path);
     index->flags = flagdefs;
     reservetables(*index, index->gedcomdate.size);
-    loadlines(reader, *index);
+    loadlines(reader, *index, index->gedcomdate.size);
     if (reader.failed()) {
         result.error = QStringLiteral("The file %1 could not be read: %2").arg(path, reader.errorstring());
         return result;
@@ -651,7 +691,7 @@ std::unique_ptr<gedcomindex> loadgedcombytes(std::string_view bytes, const flagt
     auto index = std::make_unique<gedcomindex>();
     index->flags = flagdefs;
     reservetables(*index, static_cast<int64_t>(bytes.size()));
-    loadlines(reader, *index);
+    loadlines(reader, *index, static_cast<int64_t>(bytes.size()));
     return index;
 }
 

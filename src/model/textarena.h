@@ -5,6 +5,7 @@
 // large allocations instead of one per value.
 
 #include "platform/memoryhint.h"
+#include "platform/prefaulter.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -54,6 +55,11 @@ public:
     // Bytes held in blocks, for memory accounting.
     size_t capacity() const { return total_; }
 
+    // While a big load fills the arena: each large block is made one ahead
+    // and brought in by `pf`, so that filling it finds its pages ready. Null
+    // ends that (the block made ahead stays for later use).
+    void prefaultwith(prefaulter* pf) { pf_ = pf; }
+
 private:
     static constexpr size_t firstblock = 16 << 10;
     static constexpr size_t blocksize = 4 << 20;
@@ -73,6 +79,15 @@ private:
         // They are not zeroed, since every byte is written first.
         const size_t size =
             current ? std::max(need, std::min(blocksize, firstblock << std::min<size_t>(blocks_.size(), 8))) : need;
+        if (current && spare_ && need <= blocksize) {
+            // The block made ahead takes over.
+            next_ = spare_;
+            room_ = blocksize;
+            spare_ = nullptr;
+            if (pf_)
+                makespare();
+            return next_;
+        }
         const size_t align = size >= largepage ? largepage : alignof(std::max_align_t);
         char* const at = static_cast<char*>(::operator new(size, std::align_val_t(align)));
         blocks_.emplace_back(at, freeblock{align});
@@ -82,11 +97,24 @@ private:
         if (current) {
             next_ = at;
             room_ = size;
+            if (pf_ && size == blocksize)
+                makespare();
         }
         return at;
     }
 
+    void makespare()
+    {
+        spare_ = static_cast<char*>(::operator new(blocksize, std::align_val_t(largepage)));
+        blocks_.emplace_back(spare_, freeblock{largepage});
+        total_ += blocksize;
+        hintlargememory(spare_, blocksize);
+        pf_->request(spare_, blocksize);
+    }
+
     std::vector<block> blocks_;
+    prefaulter* pf_ = nullptr;
+    char* spare_ = nullptr; // a block made ahead, not yet in use
     char* next_ = nullptr;
     size_t room_ = 0;
     size_t total_ = 0;
