@@ -1,6 +1,7 @@
 // Loading generated family files of 10,000, 100,000 and 1,000,000 individuals
 // (made by gen_family_gedcom.py; the folder is QM_BENCH_DIR, else /work/gen).
 #include "model/loadgedcom.h"
+#include "platform/linereader.h"
 
 #include <QFileInfo>
 
@@ -40,8 +41,36 @@ void loadfile(benchmark::State& state, const char* name)
     state.counters["arena_MB"] = static_cast<double>(arena) / (1 << 20);
 }
 
+// Only the lines, as the loader gets them: the floor under the load's time.
+void readlines(benchmark::State& state, const char* name)
+{
+    const QString path = benchfile(name);
+    if (!QFileInfo(path).isFile()) {
+        state.SkipWithError((path.toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+        return;
+    }
+    int64_t lines = 0;
+    for (auto _ : state) {
+        qm::linereader reader;
+        reader.setmaxline(1 << 20);
+        if (!reader.open(path)) {
+            state.SkipWithError("cannot open");
+            return;
+        }
+        std::string_view line;
+        size_t bytes = 0;
+        while (reader.next(line))
+            bytes += line.size();
+        lines = reader.linenumber();
+        benchmark::DoNotOptimize(bytes);
+    }
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations()) * QFileInfo(path).size());
+    state.counters["lines"] = static_cast<double>(lines);
+}
+
 } // namespace
 
+BENCHMARK_CAPTURE(readlines, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(2);
 BENCHMARK_CAPTURE(loadfile, fam10000, "fam10000.ged")->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(loadfile, fam100000, "fam100000.ged")->Unit(benchmark::kMillisecond)->Iterations(3);
 BENCHMARK_CAPTURE(loadfile, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(1);
