@@ -15,7 +15,6 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDir>
-#include <QElapsedTimer>
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
@@ -456,29 +455,6 @@ private slots:
         QVERIFY(shownnames(w).isEmpty());
         QCOMPARE(w.index()->people.size(), size_t(39));
         QCOMPARE(s->prompts.unexpected(), 0);
-    }
-
-    // Not a test: with QM_TIMING set, reports how long the real window takes to
-    // open a 30,000-individual file and to list who could be alive in 1881 in
-    // a 100,000-individual one (files of QM_BENCH_DIR, default /work/gen).
-    void timing()
-    {
-        if (qEnvironmentVariableIsEmpty("QM_TIMING"))
-            QSKIP("QM_TIMING not set");
-        const QString dir = qEnvironmentVariable("QM_BENCH_DIR", QStringLiteral("/work/gen"));
-        QElapsedTimer t;
-        t.start();
-        auto s = files_.opened(dir + QStringLiteral("/fam30000.ged"));
-        QVERIFY(s);
-        qInfo("open 30,000 until the people list is filled: %lld ms (%d listed)", t.elapsed(),
-              peoplelist(*s->w)->model()->rowCount());
-        auto b = files_.opened(dir + QStringLiteral("/fam100000.ged"));
-        QVERIFY(b);
-        t.restart();
-        chooseyear(*b->w, QStringLiteral("1881"));
-        QApplication::processEvents();
-        qInfo("choose 1881 in 100,000 until the list is filled: %lld ms (%d listed)", t.elapsed(),
-              peoplelist(*b->w)->model()->rowCount());
     }
 
     // Not a test: scripts/screenshot.sh runs it to picture the main window
