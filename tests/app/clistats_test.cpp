@@ -1,4 +1,5 @@
 // quillmark-cli stats, run as a user would run it.
+#include "flags/flagtable.h"
 #include "platform/settingsstore.h"
 
 #include "support/testfiles.h"
@@ -32,17 +33,18 @@ run cli(const QStringList& args)
 
 class CliStats : public ::testing::Test {
 protected:
+    run stats(const QString& path, const QStringList& more = {}) const
+    {
+        return cli(QStringList{QStringLiteral("stats"), path} + more + QStringList{QStringLiteral("--settings"), ini});
+    }
+
+protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir.isValid());
         ini = dir.filePath(QStringLiteral("settings.ini"));
         // A settings file with one allocated flag.
-        auto store = qm::settingsstore::onfile(ini);
-        store->write(QStringLiteral("Flags/1"), QStringLiteral("Code"), QStringLiteral("__C1881"));
-        store->write(QStringLiteral("Flags/1"), QStringLiteral("Name"), QStringLiteral("Census 1881"));
-        store->write(QStringLiteral("Flags/1"), QStringLiteral("Date"), QStringLiteral("3 APR 1881"));
-        store->write(QStringLiteral("Flags/1"), QStringLiteral("Country"), QStringLiteral("UK"));
-        store->sync();
+        qm::saveflagdefs(*qm::settingsstore::onfile(ini), {{"__C1881", "Census 1881", "3 APR 1881", 0, "UK"}});
     }
 
     QString file(const char* name, const std::string& bytes)
@@ -76,23 +78,18 @@ TEST_F(CliStats, PrintsTheIndexAsJson)
                               "0 @I2@ INDI\r\n1 CENS\r\n2 PLAC York\r\n"
                               "0 @S4@ SOUR\r\n1 TITL 1881 Census\r\n0 @S9@ SOUR\r\n1 TITL Register\r\n"
                               "0 @O6@ OBJE\r\n0 @N3@ NOTE\r\n0 TRLR\r\n");
-    const run r = cli({QStringLiteral("stats"), path, QStringLiteral("--settings"), ini});
+    const run r = stats(path);
     ASSERT_EQ(r.status, 0) << r.err.toStdString();
     EXPECT_EQ(r.out.count('\n'), 1);
     QJsonParseError error;
     const QJsonObject o = QJsonDocument::fromJson(r.out, &error).object();
     ASSERT_EQ(error.error, QJsonParseError::NoError) << r.out.toStdString();
-    EXPECT_EQ(o.value(QStringLiteral("individuals")).toInt(), 2);
-    EXPECT_EQ(o.value(QStringLiteral("sources")).toInt(), 2);
-    EXPECT_EQ(o.value(QStringLiteral("census_sources")).toInt(), 1);
-    EXPECT_EQ(o.value(QStringLiteral("objects")).toInt(), 1);
-    EXPECT_EQ(o.value(QStringLiteral("places")).toInt(), 2);
-    EXPECT_EQ(o.value(QStringLiteral("census_events")).toInt(), 2);
-    EXPECT_EQ(o.value(QStringLiteral("flags")).toInt(), 2); // the defined one and __C1891
-    EXPECT_EQ(o.value(QStringLiteral("next_source")).toInt(), 10);
-    EXPECT_EQ(o.value(QStringLiteral("maxobjectid")).toInt(), 6);
-    EXPECT_EQ(o.value(QStringLiteral("maxnoteid")).toInt(), 3);
-    EXPECT_EQ(o.value(QStringLiteral("encoding")).toString(), QStringLiteral("utf-8"));
+    const std::vector<std::pair<const char*, QJsonValue>> expected{
+        {"individuals", 2}, {"sources", 2}, {"census_sources", 1}, {"objects", 1},
+        {"places", 2}, {"census_events", 2}, {"flags", 2} /* the defined one and __C1891 */,
+        {"next_source", 10}, {"maxobjectid", 6}, {"maxnoteid", 3}, {"encoding", "utf-8"}};
+    for (const auto& [key, value] : expected)
+        EXPECT_EQ(o.value(QLatin1String(key)), value) << key;
     EXPECT_TRUE(o.value(QStringLiteral("load_ms")).isDouble());
     EXPECT_EQ(o.size(), 12);
 
@@ -101,21 +98,20 @@ TEST_F(CliStats, PrintsTheIndexAsJson)
     const run a = cli({QStringLiteral("stats"), QStringLiteral("--settings=") + ini, ansi});
     ASSERT_EQ(a.status, 0) << a.err.toStdString();
     const QJsonObject ao = QJsonDocument::fromJson(a.out).object();
-    EXPECT_EQ(ao.value(QStringLiteral("encoding")).toString(), QStringLiteral("windows-1252"));
-    EXPECT_EQ(ao.value(QStringLiteral("flags")).toInt(), 1);
-    EXPECT_EQ(ao.value(QStringLiteral("maxnoteid")).toInt(), -1);
-    EXPECT_EQ(ao.value(QStringLiteral("next_source")).toInt(), 1);
+    for (const auto& [key, value] : std::vector<std::pair<const char*, QJsonValue>>{
+             {"encoding", "windows-1252"}, {"flags", 1}, {"maxnoteid", -1}, {"next_source", 1}})
+        EXPECT_EQ(ao.value(QLatin1String(key)), value) << key;
 }
 
 TEST_F(CliStats, UnusableFilesFailWithOneLine)
 {
-    expectfailure(cli({QStringLiteral("stats"), dir.filePath(QStringLiteral("missing.ged")), QStringLiteral("--settings"), ini}));
-    expectfailure(cli({QStringLiteral("stats"), dir.path(), QStringLiteral("--settings"), ini}));
+    expectfailure(stats(dir.filePath(QStringLiteral("missing.ged"))));
+    expectfailure(stats(dir.path()));
     const QString nohead = file("notes.txt", "just some text\n0 @I1@ INDI\n");
-    const run r = cli({QStringLiteral("stats"), nohead, QStringLiteral("--settings"), ini});
+    const run r = stats(nohead);
     expectfailure(r);
     EXPECT_TRUE(r.err.contains("0 HEAD")) << r.err.toStdString();
-    expectfailure(cli({QStringLiteral("stats"), file("empty.ged", ""), QStringLiteral("--settings"), ini}));
+    expectfailure(stats(file("empty.ged", "")));
     expectfailure(cli({QStringLiteral("stats"), nohead, QStringLiteral("--settings"),
                        dir.filePath(QStringLiteral("nosuch.ini"))}));
 }
@@ -124,9 +120,9 @@ TEST_F(CliStats, UsageMistakesAndHelp)
 {
     const QString ged = file("f.ged", "0 HEAD\n");
     expectfailure(cli({QStringLiteral("stats")}));
-    expectfailure(cli({QStringLiteral("stats"), ged, ged, QStringLiteral("--settings"), ini}));
+    expectfailure(stats(ged, {ged}));
     expectfailure(cli({QStringLiteral("stats"), ged, QStringLiteral("--settings")}));
-    expectfailure(cli({QStringLiteral("stats"), ged, QStringLiteral("--verbose"), QStringLiteral("--settings"), ini}));
+    expectfailure(stats(ged, {QStringLiteral("--verbose")}));
     expectfailure(cli({QStringLiteral("frobnicate")}));
 
     const run help = cli({QStringLiteral("--help")});

@@ -7,61 +7,44 @@
 
 #include <gtest/gtest.h>
 
+#include <tuple>
+
 using namespace qm;
 
 namespace {
 
-TEST(CodeForFlag, NamesFromTheHelp)
+TEST(CodeForFlag, CapitalAsciiCodeOfAtMostFifteenCharacters)
 {
-    EXPECT_EQ(codeforflag("Ab-c"), "__ABC");
-    EXPECT_EQ(codeforflag("a b"), "__A_B");
-    EXPECT_EQ(codeforflag(QStringLiteral("Émile")), "__EMILE");
-    EXPECT_EQ(codeforflag("St. John's 1881"), "__ST_JOHNS_1881"); // 15 characters: kept whole
-    EXPECT_EQ(codeforflag("Census Ireland 1901"), "__CENSUS_IRELAN");
-    EXPECT_EQ(codeforflag(""), "__");
-    EXPECT_EQ(codeforflag("\t-./"), "__");
-}
-
-TEST(CodeForFlag, FoldsAccentedCharactersToCapitals)
-{
-    // The folds that are not the letter's own base: ligatures, ß, ð, µ, ¥.
-    EXPECT_EQ(codeforflag(QStringLiteral("ŠšŸÿÐÝ")), "__SSYYDY");
-    EXPECT_EQ(codeforflag(QStringLiteral("Œ Æ ß")), "__O_A_S");
-    EXPECT_EQ(codeforflag(QStringLiteral("ðµ¥")), "__OUY");
-    // Outside the list: dropped, and the code stays ASCII.
-    EXPECT_EQ(codeforflag(QStringLiteral("Łódź × ÷ 1881")), "__OD___1881");
-}
-
-TEST(CodeForFlag, SameCodeWhereverTheNameCameFrom)
-{
-    const std::string typed = codeforflag(QStringLiteral("Zoë Müller"));
-    EXPECT_EQ(typed, "__ZOE_MULLER");
-    // The same name read from a UTF-8 file, from a Windows-1252 file, and typed
-    // with combining accents.
-    EXPECT_EQ(codeforflag(qs("Zo\xc3\xab M\xc3\xbcller")), typed);
-    EXPECT_EQ(codeforflag(qs(toutf8("Zo\xeb M\xfcller", textencoding::windows1252))), typed);
-    EXPECT_EQ(codeforflag(QStringLiteral("Zoe\u0308 Mu\u0308ller")), typed);
-    EXPECT_EQ(codeforflag(qs(toutf8("\x8c\x9a\xa5\xb5", textencoding::windows1252))), "__OSYU");
-}
-
-flagrec allocated(const char* code, const char* name, const char* date, const char* country)
-{
-    flagrec f;
-    f.code = code;
-    f.name = name;
-    f.date = date;
-    f.country = country;
-    return f;
+    const std::vector<std::pair<QString, std::string>> cases{
+        {"Ab-c", "__ABC"},
+        {"a b", "__A_B"},
+        {"St. John's 1881", "__ST_JOHNS_1881"}, // 15 characters: kept whole
+        {"Census Ireland 1901", "__CENSUS_IRELAN"},
+        {"", "__"},
+        {"\t-./", "__"},
+        // Folds that are not the letter's own base: ligatures, ß, ð, µ, ¥.
+        {QStringLiteral("ŠšŸÿÐÝ"), "__SSYYDY"},
+        {QStringLiteral("Œ Æ ß"), "__O_A_S"},
+        {QStringLiteral("ðµ¥"), "__OUY"},
+        {QStringLiteral("Łódź × ÷ 1881"), "__OD___1881"}, // outside the list: dropped
+        // One name typed, read from UTF-8 and Windows-1252 files, and with combining accents.
+        {QStringLiteral("Zoë Müller"), "__ZOE_MULLER"},
+        {qs("Zo\xc3\xab M\xc3\xbcller"), "__ZOE_MULLER"},
+        {qs(toutf8("Zo\xeb M\xfcller", textencoding::windows1252)), "__ZOE_MULLER"},
+        {QStringLiteral("Zoe\u0308 Mu\u0308ller"), "__ZOE_MULLER"},
+        {qs(toutf8("\x8c\x9a\xa5\xb5", textencoding::windows1252)), "__OSYU"},
+    };
+    for (const auto& [name, code] : cases)
+        EXPECT_EQ(codeforflag(name), code) << name.toStdString();
 }
 
 TEST(FindEntryFlag, MatchesYearOrFullDateOfTheCountry)
 {
-    flagtable t;
-    t.push_back(allocated("__FREE", "Free", "", ""));
-    t.push_back(allocated("__US_1880", "US 1880", "1880", "USA"));
-    t.push_back(allocated("__C1881", "Census 1881", "1881", "UK"));
-    t.push_back(allocated("__C1891", "Census 1891", "5 APR 1891", "UK"));
-    t.push_back(allocated("__IRL1901", "Ireland 1901", "1901", "Ireland"));
+    flagtable t{{"__FREE", "Free", "", 0, ""},
+                {"__US_1880", "US 1880", "1880", 0, "USA"},
+                {"__C1881", "Census 1881", "1881", 0, "UK"},
+                {"__C1891", "Census 1891", "5 APR 1891", 0, "UK"},
+                {"__IRL1901", "Ireland 1901", "1901", 0, "Ireland"}};
     EXPECT_EQ(findentryflag(t, "3 APR 1881", "UK"), 2u);
     EXPECT_EQ(findentryflag(t, "5 APR 1891", "UK"), 3u);
     EXPECT_EQ(findentryflag(t, "6 APR 1891", "UK"), std::nullopt);
@@ -100,26 +83,18 @@ protected:
     std::unique_ptr<settingsstore> store;
 };
 
-TEST_F(FlagDefsTest, NoGroupsGiveAnEmptyTableAndNoError)
-{
-    flagtable t;
-    EXPECT_TRUE(loadflagdefs(*store, t));
-    EXPECT_TRUE(t.empty());
-}
-
 TEST_F(FlagDefsTest, DefinitionsAreReadInOrderAndAreNoUse)
 {
+    flagtable t;
+    EXPECT_TRUE(loadflagdefs(*store, t)) << "no groups: no error";
+    EXPECT_TRUE(t.empty());
     define(1, "__C1881", QStringLiteral("Census 1881 é"), "1881", "UK");
     define(2, "__C1891", "Census 1891", "5 APR 1891", "UK");
     define(4, "__LATE", "After a gap", "1901", "UK");
-    flagtable t;
     EXPECT_TRUE(loadflagdefs(*store, t));
     ASSERT_EQ(t.size(), 2u) << "reading stops at the first missing group";
-    EXPECT_EQ(t[0].code, "__C1881");
-    EXPECT_EQ(t[0].name, "Census 1881 \xc3\xa9");
-    EXPECT_EQ(t[0].date, "1881");
-    EXPECT_EQ(t[0].country, "UK");
-    EXPECT_EQ(t[0].count, 0);
+    EXPECT_EQ(std::tie(t[0].code, t[0].name, t[0].date, t[0].count, t[0].country),
+              std::make_tuple("__C1881", "Census 1881 \xc3\xa9", "1881", 0, "UK"));
     EXPECT_EQ(t[1].date, "5 APR 1891");
     // The loader then notes the same flag met in the file.
     EXPECT_EQ(noteflag(t, "__C1891", "other name"), 1u);
@@ -173,11 +148,7 @@ TEST_F(FlagDefsTest, SaveKeepsOnlyAllocatedFlagsAndClearsStaleGroups)
     define(1, "__OLD", "Old", "1841", "UK");
     define(2, "__OLD2", "Old 2", "1851", "UK");
     define(5, "__STALE", "Beyond a gap", "1861", "UK");
-    flagtable t;
-    t.push_back(allocated("__FILEONLY", "Only in the file", "", ""));
-    t.push_back(allocated("__C1881", "Census 1881", "3 APR 1881", "UK"));
-    t.back().count = 7;
-    saveflagdefs(*store, t);
+    saveflagdefs(*store, {{"__FILEONLY", "Only in the file", "", 0, ""}, {"__C1881", "Census 1881", "3 APR 1881", 7, "UK"}});
     EXPECT_EQ(value(1, "Code"), "__C1881");
     EXPECT_EQ(value(1, "Name"), "Census 1881");
     EXPECT_EQ(value(1, "Date"), "3 APR 1881");
