@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <tuple>
 #include <vector>
 
 using namespace qm;
@@ -34,34 +35,22 @@ readlines readall(const std::string& bytes, size_t maxline = 0)
 
 } // namespace
 
-TEST(LineReader, SplitsEveryKindOfLineEnd)
+TEST(LineReader, LinesAndTheirEnds)
 {
-    const auto r = readall("0 HEAD\r\n1 A\n1 B\r1 C\n\r1 D");
-    EXPECT_EQ(r.lines, (std::vector<std::string>{"0 HEAD", "1 A", "1 B", "1 C", "1 D"}));
-    EXPECT_EQ(r.ends, (std::vector<std::string>{"\r\n", "\n", "\r", "\n\r", ""}));
-}
-
-TEST(LineReader, LfBeforeCrLfIsTwoLines)
-{
-    // "A\n\r\nB": A ends with LF, then an empty line ends with CR LF.
-    const auto r = readall("A\n\r\nB\r\n");
-    EXPECT_EQ(r.lines, (std::vector<std::string>{"A", "", "B"}));
-    EXPECT_EQ(r.ends, (std::vector<std::string>{"\n", "\r\n", "\r\n"}));
-}
-
-TEST(LineReader, EmptyFileAndLoneLineEnds)
-{
-    EXPECT_TRUE(readall("").lines.empty());
-    EXPECT_EQ(readall("\r\n\r\n").lines.size(), 2u);
-    EXPECT_EQ(readall("x").lines, std::vector<std::string>{"x"});
-}
-
-TEST(LineReader, KeepsNulBytesAndHighBytes)
-{
-    const std::string bytes("1 NAME A\0B /\xe9/\r\n", 16);
-    const auto r = readall(bytes);
-    ASSERT_EQ(r.lines.size(), 1u);
-    EXPECT_EQ(r.lines[0], std::string("1 NAME A\0B /\xe9/", 14));
+    using v = std::vector<std::string>;
+    const std::vector<std::tuple<std::string, v, v>> cases{
+        {"0 HEAD\r\n1 A\n1 B\r1 C\n\r1 D", {"0 HEAD", "1 A", "1 B", "1 C", "1 D"}, {"\r\n", "\n", "\r", "\n\r", ""}},
+        {"A\n\r\nB\r\n", {"A", "", "B"}, {"\n", "\r\n", "\r\n"}}, // LF, then an empty line ended by CR LF
+        {"", {}, {}},
+        {"\r\n\r\n", {"", ""}, {"\r\n", "\r\n"}},
+        {"x", {"x"}, {""}},
+        {std::string("1 NAME A\0B /\xe9/\r\n", 16), {std::string("1 NAME A\0B /\xe9/", 14)}, {"\r\n"}},
+    };
+    for (const auto& [bytes, lines, ends] : cases) {
+        const auto r = readall(bytes);
+        EXPECT_EQ(r.lines, lines);
+        EXPECT_EQ(r.ends, ends);
+    }
 }
 
 TEST(LineReader, LinesAcrossBufferBoundaries)
