@@ -166,7 +166,7 @@ TEST(AutoText, HeadIsMarriedFromTwentyOneYears)
     EXPECT_EQ(cond(), "Peter Green\tHead\tUnm\t300 mths\t\t");
 }
 
-TEST(AutoText, ScholarOnlyWhenNotTypedAsAnOccupation)
+TEST(AutoText, ScholarAndBirthPlaceOfARow)
 {
     household h;
     settings s = options(false);
@@ -174,6 +174,14 @@ TEST(AutoText, ScholarOnlyWhenNotTypedAsAnOccupation)
     const auto rows = h.rows();
     EXPECT_EQ(lines(autotext({rows[0], rows[2]}, h.index, "3 APR 1881", "UK", s))[2],
               "William Smith\tSon\t15\t\t");
+
+    // A birth place given in the birth details is the one shown.
+    auto son = rows[2];
+    son.birthedited = true;
+    son.birthdate = "1865";
+    son.birthplace = "Bradford";
+    EXPECT_EQ(lines(autotext({rows[0], son}, h.index, "2 JUN 1880", "USA", options(false)))[2],
+              "William Smith\tSon\t15\tScholar\tBradford");
 }
 
 TEST(AutoText, HusbandGivesHisSurnameToLaterRowsOnly)
@@ -190,17 +198,6 @@ TEST(AutoText, HusbandGivesHisSurnameToLaterRowsOnly)
     EXPECT_EQ(l[2], "John Brown\tHusb\t32\t\t");
     EXPECT_EQ(l[3], "Sarah Brown\tMother\t60\t\t");
     EXPECT_EQ(l[4], "Nobody\t\t1\t\t"); // nothing after ", "
-}
-
-TEST(AutoText, BirthPlaceGivenInTheBirthDetails)
-{
-    household h;
-    auto son = row(h.index, 2, "15");
-    son.birthedited = true;
-    son.birthdate = "1865";
-    son.birthplace = "Bradford";
-    EXPECT_EQ(lines(autotext({row(h.index, 0, "45"), son}, h.index, "2 JUN 1880", "USA", options(false)))[2],
-              "William Smith\tSon\t15\tScholar\tBradford");
 }
 
 TEST(AutoText, CensusDateChecks)
