@@ -187,6 +187,7 @@ private:
 
     std::string_view text(std::string_view raw);
     std::string_view place(std::string_view raw);
+    std::string_view lookupplace(std::string_view raw, int32_t& groupout);
     void startrecord(std::string_view s);
     void endrecord();
     void sourceline(std::string_view s);
@@ -237,6 +238,9 @@ private:
     viewmap<spelling> spellings_;
     std::vector<placerec> groups_;
     std::vector<std::string_view> groupkeys_;
+    std::string lastraw_; // the place met last, as in the file, with its text and group
+    std::string_view lastutf8_;
+    int32_t lastgroup_ = -1;
 };
 
 std::string_view loader::text(std::string_view raw)
@@ -251,9 +255,25 @@ std::string_view loader::text(std::string_view raw)
 // Counts one occurrence of a place (raw bytes, trimmed, not empty) and returns its UTF-8 text.
 std::string_view loader::place(std::string_view raw)
 {
+    // Places often come twice in a row (an event and the occupation of the
+    // same census): the last one is kept at hand.
+    if (lastgroup_ >= 0 && raw == lastraw_) {
+        ++groups_[static_cast<size_t>(lastgroup_)].count;
+        return lastutf8_;
+    }
+    const std::string_view utf8 = lookupplace(raw, lastgroup_);
+    lastraw_.assign(raw);
+    lastutf8_ = utf8;
+    return utf8;
+}
+
+// Counts one occurrence of a place and gives its UTF-8 text and group.
+std::string_view loader::lookupplace(std::string_view raw, int32_t& groupout)
+{
     const uint64_t h = hashbytes(raw);
     if (spelling* sp = spellings_.find(h, raw)) {
         ++groups_[static_cast<size_t>(sp->group)].count;
+        groupout = sp->group;
         return sp->utf8;
     }
     const std::string_view utf8 = text(raw);
@@ -271,6 +291,7 @@ std::string_view loader::place(std::string_view raw)
     }
     ++groups_[static_cast<size_t>(group)].count;
     spellings_.insert(h, keys_.emplace_back(raw), {group, utf8});
+    groupout = group;
     return utf8;
 }
 
@@ -500,10 +521,16 @@ void loader::flagline(std::string_view s)
     const size_t space = s.find(' ', 2);
     if (space == std::string_view::npos)
         return;
-    flagcode_.clear();
-    flagname_.clear();
-    appendutf8(s.substr(2, space - 2), enc_, flagcode_);
-    appendutf8(trim(s.substr(space + 1)), enc_, flagname_);
+    const auto convert = [this](std::string_view raw, std::string& out) {
+        if (asciionly(raw)) {
+            out.assign(raw);
+        } else {
+            out.clear();
+            appendutf8(raw, enc_, out);
+        }
+    };
+    convert(s.substr(2, space - 2), flagcode_);
+    convert(trim(s.substr(space + 1)), flagname_);
     flagids_.push_back(static_cast<int32_t>(noteflag(ix_.flags, flagcode_, flagname_)));
 }
 
