@@ -13,6 +13,7 @@
 #include <memory>
 #include <new>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace qm {
@@ -20,8 +21,21 @@ namespace qm {
 class textarena {
 public:
     textarena() = default;
-    textarena(textarena&&) = default;
-    textarena& operator=(textarena&&) = default;
+    textarena(textarena&& other) noexcept { *this = std::move(other); }
+    textarena& operator=(textarena&& other) noexcept
+    {
+        // The moved-from arena is left empty, not pointing into the blocks it gave away.
+        if (this != &other) {
+            blocks_ = std::move(other.blocks_);
+            other.blocks_.clear();
+            pf_ = std::exchange(other.pf_, nullptr);
+            spare_ = std::exchange(other.spare_, nullptr);
+            next_ = std::exchange(other.next_, nullptr);
+            room_ = std::exchange(other.room_, 0);
+            total_ = std::exchange(other.total_, 0);
+        }
+        return *this;
+    }
     textarena(const textarena&) = delete;
     textarena& operator=(const textarena&) = delete;
 

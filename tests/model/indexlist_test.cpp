@@ -98,3 +98,15 @@ TEST(IndexList, IndexKeepsTextsAndListsWhenMovedOrReplaced)
     EXPECT_EQ(ix.people[1].name, "Lee, Bob");
     EXPECT_EQ(ix.people[0].census[0].sourceids, (std::vector<int32_t>{2}));
 }
+
+TEST(IndexList, MovedFromArenaStartsAfresh)
+{
+    textarena a;
+    const std::string_view kept = a.store("kept text");
+    textarena b = std::move(a);
+    const std::string_view fresh = a.store("new text"); // must not land in b's block
+    const std::string_view more = b.store("more");
+    EXPECT_EQ(kept, "kept text");
+    EXPECT_EQ(fresh, "new text");
+    EXPECT_EQ(more, "more");
+}
