@@ -17,6 +17,7 @@
 #include <QDir>
 #include <QLineEdit>
 #include <QPlainTextEdit>
+#include <QProcess>
 #include <QRegularExpression>
 #include <QPushButton>
 #include <QSplitter>
@@ -43,78 +44,39 @@ QStringList filelines(const QString& path)
     return text.split(QStringLiteral("\r\n"));
 }
 
-// The changes from a to b, line by line: each run of changed lines is headed
-// by "@ " and the record ("0 ..." line) it falls in, then "-" removed and "+"
-// added lines.
-QStringList linediff(const QStringList& a, const QStringList& b)
+// A copy of the file as it is now, to compare the rewrite with.
+QString snapshot(const QString& path)
 {
-    // Myers' shortest edit script: the files differ in a few dozen lines, so
-    // the work stays small for large files.
-    const qsizetype n = a.size(), m = b.size(), max = n + m, off = max + 1;
-    std::vector<qsizetype> v(static_cast<size_t>(2 * max + 3), 0);
-    std::vector<std::vector<qsizetype>> trace;
-    qsizetype found = -1;
-    for (qsizetype d = 0; d <= max && found < 0; ++d) {
-        trace.push_back(v);
-        for (qsizetype k = -d; k <= d; k += 2) {
-            const auto at = [&](qsizetype kk) -> qsizetype& { return v[static_cast<size_t>(kk + off)]; };
-            qsizetype x = (k == -d || (k != d && at(k - 1) < at(k + 1))) ? at(k + 1) : at(k - 1) + 1;
-            qsizetype y = x - k;
-            while (x < n && y < m && a[x] == b[y]) {
-                ++x;
-                ++y;
-            }
-            at(k) = x;
-            if (x >= n && y >= m) {
-                found = d;
-                break;
-            }
-        }
-    }
-    // Walk back through the trace to the edits, then list them in order.
-    struct edit {
-        qsizetype x, y; // where the edit starts: a[x], b[y]
-        bool add;       // b[y] inserted; otherwise a[x] removed
-    };
-    std::vector<edit> edits;
-    qsizetype x = n, y = m;
-    for (qsizetype d = found; d >= 0; --d) {
-        const std::vector<qsizetype>& w = trace[static_cast<size_t>(d)];
-        const auto at = [&](qsizetype kk) { return w[static_cast<size_t>(kk + off)]; };
-        const qsizetype k = x - y;
-        const qsizetype pk = (k == -d || (k != d && at(k - 1) < at(k + 1))) ? k + 1 : k - 1;
-        const qsizetype px = at(pk), py = px - pk;
-        while (x > px && y > py) {
-            --x;
-            --y;
-        }
-        if (d > 0)
-            edits.push_back({px, py, x == px});
-        x = px;
-        y = py;
-    }
-    std::reverse(edits.begin(), edits.end());
-    QStringList out;
-    qsizetype scanned = 0, endx = -1, endy = -1;
-    QString record;
-    for (const edit& e : edits) {
-        for (; scanned < e.x; ++scanned)
-            if (a[scanned].startsWith(QLatin1String("0 ")))
-                record = a[scanned];
-        if (e.x != endx || e.y != endy)
-            out << QStringLiteral("@ ") + record;
-        out << (e.add ? QStringLiteral("+") + b[e.y] : QStringLiteral("-") + a[e.x]);
-        endx = e.add ? e.x : e.x + 1;
-        endy = e.add ? e.y + 1 : e.y;
-    }
-    return out;
+    QFile::remove(path + QStringLiteral(".before"));
+    QFile::copy(path, path + QStringLiteral(".before"));
+    return path + QStringLiteral(".before");
 }
 
-QStringList signed_(const QString& sign, const QStringList& lines)
+// The changes from the snapshot to the file, line by line: each run of changed
+// lines is headed by "@ " and the record ("0 ..." line) it falls in, then "-"
+// removed and "+" added lines.
+QStringList linediff(const QString& before, const QString& after)
 {
+    QProcess diff;
+    diff.start(QStringLiteral("diff"), {QStringLiteral("--strip-trailing-cr"), QStringLiteral("--unchanged-line-format= %L"),
+                                        QStringLiteral("--old-line-format=-%L"), QStringLiteral("--new-line-format=+%L"),
+                                        before, after});
+    if (!diff.waitForFinished())
+        return {QStringLiteral("diff did not run")};
     QStringList out;
-    for (const QString& l : lines)
-        out << sign + l;
+    QString record;
+    bool changing = false;
+    for (QString l : QString::fromUtf8(diff.readAllStandardOutput()).split(QLatin1Char('\n'), Qt::SkipEmptyParts)) {
+        l.remove(QLatin1Char('\r'));
+        const bool changed = !l.startsWith(QLatin1Char(' '));
+        if (changed && !changing)
+            out << QStringLiteral("@ ") + record;
+        if (changed)
+            out << l;
+        changing = changed;
+        if (!l.startsWith(QLatin1Char('+')) && l.mid(1).startsWith(QLatin1String("0 ")))
+            record = l.mid(1);
+    }
     return out;
 }
 
@@ -181,7 +143,7 @@ private slots:
     void fullentry()
     {
         const QString file = files_.sample();
-        const QStringList before = filelines(file);
+        const QString before = snapshot(file);
         const settings s = testsettings();
         auto run = opened(file, s);
         QVERIFY(run);
@@ -230,46 +192,35 @@ private slots:
         QCOMPARE(run->prompts.unexpected(), 0);
         QCOMPARE(run->prompts.history().size(), size_t(1)); // only the default-file question at start
 
-        const QString place = QStringLiteral("2 PLAC Hebden Bridge, Yorkshire, England");
-        const QString date = QStringLiteral("2 DATE 3 APR 1881");
-        const auto event = [&](const char* age) {
-            return QStringList{QStringLiteral("1 CENS"), date, place, QStringLiteral("2 ADDR 27 Hangingroyd Lane"),
-                               QStringLiteral("2 AGE ") + QLatin1String(age), QStringLiteral("2 SOUR @S12@")};
+        const QString stamp = QStringLiteral("+2 DATE 04 DEC 2026\n+3 TIME 13:05:09\n");
+        const auto person = [&](int id, const char* age, const char* time, const char* occupation = "") {
+            return QStringLiteral("@ 0 @I%1@ INDI\n+1 CENS\n+2 DATE 3 APR 1881\n+2 PLAC Hebden Bridge, Yorkshire, England\n"
+                                  "+2 ADDR 27 Hangingroyd Lane\n+2 AGE %2\n+2 SOUR @S12@\n%3@ 0 @I%1@ INDI\n"
+                                  "-2 DATE 11 NOV 2023\n-3 TIME %4\n")
+                       .arg(id)
+                       .arg(QLatin1String(age), QLatin1String(occupation), QLatin1String(time))
+                   + stamp;
         };
-        const QStringList stamp = {QStringLiteral("+2 DATE 04 DEC 2026"), QStringLiteral("+3 TIME 13:05:09")};
-        const auto oldstamp = [](const char* time, const char* day = "11 NOV 2023") {
-            return QStringList{QStringLiteral("-2 DATE ") + QLatin1String(day), QStringLiteral("-3 TIME ") + QLatin1String(time)};
-        };
-        const QStringList expected =
-            QStringList{QStringLiteral("@ 0 @I11@ INDI")} + signed_(QStringLiteral("+"), event("28y"))
-            + QStringList{QStringLiteral("+1 OCCU Fustian Cutter"), QStringLiteral("+") + date, QStringLiteral("+") + place,
-                          QStringLiteral("+2 SOUR @S12@"), QStringLiteral("@ 0 @I11@ INDI")}
-            + oldstamp("20:31:58") + stamp
-            + QStringList{QStringLiteral("@ 0 @I27@ INDI")} + signed_(QStringLiteral("+"), event("26y"))
-            + QStringList{QStringLiteral("@ 0 @I27@ INDI")} + oldstamp("20:33:12") + stamp
-            + QStringList{QStringLiteral("@ 0 @I28@ INDI")} + signed_(QStringLiteral("+"), event("2y"))
-            + QStringList{QStringLiteral("@ 0 @I28@ INDI")} + oldstamp("20:34:01") + stamp
-            + QStringList{QStringLiteral("@ 0 @I29@ INDI")} + signed_(QStringLiteral("+"), event("1m"))
-            + QStringList{QStringLiteral("@ 0 @I29@ INDI")} + oldstamp("20:35:26") + stamp
-            + QStringList{QStringLiteral("@ 0 @S11@ SOUR"), QStringLiteral("+0 @S12@ SOUR"),
-                          QStringLiteral("+1 TITL Census 1881 Hebden Bridge, Yorkshire, England RG11/4426/52 (William Ashworth)"),
-                          QStringLiteral("+1 _TYPE Census"), QStringLiteral("+1 TEXT William Ashworth\tHead"),
-                          QStringLiteral("+2 CONT Agnes Ashworth\tWife"), QStringLiteral("+1 NOTE Enumerator's district 5"),
-                          QStringLiteral("+1 CHAN")}
-            + stamp;
-        QCOMPARE(linediff(before, filelines(file)), expected);
+        QCOMPARE(linediff(before, file).join(QLatin1Char('\n')) + QLatin1Char('\n'),
+                 person(11, "28y", "20:31:58",
+                        "+1 OCCU Fustian Cutter\n+2 DATE 3 APR 1881\n+2 PLAC Hebden Bridge, Yorkshire, England\n"
+                        "+2 SOUR @S12@\n")
+                     + person(27, "26y", "20:33:12") + person(28, "2y", "20:34:01") + person(29, "1m", "20:35:26")
+                     + QStringLiteral("@ 0 @S11@ SOUR\n+0 @S12@ SOUR\n+1 TITL Census 1881 Hebden Bridge, Yorkshire, "
+                                      "England RG11/4426/52 (William Ashworth)\n+1 _TYPE Census\n+1 TEXT William "
+                                      "Ashworth\tHead\n+2 CONT Agnes Ashworth\tWife\n+1 NOTE Enumerator's district 5\n"
+                                      "+1 CHAN\n")
+                     + stamp);
+        QCOMPARE(filelines(s.logpath).join(QLatin1Char('\n')), QString(78, u'=') + QString::fromUtf8(R"x(
+Census entry added: 2026-12-04 13:05:09
+To Gedcom File: %1
+Source created: Census 1881 Hebden Bridge, Yorkshire, England RG11/4426/52 (William Ashworth) (ID: 12)
 
-        QCOMPARE(filelines(s.logpath),
-                 (QStringList{QString(78, u'='), QStringLiteral("Census entry added: 2026-12-04 13:05:09"),
-                              QStringLiteral("To Gedcom File: ") + QDir::toNativeSeparators(file),
-                              QStringLiteral("Source created: Census 1881 Hebden Bridge, Yorkshire, England RG11/4426/52 "
-                                             "(William Ashworth) (ID: 12)"),
-                              QString(), QStringLiteral("Individual records changed (linked to source above): "),
-                              QStringLiteral("Name: Ashworth, William (11) : created census event and occupation "
-                                             "attribute (Fustian Cutter)"),
-                              QStringLiteral("Name: Schröder, Agnes (27) : created census event"),
-                              QStringLiteral("Name: Ashworth, John (28) : created census event"),
-                              QStringLiteral("Name: Ashworth, Frederick (29) : created census event")}));
+Individual records changed (linked to source above): 
+Name: Ashworth, William (11) : created census event and occupation attribute (Fustian Cutter)
+Name: Schröder, Agnes (27) : created census event
+Name: Ashworth, John (28) : created census event
+Name: Ashworth, Frederick (29) : created census event)x").arg(QDir::toNativeSeparators(file)));
 
         // The form is cleared for the next entry and the file read again.
         QCOMPARE(w.household().selectioncount, 0);
@@ -287,7 +238,7 @@ private slots:
     void existingsource()
     {
         const QString file = files_.sample();
-        const QStringList before = filelines(file);
+        const QString before = snapshot(file);
         settings s = testsettings();
         s.fullentry = false;
         auto run = opened(file, s);
@@ -319,39 +270,29 @@ private slots:
 
         // The census events cite source 7 where the entry is within it, with
         // the census day and the source text; the source itself is unchanged.
-        const auto citation = [](const char* age) {
-            return QStringList{QStringLiteral("+1 CENS"), QStringLiteral("+2 DATE 3 APR 1881"),
-                               QStringLiteral("+2 PLAC Hebden Bridge, Yorkshire, England"),
-                               QStringLiteral("+2 ADDR 27 Hangingroyd Lane"), QStringLiteral("+2 AGE ") + QLatin1String(age),
-                               QStringLiteral("+2 SOUR @S7@"), QStringLiteral("+3 PAGE RG11/4426/88 p 23"),
-                               QStringLiteral("+3 DATA"), QStringLiteral("+4 DATE 3 APR 1881"),
-                               QStringLiteral("+4 TEXT William Ashworth\tHead"),
-                               QStringLiteral("+5 CONT Agnes Ashworth\tWife")};
+        const auto person = [](int id, const char* age, const char* time, const char* occupation) {
+            const QString cited = QStringLiteral("+2 SOUR @S7@\n+3 PAGE RG11/4426/88 p 23\n+3 DATA\n+4 DATE 3 APR 1881\n");
+            return QStringLiteral("@ 0 @I%1@ INDI\n+1 CENS\n+2 DATE 3 APR 1881\n+2 PLAC Hebden Bridge, Yorkshire, England\n"
+                                  "+2 ADDR 27 Hangingroyd Lane\n+2 AGE %2\n%5+4 TEXT William Ashworth\tHead\n"
+                                  "+5 CONT Agnes Ashworth\tWife\n%3@ 0 @I%1@ INDI\n-2 DATE 11 NOV 2023\n-3 TIME %4\n"
+                                  "+2 DATE 04 DEC 2026\n+3 TIME 13:05:09\n")
+                .arg(id)
+                .arg(QLatin1String(age), *occupation ? QStringLiteral("+1 OCCU %1\n+2 DATE 3 APR 1881\n+2 PLAC Hebden "
+                                                                      "Bridge, Yorkshire, England\n").arg(QLatin1String(occupation)) + cited
+                                                     : QString(),
+                     QLatin1String(time), cited);
         };
-        const QStringList stamp = {QStringLiteral("+2 DATE 04 DEC 2026"), QStringLiteral("+3 TIME 13:05:09")};
-        const QStringList expected =
-            QStringList{QStringLiteral("@ 0 @I11@ INDI")} + citation("28y")
-            + QStringList{QStringLiteral("@ 0 @I11@ INDI"), QStringLiteral("-2 DATE 11 NOV 2023"),
-                          QStringLiteral("-3 TIME 20:31:58")}
-            + stamp + QStringList{QStringLiteral("@ 0 @I27@ INDI")}
-            + citation("26y")
-            + QStringList{QStringLiteral("+1 OCCU Weaver"), QStringLiteral("+2 DATE 3 APR 1881"),
-                          QStringLiteral("+2 PLAC Hebden Bridge, Yorkshire, England"), QStringLiteral("+2 SOUR @S7@"),
-                          QStringLiteral("+3 PAGE RG11/4426/88 p 23"), QStringLiteral("+3 DATA"),
-                          QStringLiteral("+4 DATE 3 APR 1881"), QStringLiteral("@ 0 @I27@ INDI"),
-                          QStringLiteral("-2 DATE 11 NOV 2023"), QStringLiteral("-3 TIME 20:33:12")}
-            + stamp;
-        QCOMPARE(linediff(before, filelines(file)), expected);
-        QCOMPARE(filelines(s.logpath),
-                 (QStringList{QString(78, u'='), QStringLiteral("Census entry added: 2026-12-04 13:05:09"),
-                              QStringLiteral("To Gedcom File: ") + QDir::toNativeSeparators(file),
-                              QStringLiteral("Source referred to: Census 1881 Hebden Bridge RG11/4426/88 (John Ashworth) "
-                                             "(ID: 7)"),
-                              QStringLiteral("Where within source: RG11/4426/88 p 23"), QString(),
-                              QStringLiteral("Individual records changed (linked to source above): "),
-                              QStringLiteral("Name: Ashworth, William (11) : created census event"),
-                              QStringLiteral("Name: Schröder, Agnes (27) : created census event and occupation "
-                                             "attribute (Weaver)")}));
+        QCOMPARE(linediff(before, file).join(QLatin1Char('\n')) + QLatin1Char('\n'),
+                 person(11, "28y", "20:31:58", "") + person(27, "26y", "20:33:12", "Weaver"));
+        QCOMPARE(filelines(s.logpath).join(QLatin1Char('\n')), QString(78, u'=') + QString::fromUtf8(R"x(
+Census entry added: 2026-12-04 13:05:09
+To Gedcom File: %1
+Source referred to: Census 1881 Hebden Bridge RG11/4426/88 (John Ashworth) (ID: 7)
+Where within source: RG11/4426/88 p 23
+
+Individual records changed (linked to source above): 
+Name: Ashworth, William (11) : created census event
+Name: Schröder, Agnes (27) : created census event and occupation attribute (Weaver))x").arg(QDir::toNativeSeparators(file)));
         QCOMPARE(run->read("Count"), QStringLiteral("1"));
         QCOMPARE(w.household().selectioncount, 0);
         QVERIFY(p->sourceidlab->text().isEmpty());
@@ -466,7 +407,7 @@ private slots:
         QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/\r\n1 SEX M\r\n1 BIRT\r\n2 DATE 1879\r\n2 PLAC Hebden Bridge, "
                                     "Yorkshire, England\r\n",
                               "1 NAME John /Ashworth/\r\n1 SEX M\r\n"));
-        const QStringList before = filelines(file);
+        const QString before = snapshot(file);
         const settings s = testsettings();
         auto run = typedentry(file, s, 11, "28");
         QVERIFY(run);
@@ -508,7 +449,7 @@ private slots:
         QCOMPARE(dialogs.unexpected, 0);
         QCOMPARE(run->prompts.unexpected(), 0);
 
-        const QStringList diff = linediff(before, filelines(file));
+        const QStringList diff = linediff(before, file);
         const qsizetype at = diff.indexOf(QStringLiteral("@ 0 @I28@ INDI"));
         QVERIFY2(at >= 0, qPrintable(diff.join(QLatin1Char('\n'))));
         QCOMPARE(diff.mid(at + 1, 4),
@@ -718,7 +659,7 @@ private slots:
         const QString file = files_.generated(3000);
         if (file.isEmpty())
             QSKIP("the family file generator did not run");
-        const QStringList before = filelines(file);
+        const QString before = snapshot(file);
         settings s = testsettings();
         s.birthdate = false;
         auto run = opened(file, s);
@@ -752,7 +693,7 @@ private slots:
         button(w, "addbut")->click();
         QCOMPARE(dialogs.seen, QStringList());
         QCOMPARE(run->prompts.unexpected(), 0);
-        const QStringList diff = linediff(before, filelines(file));
+        const QStringList diff = linediff(before, file);
         QCOMPARE(diff.count(QStringLiteral("+1 CENS")), 2);
         QCOMPARE(diff.filter(QStringLiteral("BIRT")), QStringList());
         QCOMPARE(diff.count(QStringLiteral("+2 PLAC Quillby, Testshire")), 2);
