@@ -26,6 +26,7 @@
 #include <QTextCursor>
 
 #include <cmath>
+#include <functional>
 #include <QToolButton>
 
 using namespace qm;
@@ -83,6 +84,15 @@ QStringList linediff(const QString& before, const QString& after)
 QPushButton* button(mainfrm& w, const char* name)
 {
     return w.findChild<QPushButton*>(QString::fromLatin1(name));
+}
+
+// Clicks Save expecting exactly this message, answered with a.
+void savewith(session& run, answer a, const char* message)
+{
+    run.prompts.expect(a, QString::fromUtf8(message));
+    button(*run.w, "addbut")->click();
+    QCOMPARE(run.prompts.unexpected(), 0);
+    QCOMPARE(run.prompts.history().back().m.text, QString::fromUtf8(message));
 }
 
 } // namespace
@@ -299,7 +309,8 @@ Name: Schröder, Agnes (27) : created census event and occupation attribute (Wea
         QCOMPARE(p->sourcecom->currentIndex(), -1);
     }
 
-    // The save's checks, each in its turn, with nothing written.
+    // The save's checks, each in its turn, with nothing written: what is left
+    // out, the message, and where the focus goes.
     void checksintheirorder()
     {
         const QString file = files_.sample();
@@ -308,72 +319,53 @@ Name: Schröder, Agnes (27) : created census event and occupation attribute (Wea
         auto run = opened(file, s);
         QVERIFY(run);
         mainfrm& w = *run->w;
-        scriptedprompts& prompts = run->prompts;
         entrypanel* p = w.panel();
-        QPushButton* save = button(w, "addbut");
-        const auto lastmessage = [&] { return prompts.history().back().m.text; };
-
-        prompts.expect(answer::ok, QStringLiteral("The census entry must refer to at least 1 person!"));
-        save->click();
-
-        chooseyear(w, QStringLiteral("1881"));
-        clickid(w, peoplelist(w), 11);
-        prompts.expect(answer::ok, QStringLiteral("You must first enter an age for this individual"));
-        save->click();
-        typerow(w, 0, QStringLiteral("28"));
-
-        prompts.expect(answer::ok, QStringLiteral("Location must be specified"));
-        save->click();
-        QCOMPARE(QApplication::focusWidget(), p->locationtxt);
-
-        p->locationtxt->setText(QStringLiteral("  Leeds "));
-        p->titletxt->setText(QStringLiteral(" Census 1881 ")); // 11 characters once trimmed
-        prompts.expect(answer::ok, QStringLiteral("You must provide a full title for the entry"));
-        save->click();
-        QCOMPARE(QApplication::focusWidget(), p->titletxt);
-
-        p->titletxt->setText(QStringLiteral("Census 1881L")); // 12 are enough
-        p->yearcom->setCurrentIndex(-1);
-        prompts.expect(answer::ok, QStringLiteral("You must select a census year from the list"));
-        save->click();
-        QCOMPARE(lastmessage(), QStringLiteral("You must select a census year from the list"));
-
-        chooseyear(w, QStringLiteral("1881"));
-        p->fixeddatetxt->setText(QStringLiteral("31 FEB 1881"));
-        prompts.expect(answer::ok, QStringLiteral("Invalid date - reselect the year from the list box above to reset "
-                                                  "to original value"));
-        save->click();
-        QCOMPARE(QApplication::focusWidget(), p->fixeddatetxt);
-
-        // An empty date is no date either.
-        p->fixeddatetxt->setText(QString());
-        prompts.expect(answer::ok, QStringLiteral("Invalid date - reselect the year from the list box above to reset "
-                                                  "to original value"));
-        save->click();
-        QCOMPARE(QApplication::focusWidget(), p->fixeddatetxt);
-
-        // A date typed is checked and written the GEDCOM way on leaving the box.
-        p->fixeddatetxt->setFocus();
-        QTest::keyClicks(p->fixeddatetxt, QStringLiteral("4 apr 1881"));
-        p->addresstxt->setFocus();
-        QCOMPARE(p->fixeddatetxt->text(), QStringLiteral("04 APR 1881"));
-        p->fixeddatetxt->setText(QStringLiteral("3 APR 1881"));
-        p->texttxt->setPlainText(QStringLiteral(" ab "));
-        prompts.expect(answer::no, QStringLiteral("The Source Text hasn't been filled in. Are you sure you want to "
-                                                  "save this census record without entering this information?"));
-        save->click();
-        QCOMPARE(prompts.history().back().m.title, QStringLiteral("Save census"));
-        QCOMPARE(prompts.history().back().m.defaultanswer, answer::no);
-        QCOMPARE(prompts.history().back().m.kind, icon::question);
-
-        QCOMPARE(prompts.unexpected(), 0);
+        const char* invaliddate = "Invalid date - reselect the year from the list box above to reset to original value";
+        const struct {
+            std::function<void()> before;
+            const char* message;
+            QWidget* focus;
+            answer reply = answer::ok;
+        } steps[] = {
+            {[] {}, "The census entry must refer to at least 1 person!", nullptr},
+            {[&] { chooseyear(w, QStringLiteral("1881")), clickid(w, peoplelist(w), 11); },
+             "You must first enter an age for this individual", nullptr},
+            {[&] { typerow(w, 0, QStringLiteral("28")); }, "Location must be specified", p->locationtxt},
+            {[&] {
+                 p->locationtxt->setText(QStringLiteral("  Leeds "));
+                 p->titletxt->setText(QStringLiteral(" Census 1881 ")); // 11 characters once trimmed
+             },
+             "You must provide a full title for the entry", p->titletxt},
+            {[&] { p->titletxt->setText(QStringLiteral("Census 1881L")), p->yearcom->setCurrentIndex(-1); },
+             "You must select a census year from the list", nullptr},
+            {[&] { chooseyear(w, QStringLiteral("1881")), p->fixeddatetxt->setText(QStringLiteral("31 FEB 1881")); },
+             invaliddate, p->fixeddatetxt},
+            {[&] { p->fixeddatetxt->setText(QString()); }, invaliddate, p->fixeddatetxt}, // no date is no date either
+            {[&] {
+                 // A date typed is checked and written the GEDCOM way on leaving the box.
+                 p->fixeddatetxt->setFocus();
+                 QTest::keyClicks(p->fixeddatetxt, QStringLiteral("4 apr 1881"));
+                 p->addresstxt->setFocus();
+                 QCOMPARE(p->fixeddatetxt->text(), QStringLiteral("04 APR 1881"));
+                 p->texttxt->setPlainText(QStringLiteral(" ab "));
+             },
+             "The Source Text hasn't been filled in. Are you sure you want to save this census record without "
+             "entering this information?",
+             nullptr, answer::no},
+        };
+        for (const auto& step : steps) {
+            step.before();
+            savewith(*run, step.reply, step.message);
+            if (step.focus)
+                QCOMPARE(QApplication::focusWidget(), step.focus);
+        }
+        const message& last = run->prompts.history().back().m;
+        QVERIFY(last.title == QStringLiteral("Save census") && last.defaultanswer == answer::no && last.kind == icon::question);
         QCOMPARE(readfile(file), bytes);
         QVERIFY(backups(s).isEmpty());
         QCOMPARE(run->read("Count"), QString());
-        // The form is as it was typed.
-        QCOMPARE(w.household().selectioncount, 1);
+        QCOMPARE(w.household().selectioncount, 1); // the form is as it was typed
         QCOMPARE(p->locationtxt->text(), QStringLiteral("  Leeds "));
-        QCOMPARE(p->texttxt->toPlainText(), QStringLiteral(" ab "));
         QVERIFY(w.watching());
 
         // Citing an existing source: the where-within-source text and the source.
@@ -381,20 +373,16 @@ Name: Schröder, Agnes (27) : created census event and occupation attribute (Wea
         cite.fullentry = false;
         auto other = opened(files_.sample(), cite);
         QVERIFY(other);
-        mainfrm& v = *other->w;
-        entrypanel* q = v.panel();
-        chooseyear(v, QStringLiteral("1881"));
-        clickid(v, peoplelist(v), 11);
-        typerow(v, 0, QStringLiteral("28"));
+        entrypanel* q = other->w->panel();
+        chooseyear(*other->w, QStringLiteral("1881"));
+        clickid(*other->w, peoplelist(*other->w), 11);
+        typerow(*other->w, 0, QStringLiteral("28"));
         q->locationtxt->setText(QStringLiteral("Leeds"));
         q->wherewithinsourcetxt->setText(QStringLiteral("ab  "));
-        other->prompts.expect(answer::ok, QStringLiteral("You must enter the text for the 'Where within Source' entry"));
-        button(v, "addbut")->click();
+        savewith(*other, answer::ok, "You must enter the text for the 'Where within Source' entry");
         QCOMPARE(QApplication::focusWidget(), q->wherewithinsourcetxt);
         q->wherewithinsourcetxt->setText(QStringLiteral("abc"));
-        other->prompts.expect(answer::ok, QStringLiteral("You must select a source from the drop-down list"));
-        button(v, "addbut")->click();
-        QCOMPARE(other->prompts.unexpected(), 0);
+        savewith(*other, answer::ok, "You must select a source from the drop-down list");
         QVERIFY(backups(cite).isEmpty());
     }
 
