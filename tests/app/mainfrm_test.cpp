@@ -434,18 +434,10 @@ private slots:
         QCOMPARE(s->prompts.unexpected(), 0);
 
         // A chosen individual deleted in the other program: the rows are cleared.
-        {
-            QFile f(file);
-            QVERIFY(f.open(QIODevice::ReadOnly));
-            QByteArray b = f.readAll();
-            f.close();
-            const qsizetype from = b.indexOf("0 @I29@ INDI");
-            const qsizetype to = b.indexOf("\n0 @", from) + 1;
-            QVERIFY(from > 0 && to > from);
-            b.remove(from, to - from);
-            QVERIFY(f.open(QIODevice::WriteOnly | QIODevice::Truncate));
-            f.write(b);
-        }
+        QVERIFY(editfile(file, [](QByteArray& b) {
+            const qsizetype from = b.indexOf("0 @I29@ INDI"), to = b.indexOf("\n0 @", from) + 1;
+            return from > 0 && to > from && !b.remove(from, to - from).isEmpty();
+        }));
         s->prompts.expect(answer::ok, QStringLiteral("has been modified by another application"));
         s->prompts.expect(answer::ok, QStringLiteral("At least one of the individuals already selected appears to no "
                                                      "longer be in your file following changes made in another "
@@ -468,21 +460,11 @@ private slots:
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1881"));
-        QTest::keyClicks(w.panel()->locationtxt, QStringLiteral("Hebden Bridge, Yorkshire, England"));
         w.panel()->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
         QTest::keyClicks(w.panel()->addresstxt, QStringLiteral("27 Hangingroyd Lane"));
         QTest::keyClicks(w.panel()->referencetxt, QStringLiteral("RG11/4426/52"));
         QTest::keyClicks(w.panel()->othertxt, QStringLiteral("William Ashworth"));
-        const struct {
-            int32_t id;
-            const char* age;
-            const char* occupation;
-        } household[] = {{11, "28", "Fustian Cutter"}, {27, "26", ""}, {28, "2", ""}};
-        for (const auto& h : household) {
-            clickid(w, peoplelist(w), h.id);
-            typerow(w, w.household().selectioncount - 1, QString::fromLatin1(h.age), QString(),
-                    QString::fromLatin1(h.occupation));
-        }
+        typehousehold(w, {{11, "28", "Fustian Cutter"}, {27, "26"}, {28, "2"}});
         QTest::keyClicks(w.panel()->texttxt, QStringLiteral("William Ashworth\tHead\tMar\t28\tFustian Cutter"));
         w.panel()->texttxt->setPlainText(w.panel()->texttxt->toPlainText());
         QApplication::processEvents();

@@ -501,17 +501,7 @@ Name: Schröder, Agnes (27) : created census event and occupation attribute (Wea
         QPushButton* autotext = button(w, "Autosourcebut");
         QVERIFY(!autotext->isEnabled());
         chooseyear(w, QStringLiteral("1891"));
-        const struct {
-            int32_t id;
-            const char* age;
-            const char* occupation;
-        } household[] = {{3, "60", "Dyer's Labourer"}, {9, "58", ""}, {15, "24", "Fustian Cutter"},
-                         {16, "20", ""}, {2, "79", ""}, {4, "57", ""}};
-        for (const auto& h : household) {
-            clickid(w, peoplelist(w), h.id);
-            typerow(w, w.household().selectioncount - 1, QString::fromLatin1(h.age), QString(),
-                    QString::fromLatin1(h.occupation));
-        }
+        typehousehold(w, {{3, "60", "Dyer's Labourer"}, {9, "58"}, {15, "24", "Fustian Cutter"}, {16, "20"}, {2, "79"}, {4, "57"}});
         QVERIFY(autotext->isEnabled());
         p->texttxt->setPlainText(QStringLiteral("replaced"));
         autotext->click();

@@ -175,19 +175,35 @@ inline void typerow(qm::mainfrm& w, int r, const QString& age, const QString& un
     QTest::keyClicks(rowcontrols<QLineEdit>(w, "occtxt")[r], occupation);
 }
 
-inline bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
+// Changes the file's bytes by `edit`, which says whether it found what to change.
+inline bool editfile(const QString& path, const std::function<bool(QByteArray&)>& edit)
 {
     QFile f(path);
     if (!f.open(QIODevice::ReadOnly))
         return false;
     QByteArray b = f.readAll();
     f.close();
-    if (!b.contains(from))
-        return false;
-    b.replace(from, to);
-    if (!f.open(QIODevice::WriteOnly | QIODevice::Truncate))
-        return false;
-    return f.write(b) == b.size();
+    return edit(b) && f.open(QIODevice::WriteOnly | QIODevice::Truncate) && f.write(b) == b.size();
+}
+
+inline bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
+{
+    return editfile(path, [&](QByteArray& b) { return b.contains(from) && !b.replace(from, to).isEmpty(); });
+}
+
+// Chooses each of a household in the people list and types its row.
+struct member {
+    int32_t id;
+    const char* age;
+    const char* occupation = "";
+};
+inline void typehousehold(qm::mainfrm& w, std::initializer_list<member> household)
+{
+    for (const member& m : household) {
+        clickid(w, peoplelist(w), m.id);
+        typerow(w, w.household().selectioncount - 1, QString::fromLatin1(m.age), QString(),
+                QString::fromLatin1(m.occupation));
+    }
 }
 
 // Answers the program's own modal dialogs (those not shown through the
