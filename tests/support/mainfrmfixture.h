@@ -186,6 +186,17 @@ inline bool editfile(const QString& path, const std::function<bool(QByteArray&)>
     return edit(b) && f.open(QIODevice::WriteOnly | QIODevice::Truncate) && f.write(b) == b.size();
 }
 
+// Types text into a box, tabs and line ends as the Tab and Return keys.
+inline void typetext(QWidget* box, const QString& text)
+{
+    for (const QChar c : text) {
+        if (c == u'\t' || c == u'\n')
+            QTest::keyClick(box, c == u'\t' ? Qt::Key_Tab : Qt::Key_Return);
+        else
+            QTest::keyClicks(box, QString(c));
+    }
+}
+
 inline bool replaceinfile(const QString& path, const QByteArray& from, const QByteArray& to)
 {
     return editfile(path, [&](QByteArray& b) { return b.contains(from) && !b.replace(from, to).isEmpty(); });
