@@ -1,11 +1,6 @@
 #pragma once
-// Helpers for the end-to-end tests of the main window: one run of the program
-// (scripted prompts, settings store on an INI file, the window), finding the
-// census row controls, clicking individuals in the lists, choosing a year,
-// answering the window's own modal dialogs.
-//
-// Header only: the window tests link the windows library, the logic tests
-// (which share tests/support) do not.
+// Helpers for the end-to-end tests of the main window. Header only: the logic
+// tests, which link tests/support/*.cpp, do not link the windows library.
 
 #include "app/mainfrm.h"
 #include "census/censusrows_ui.h"
@@ -81,7 +76,20 @@ public:
     // A window started on `file` from the command line (with settings s when
     // given), the default-file question answered No; shown, so that lists can
     // be clicked.
-    std::unique_ptr<session> opened(const QString& file, const qm::settings* s = nullptr);
+    std::unique_ptr<session> opened(const QString& file, const qm::settings* s = nullptr)
+    {
+        auto r = std::make_unique<session>(ini());
+        if (s) {
+            qm::savesettings(*r->store, *s);
+            qm::saveflagsettings(*r->store, *s);
+        }
+        r->make();
+        r->prompts.expect(qm::answer::no, QStringLiteral("by default"));
+        if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
+            return nullptr;
+        r->w->show();
+        return QTest::qWaitForWindowExposed(r->w.get()) ? std::move(r) : nullptr;
+    }
 
 private:
     QTemporaryDir dir_;
@@ -146,23 +154,6 @@ inline QStringList shownnames(qm::mainfrm& w)
     while (!out.isEmpty() && out.back().isEmpty())
         out.removeLast();
     return out;
-}
-
-inline std::unique_ptr<session> windowfiles::opened(const QString& file, const qm::settings* s)
-{
-    auto r = std::make_unique<session>(ini());
-    if (s) {
-        qm::savesettings(*r->store, *s);
-        qm::saveflagsettings(*r->store, *s);
-    }
-    r->make();
-    r->prompts.expect(qm::answer::no, QStringLiteral("by default"));
-    if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
-        return nullptr;
-    r->w->show();
-    if (!QTest::qWaitForWindowExposed(r->w.get()))
-        return nullptr;
-    return r;
 }
 
 // Types into the age, unit and occupation boxes of the census row r.
