@@ -60,7 +60,7 @@ struct personrec {
 struct sourcerec {
     int32_t id = 0;
     std::string_view title; // first TITL or ABBR, trimmed
-    std::vector<int32_t> objectids; // "1 OBJE @O" links, in file order
+    indexlist<int32_t> objectids;   // "1 OBJE @O" links, in file order
     bool iscensus = false;          // that first TITL/ABBR line mentions "census"
     std::string censusdate;         // filled when images are attached to existing sources
     bool censusdatesought = false;

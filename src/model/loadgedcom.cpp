@@ -220,6 +220,7 @@ private:
     // The current individual's lists, gathered here and moved into the arena
     // at the end of the record, each as one piece of its exact size.
     std::vector<int32_t> fams_, sourceids_, flagids_;
+    std::vector<int32_t> objectids_; // of the current source
     std::vector<censusrec> census_;
     std::vector<int32_t> censuscites_;      // citations of all its census events, in order
     std::vector<size_t> censuscitestart_;   // where each event's citations start
@@ -410,6 +411,8 @@ void loader::newperson()
 
 void loader::endrecord()
 {
+    if (kind_ == kind::source)
+        putlist(ix_.sources.back().objectids, objectids_);
     if (kind_ != kind::person)
         return;
     personrec& p = person();
@@ -443,7 +446,7 @@ void loader::sourceline(std::string_view s)
             ix_.censussources.push_back(static_cast<int32_t>(ix_.sources.size() - 1));
         }
     } else if (startswith(s, "1 OBJE @O")) {
-        r.objectids.push_back(numberat(s, 9));
+        objectids_.push_back(numberat(s, 9));
     }
 }
 
