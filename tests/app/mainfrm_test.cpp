@@ -212,6 +212,7 @@ private slots:
 
         // The wife, from the immediate family list.
         const int wife = rowofid(w, familylist(w), 27);
+        QVERIFY(wife >= 0);
         QVERIFY(static_cast<peoplelistmodel*>(familylist(w)->model())->textat(wife).startsWith(QStringLiteral("WED ")));
         clickrow(familylist(w), wife);
         QCOMPARE(shownnames(w).size(), 2);
