@@ -68,6 +68,16 @@ size_t utf8seq(std::string_view s, size_t i, char32_t* cp)
 
 } // namespace
 
+char32_t nextcodepoint(std::string_view utf8, size_t i, size_t* len)
+{
+    char32_t cp;
+    *len = utf8seq(utf8, i, &cp);
+    if (*len)
+        return cp;
+    *len = 1;
+    return cp1252tounicode(static_cast<unsigned char>(utf8[i]));
+}
+
 const char* encodingname(textencoding enc)
 {
     switch (enc) {

@@ -52,6 +52,11 @@ char32_t cp1252tounicode(unsigned char b);
 // Windows-1252 byte of a code point, or -1 when the code page has none.
 int unicodetocp1252(char32_t cp);
 
+// The code point of the character at utf8[i] and the number of bytes it
+// takes. A byte that does not start a valid UTF-8 sequence is taken as the
+// Windows-1252 character it would be, one byte long, so that nothing is lost.
+char32_t nextcodepoint(std::string_view utf8, size_t i, size_t* len);
+
 // Encodes UTF-8 text for a line of a file in encoding enc (for UTF-16 files:
 // into UTF-8, which the line writer turns into UTF-16). Returns false and sets
 // *bad to the first character the encoding cannot hold.

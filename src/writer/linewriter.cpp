@@ -48,40 +48,8 @@ const writefault& currentwritefault()
 void appendutf16(std::string_view s, bool be, std::string& out)
 {
     for (size_t i = 0; i < s.size();) {
-        const auto b0 = static_cast<unsigned char>(s[i]);
-        char32_t cp = 0;
         size_t len = 0;
-        if (b0 < 0x80) {
-            cp = b0;
-            len = 1;
-        } else {
-            size_t need = 0;
-            if (b0 >= 0xC2 && b0 <= 0xDF) {
-                need = 2;
-                cp = b0 & 0x1F;
-            } else if (b0 >= 0xE0 && b0 <= 0xEF) {
-                need = 3;
-                cp = b0 & 0x0F;
-            } else if (b0 >= 0xF0 && b0 <= 0xF4) {
-                need = 4;
-                cp = b0 & 0x07;
-            }
-            bool good = need > 0 && i + need <= s.size();
-            for (size_t k = 1; good && k < need; ++k) {
-                const auto b = static_cast<unsigned char>(s[i + k]);
-                good = (b & 0xC0) == 0x80;
-                cp = (cp << 6) | (b & 0x3F);
-            }
-            if (good && ((need == 3 && (cp < 0x800 || (cp >= 0xD800 && cp <= 0xDFFF)))
-                         || (need == 4 && (cp < 0x10000 || cp > 0x10FFFF))))
-                good = false;
-            if (good) {
-                len = need;
-            } else {
-                cp = cp1252tounicode(b0);
-                len = 1;
-            }
-        }
+        char32_t cp = nextcodepoint(s, i, &len);
         if (cp >= 0x10000) {
             cp -= 0x10000;
             put16(static_cast<char16_t>(0xD800 + (cp >> 10)), be, out);
