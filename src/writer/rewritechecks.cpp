@@ -1,8 +1,7 @@
 #include "writer/rewritechecks.h"
 
+#include "model/dates.h"
 #include "platform/clock.h"
-
-#include <cstdio>
 
 namespace qm {
 
@@ -68,20 +67,12 @@ QString checkflagnames(const gedcomindex& ix, const settings& s, const rewritere
 
 std::string gedcomtoday()
 {
-    static const char* const months[] = {"JAN", "FEB", "MAR", "APR", "MAY", "JUN",
-                                         "JUL", "AUG", "SEP", "OCT", "NOV", "DEC"};
-    const QDate d = now().date();
-    char buf[16];
-    std::snprintf(buf, sizeof buf, "%02d %s %04d", d.day(), months[(d.month() + 11) % 12], d.year());
-    return buf;
+    return u8(formatgedcomdate(now().date()));
 }
 
 std::string gedcomtimenow()
 {
-    const QTime t = now().time();
-    char buf[16];
-    std::snprintf(buf, sizeof buf, "%02d:%02d:%02d", t.hour(), t.minute(), t.second());
-    return buf;
+    return u8(formatgedcomtime(now().time()));
 }
 
 QString rewritefailuremessage(rewritemode mode, const QString& description)
