@@ -76,11 +76,6 @@ QString seriouscensuserror()
         "Serious Error - the year and country chosen are not supported by Quillmark - please contact the author");
 }
 
-QString referencefieldname(bool fullentry)
-{
-    return fullentry ? QStringLiteral("referencetxt") : QStringLiteral("wherewithinsourcetxt");
-}
-
 censusfound findcensus(const censuschoice& choice)
 {
     censusfound r;

@@ -41,7 +41,7 @@ struct censuschoice {
     QString country;       // setting "Country"
     bool autoreference = false; // setting "Auto Reference"
     bool fullentry = true;      // setting "Full Entry": decides the reference field
-    QString referencetext; // text of the reference field (referencefieldname(fullentry))
+    QString referencetext; // text of the reference field
     QString lastrefprefix; // the prefix the form last filled in; empty at start
 };
 
@@ -55,10 +55,6 @@ struct censusfound {
     int cursor = 0;
     QString lastrefprefix; // the form's lastrefprefix after the choice
 };
-
-// The control that takes the reference prefix: "referencetxt" when each entry
-// makes its own source, "wherewithinsourcetxt" when an existing one is cited.
-QString referencefieldname(bool fullentry);
 
 censusfound findcensus(const censuschoice& choice);
 

@@ -40,11 +40,6 @@ void setwritefaultfortests(const writefault& fault)
     faultstate() = fault;
 }
 
-const writefault& currentwritefault()
-{
-    return faultstate();
-}
-
 void appendutf16(std::string_view s, bool be, std::string& out)
 {
     for (size_t i = 0; i < s.size();) {

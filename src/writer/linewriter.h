@@ -32,10 +32,8 @@ struct writefault {
     bool failopen = false;        // the temporary file cannot be created
     int64_t failafterbytes = -1;  // the device takes this many bytes, then every write fails
     bool failcommit = false;      // the final replace fails
-    bool active() const { return failopen || failafterbytes >= 0 || failcommit; }
 };
 void setwritefaultfortests(const writefault& fault);
-const writefault& currentwritefault();
 
 class linewriter {
 public:
