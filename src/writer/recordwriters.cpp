@@ -61,6 +61,15 @@ int32_t writeobjectrecords(linewriter& out, const std::vector<imagechoice>& imag
     return maxobjectid;
 }
 
+void writeimagelinks(linewriter& out, const std::vector<imagechoice>& images, const settings& s)
+{
+    for (const imagechoice& img : images) {
+        out.writetext("1 OBJE @O" + std::to_string(img.objectid) + "@");
+        if (img.isnew && s.asid)
+            out.writetext("2 _ASID 1");
+    }
+}
+
 void writesourcerecord(linewriter& out, const censusentry& entry, const settings& s)
 {
     out.writetext("0 @S" + oneline(entry.sourceid) + "@ SOUR");
@@ -78,13 +87,8 @@ void writesourcerecord(linewriter& out, const censusentry& entry, const settings
     writemultiline(out, u8(entry.sourcetext), s.sourcenote && !hasnote ? "1 NOTE " : "1 TEXT ", "2 CONT ");
     if (hasnote)
         writemultiline(out, u8(entry.notetext), "1 NOTE ", "2 CONT ");
-    if (s.fullentry) {
-        for (const imagechoice& img : entry.chosenimages) {
-            out.writetext("1 OBJE @O" + std::to_string(img.objectid) + "@");
-            if (img.isnew && s.asid)
-                out.writetext("2 _ASID 1");
-        }
-    }
+    if (s.fullentry)
+        writeimagelinks(out, entry.chosenimages, s);
     writechangestamp(out);
 }
 

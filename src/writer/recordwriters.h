@@ -34,6 +34,10 @@ void writechangestamp(linewriter& out);
 int32_t writeobjectrecords(linewriter& out, const std::vector<imagechoice>& images, const settings& s,
                            int32_t maxobjectid);
 
+// A source's links to its images: "1 OBJE @O<n>@" for each, with "2 _ASID 1"
+// under a new image when that setting is on.
+void writeimagelinks(linewriter& out, const std::vector<imagechoice>& images, const settings& s);
+
 // The SOUR record of a full census entry.
 void writesourcerecord(linewriter& out, const censusentry& entry, const settings& s);
 

@@ -98,7 +98,6 @@ private:
     void iteration();
     void writecensusblock(const selectionrec& who);
     void writecitation(citekind kind);
-    void writeimagelinks();
     void dateline(std::string_view t);
     void occupationdate(std::string_view t);
     void flagblock(std::string_view t);
@@ -291,7 +290,8 @@ void rewriterun::iteration()
 
     // B: image links at the end of the source being extended.
     if (mode_ == rewritemode::attachimages && sourcefound_ && (startswith(t, "1 CHAN") || startswith(t, "0"))) {
-        writeimagelinks();
+        writeimagelinks(out_, e_.chosenimages, s_);
+        res_.linksadded += static_cast<int32_t>(e_.chosenimages.size());
         sourcefound_ = false;
         recordchanged_ = true;
     }
@@ -509,16 +509,6 @@ void rewriterun::writecitation(citekind kind)
         if (hasnotetext_)
             text += "\r\n" + notetext_;
         writemultiline(out_, text, "2 NOTE ", "3 CONT ");
-    }
-}
-
-void rewriterun::writeimagelinks()
-{
-    for (const imagechoice& img : e_.chosenimages) {
-        out_.writetext("1 OBJE @O" + std::to_string(img.objectid) + "@");
-        if (img.isnew && s_.asid)
-            out_.writetext("2 _ASID 1");
-        ++res_.linksadded;
     }
 }
 
