@@ -6,6 +6,7 @@
 #include "platform/prompts.h"
 #include "settings/settings.h"
 
+#include <QDateTime>
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
@@ -17,9 +18,10 @@ namespace qm {
 
 namespace {
 
-QString stampnow()
+// The time part of a backup's name.
+QString backupstamp(const QDateTime& t)
 {
-    return now().toString(QStringLiteral("yyyy_MM_dd_HH_mm_ss"));
+    return t.toString(QStringLiteral("yyyy_MM_dd_HH_mm_ss"));
 }
 
 QString infolder(const QString& folder, const QString& name)
@@ -79,7 +81,7 @@ backupresult makebackup(const QString& familyfile, const QString& folder)
         r.error = backupfailedmessage();
         return r;
     }
-    const QString path = freebackuppath(folder, stampnow());
+    const QString path = freebackuppath(folder, backupstamp(now()));
     // A copy, not a move: the family file stays whole until its replacement is
     // complete on disk.
     if (!QFile::copy(familyfile, path) || !keeptime(path, original.modified)) {
@@ -145,8 +147,7 @@ void removeoldbackups(prompts& p, const QString& folder)
             const bool numeric = !number.isEmpty()
                 && std::all_of(number.begin(), number.end(), [](QChar c) { return c >= u'0' && c <= u'9'; });
             if (numeric) {
-                const QString renamed = freebackuppath(
-                    folder, info.lastModified().toString(QStringLiteral("yyyy_MM_dd_HH_mm_ss")));
+                const QString renamed = freebackuppath(folder, backupstamp(info.lastModified()));
                 if (QFile::rename(path, renamed)) {
                     path = renamed;
                     name = QFileInfo(renamed).fileName();
