@@ -320,9 +320,6 @@ bool mainfrm::start(const QStringList& arguments)
 
     const settingsload loaded = loadsettings(store_);
     settings_ = loaded.values;
-    // The options dialog that completes the settings comes with its own
-    // feature; until then the first start is only noted.
-    firststart_ = settings_.firststart;
     settitleandpanel();
     loadfile();
     clearentry();

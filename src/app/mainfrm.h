@@ -46,7 +46,7 @@ public:
     const settings& currentsettings() const { return settings_; }
     const recentfiles& recent() const { return recent_; }
     QString gedcomfile() const { return gedcomfile_; }
-    bool firststart() const { return firststart_; }
+    bool firststart() const { return settings_.firststart; }
     bool watching() const { return watchfile_; }
     entrypanel* panel() const; // the panel of the current source mode
 
@@ -130,7 +130,6 @@ private:
     settingsstore& store_;
 
     settings settings_;
-    bool firststart_ = false;
     std::unique_ptr<gedcomindex> index_;
     QString gedcomfile_;
     QString defaultfile_;
@@ -146,7 +145,6 @@ private:
     bool checking_ = false;
     bool reloading_ = false;
     int32_t findresult_ = -1;
-    bool fromfind_ = false;
     bool ending_ = false; // closing after a failed rewrite: no questions
     bool saving_ = false; // a save is running (a second click waits its turn)
 
