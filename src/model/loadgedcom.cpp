@@ -33,23 +33,6 @@ bool startswith(std::string_view s, const char (&prefix)[N])
     return s.size() >= N - 1 && std::memcmp(s.data(), prefix, N - 1) == 0;
 }
 
-bool asciionly(std::string_view s)
-{
-    const char* p = s.data();
-    size_t n = s.size();
-    uint64_t bits = 0;
-    while (n >= 8) {
-        uint64_t w;
-        std::memcpy(&w, p, 8);
-        bits |= w;
-        p += 8;
-        n -= 8;
-    }
-    while (n--)
-        bits |= static_cast<unsigned char>(*p++);
-    return (bits & 0x8080808080808080ULL) == 0;
-}
-
 std::string_view trim(std::string_view s)
 {
     while (!s.empty() && (s.front() == ' ' || s.front() == '\t'))
@@ -246,7 +229,7 @@ private:
 
 std::string_view loader::text(std::string_view raw)
 {
-    if (asciionly(raw))
+    if (isascii(raw))
         return ix_.arena.store(raw);
     conv_.clear();
     appendutf8(raw, enc_, conv_);
@@ -496,7 +479,7 @@ void loader::setname(std::string_view s)
     }
     std::string& n = conv_;
     n.clear();
-    const bool ascii = asciionly(value);
+    const bool ascii = isascii(value);
     const auto append = [&](std::string_view part) {
         if (ascii)
             n.append(part);
@@ -525,7 +508,7 @@ void loader::flagline(std::string_view s)
     if (space == std::string_view::npos)
         return;
     const auto convert = [this](std::string_view raw, std::string& out) {
-        if (asciionly(raw)) {
+        if (isascii(raw)) {
             out.assign(raw);
         } else {
             out.clear();
@@ -589,7 +572,7 @@ void loader::personline(std::string_view s)
         if (startswith(s, "2 PLAC")) {
             if (s.size() > 7) {
                 const std::string_view v = s.substr(7);
-                lastcensus().place = !lastplace_.empty() && lastplace_.size() == v.size() && asciionly(v)
+                lastcensus().place = !lastplace_.empty() && lastplace_.size() == v.size() && isascii(v)
                                          ? lastplace_
                                          : text(v);
             }
@@ -620,7 +603,7 @@ void loader::personline(std::string_view s)
     if (inbirthplace && startswith(s, "2 PLAC")) {
         if (s.size() >= 8) {
             const std::string_view v = s.substr(7);
-            p.birthplace = !lastplace_.empty() && lastplace_.size() == v.size() && asciionly(v) ? lastplace_ : text(v);
+            p.birthplace = !lastplace_.empty() && lastplace_.size() == v.size() && isascii(v) ? lastplace_ : text(v);
             p.hasbirthplace = true;
         }
         inbirthplace = inflags = incensus = false;
