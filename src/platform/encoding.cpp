@@ -169,17 +169,13 @@ bool fromutf8(std::string_view utf8, textencoding enc, std::string& out, char32_
         return true;
     }
     for (size_t i = 0; i < utf8.size();) {
-        char32_t cp;
-        size_t len = utf8seq(utf8, i, &cp);
-        if (!len) {
-            // Not UTF-8: take the byte as the Windows-1252 character it would be.
-            cp = cp1252tounicode(static_cast<unsigned char>(utf8[i]));
-            len = 1;
-        }
+        size_t len;
+        const char32_t cp = nextcodepoint(utf8, i, &len);
+        const int cp1252 = enc == textencoding::windows1252 ? unicodetocp1252(cp) : -1;
         if (enc == textencoding::utf8 || isutf16(enc)) {
             appendcodepoint(cp, out);
-        } else if (enc == textencoding::windows1252 && unicodetocp1252(cp) >= 0) {
-            out.push_back(static_cast<char>(unicodetocp1252(cp)));
+        } else if (cp1252 >= 0) {
+            out.push_back(static_cast<char>(cp1252));
         } else if (cp < 0x80) {
             out.push_back(static_cast<char>(cp));
         } else {
