@@ -30,11 +30,10 @@ std::unique_ptr<gedcomindex> loadgedcombytes(std::string_view bytes, const flagt
 QString nopeoplemessage();
 
 // Place table operations (the table is one entry per group, sorted ignoring case).
-// addplace and insertplace both count one more occurrence of a (UTF-8) name:
-// its group's count is raised, or a new group is inserted at its sorted place.
-// An empty name adds nothing.
-void addplace(gedcomindex& index, std::string_view name);
-void insertplace(gedcomindex& index, std::string_view name); // a place typed after the load
+// insertplace counts one more occurrence of a (UTF-8) name typed after the
+// load: its group's count is raised, or a new group is inserted at its sorted
+// place. An empty name adds nothing.
+void insertplace(gedcomindex& index, std::string_view name);
 int findplace(const gedcomindex& index, std::string_view name); // position of the group, or -1
 // Sorts places[low..high] (inclusive) by name ignoring case.
 void sortplaces(gedcomindex& index, size_t low, size_t high);

@@ -62,11 +62,6 @@ void insertplace(gedcomindex& index, std::string_view name)
     index.places.insert(index.places.begin() + static_cast<std::ptrdiff_t>(at), p);
 }
 
-void addplace(gedcomindex& index, std::string_view name)
-{
-    insertplace(index, name);
-}
-
 void sortplaces(gedcomindex& index, size_t low, size_t high)
 {
     auto& places = index.places;
