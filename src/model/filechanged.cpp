@@ -25,8 +25,8 @@ QString changedonsavemessage(const QString& path, bool imageschosen)
 {
     if (!imageschosen)
         return changedmessage(path);
-    return QDir::toNativeSeparators(path)
-        + QStringLiteral(" has been modified by another application and will be reloaded. As a precaution against data corruption any images you have chosen will need to be reselected when you click 'Save Changes' again. Please wait for the details to be reloaded...");
+    return changedmessage(path)
+        + QStringLiteral(" As a precaution against data corruption any images you have chosen will need to be reselected when you click 'Save Changes' again. Please wait for the details to be reloaded...");
 }
 
 } // namespace qm
