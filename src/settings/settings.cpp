@@ -186,11 +186,6 @@ const entry& entrynamed(const char* name)
     Q_UNREACHABLE();
 }
 
-QString flagtext(bool on)
-{
-    return on ? QStringLiteral("1") : QStringLiteral("0");
-}
-
 } // namespace
 
 QString defaulttitletemplate()
@@ -280,8 +275,8 @@ void savesettings(settingsstore& store, const settings& s)
 
 void saveflagsettings(settingsstore& store, const settings& s)
 {
-    store.write(QStringLiteral("Flag Use"), flagtext(s.flaguse));
-    store.write(QStringLiteral("Flag Check"), flagtext(s.flagcheck));
+    for (const char* name : {"Flag Use", "Flag Check"})
+        store.write(QLatin1String(name), textof(s, entrynamed(name)));
     store.sync();
 }
 
