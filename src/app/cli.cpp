@@ -18,6 +18,11 @@ int clifail(const QString& message)
     return clifailure;
 }
 
+void cliwarn(const QString& message)
+{
+    std::fputs(("quillmark-cli: warning: " + message.toStdString() + "\n").c_str(), stderr);
+}
+
 QString cliusage(const QString& name)
 {
     QString text = QStringLiteral("usage:\n");

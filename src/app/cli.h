@@ -38,6 +38,8 @@ constexpr int clifailure = 2;
 
 // Writes "quillmark-cli: " + message as one line on standard error and returns clifailure.
 int clifail(const QString& message);
+// Writes "quillmark-cli: warning: " + message as one line on standard error.
+void cliwarn(const QString& message);
 // Usage of one command (or of all when name is empty), for --help and mistakes.
 QString cliusage(const QString& name = QString());
 

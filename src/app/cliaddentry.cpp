@@ -233,7 +233,7 @@ int cliaddentry(QStringList args)
     const settings& s = cs->values;
     flagtable flagdefs;
     if (!loadflagdefs(*cs->store, flagdefs))
-        std::fputs(("quillmark-cli: warning: " + flagloaderrormessage().toStdString() + "\n").c_str(), stderr);
+        cliwarn(flagloaderrormessage());
 
     // The backup copy is made while the file loads: the copy is mostly the
     // kernel's and the disk's work, the load the processor's. The save road
@@ -328,7 +328,7 @@ int cliaddentry(QStringList args)
     if (!out.saved())
         return clifail(out.message);
     if (!out.logerror.isEmpty())
-        std::fputs(("quillmark-cli: warning: " + out.logerror.toStdString() + "\n").c_str(), stderr);
+        cliwarn(out.logerror);
 
     QJsonObject result;
     result.insert(QStringLiteral("backup"), QDir::toNativeSeparators(out.backuppath));

@@ -33,7 +33,7 @@ int clistats(QStringList args)
         return clifail(error);
     flagtable flagdefs;
     if (!loadflagdefs(*s->store, flagdefs))
-        std::fputs(("quillmark-cli: warning: " + flagloaderrormessage().toStdString() + "\n").c_str(), stderr);
+        cliwarn(flagloaderrormessage());
 
     loadresult r = loadgedcom(path, flagdefs);
     if (!r.index)
