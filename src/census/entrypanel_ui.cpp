@@ -1,9 +1,10 @@
 #include "census/entrypanel_ui.h"
 
+#include "census/backtab_ui.h"
+
 #include <QComboBox>
 #include <QGridLayout>
 #include <QHBoxLayout>
-#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QPlainTextEdit>
@@ -212,16 +213,13 @@ void entrypanel::settle(bool released)
 
 bool entrypanel::eventFilter(QObject* watched, QEvent* event)
 {
-    if (watched == texttxt && event->type() == QEvent::KeyPress) {
-        // Tab types a tab (the columns of a transcription); Shift+Tab leaves
-        // the box as in any other field.
-        const auto* key = static_cast<QKeyEvent*>(event);
-        if (key->key() == Qt::Key_Backtab
-            || (key->key() == Qt::Key_Tab && key->modifiers().testFlag(Qt::ShiftModifier))) {
-            focusNextPrevChild(false);
-            return true;
-        }
-    } else if (watched == dividerpic->handle(1) && event->type() == QEvent::MouseButtonRelease) {
+    // Tab types a tab (the columns of a transcription); Shift+Tab leaves the
+    // box as in any other field.
+    if (watched == texttxt && isbacktab(event)) {
+        focusNextPrevChild(false);
+        return true;
+    }
+    if (watched == dividerpic->handle(1) && event->type() == QEvent::MouseButtonRelease) {
         settle(true);
     }
     return QWidget::eventFilter(watched, event);

@@ -1,9 +1,10 @@
 #include "census/sourcetextfrm.h"
 
+#include "census/backtab_ui.h"
+
 #include <QFontDatabase>
 #include <QFontMetricsF>
 #include <QHBoxLayout>
-#include <QKeyEvent>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QVBoxLayout>
@@ -85,13 +86,9 @@ bool sourcetextfrm::eventFilter(QObject* watched, QEvent* event)
 {
     // Tab types a tab character (the plain text box does that itself);
     // Shift+Tab leaves the box as in any other field.
-    if (watched == sourcetxt_ && event->type() == QEvent::KeyPress) {
-        const auto* key = static_cast<QKeyEvent*>(event);
-        if (key->key() == Qt::Key_Backtab
-            || (key->key() == Qt::Key_Tab && key->modifiers().testFlag(Qt::ShiftModifier))) {
-            focusNextPrevChild(false);
-            return true;
-        }
+    if (watched == sourcetxt_ && isbacktab(event)) {
+        focusNextPrevChild(false);
+        return true;
     }
     return QDialog::eventFilter(watched, event);
 }
