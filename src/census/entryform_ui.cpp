@@ -32,19 +32,16 @@ namespace {
 
 // The text boxes hold lines ending in LF; the entry and the family file have
 // CR LF, as the command-line tool gives them too.
-QString withcrlf(QString text)
-{
-    text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
-    text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
-    text.replace(QLatin1Char('\n'), QLatin1String("\r\n"));
-    return text;
-}
-
 QString withlf(QString text)
 {
     text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
     text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
     return text;
+}
+
+QString withcrlf(const QString& text)
+{
+    return withlf(text).replace(QLatin1Char('\n'), QLatin1String("\r\n"));
 }
 
 } // namespace
