@@ -25,6 +25,16 @@ QListView* listview(QWidget* parent, const char* name, peoplelistmodel* model)
     v->setMinimumWidth(160);
     return v;
 }
+
+// A list is named after its caption, without the caption's colon.
+void setcaption(QLabel* label, QListView* list, const QString& caption)
+{
+    label->setText(caption);
+    QString name = caption;
+    if (name.endsWith(QLatin1Char(':')))
+        name.chop(1);
+    list->setAccessibleName(name);
+}
 } // namespace
 
 householdpanel::householdpanel(QWidget* parent) : QWidget(parent)
@@ -97,20 +107,12 @@ bool householdpanel::peoplelistshown() const
 
 void householdpanel::setpeoplecaption(const QString& caption)
 {
-    alllab->setText(caption);
-    QString name = caption;
-    if (name.endsWith(QLatin1Char(':')))
-        name.chop(1);
-    allpeoplelst->setAccessibleName(name);
+    setcaption(alllab, allpeoplelst, caption);
 }
 
 void householdpanel::setfamilycaption(const QString& caption)
 {
-    immediatefamilylab->setText(caption);
-    QString name = caption;
-    if (name.endsWith(QLatin1Char(':')))
-        name.chop(1);
-    familylst->setAccessibleName(name);
+    setcaption(immediatefamilylab, familylst, caption);
 }
 
 bool householdpanel::eventFilter(QObject* watched, QEvent* event)
