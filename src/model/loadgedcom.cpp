@@ -170,6 +170,12 @@ private:
 
     std::string_view text(std::string_view raw);
     std::string_view place(std::string_view raw);
+    // The text of the current "2 PLAC " value: the place's stored text when
+    // the value is that text as it stands (ASCII, nothing trimmed), else a copy.
+    std::string_view placetext(std::string_view v)
+    {
+        return !lastplace_.empty() && lastplace_.size() == v.size() && isascii(v) ? lastplace_ : text(v);
+    }
     std::string_view lookupplace(std::string_view raw, int32_t& groupout);
     void startrecord(std::string_view s);
     void endrecord();
@@ -570,12 +576,8 @@ void loader::personline(std::string_view s)
             return;
         }
         if (startswith(s, "2 PLAC")) {
-            if (s.size() > 7) {
-                const std::string_view v = s.substr(7);
-                lastcensus().place = !lastplace_.empty() && lastplace_.size() == v.size() && isascii(v)
-                                         ? lastplace_
-                                         : text(v);
-            }
+            if (s.size() > 7)
+                lastcensus().place = placetext(s.substr(7));
             return;
         }
         if (startswith(s, "2 AGE")) {
@@ -602,8 +604,7 @@ void loader::personline(std::string_view s)
     }
     if (inbirthplace && startswith(s, "2 PLAC")) {
         if (s.size() >= 8) {
-            const std::string_view v = s.substr(7);
-            p.birthplace = !lastplace_.empty() && lastplace_.size() == v.size() && isascii(v) ? lastplace_ : text(v);
+            p.birthplace = placetext(s.substr(7));
             p.hasbirthplace = true;
         }
         inbirthplace = inflags = incensus = false;
