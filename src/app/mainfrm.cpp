@@ -10,6 +10,7 @@
 #include "model/loadgedcom.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
+#include "writer/backups.h"
 #include "writer/maketitle.h"
 
 #include <QAction>
@@ -136,13 +137,26 @@ void mainfrm::buildmenus()
     item(help, "donatemen", QStringLiteral("Make a Donation..."));
     item(help, "aboutmen", QStringLiteral("&About Quillmark..."));
 
-    // The windows these open are added with their own features.
-    for (const char* name : {"viewlogmen", "clearlogmen", "removemen", "attachbut", "datecheckmen", "flagsmen",
-                             "optionsmen", "helpcreatingentrymen", "HelpIndexmen", "HelpSearchmen", "donatemen",
-                             "aboutmen"}) {
+    const auto on = [this](const char* name, void (mainfrm::*slot)()) {
         if (QAction* a = menuBar()->findChild<QAction*>(QString::fromLatin1(name)))
-            connect(a, &QAction::triggered, this, &mainfrm::comingsoon);
-    }
+            connect(a, &QAction::triggered, this, slot);
+    };
+    on("viewlogmen", &mainfrm::viewlog);
+    on("clearlogmen", &mainfrm::clearlogfile);
+    on("removemen", &mainfrm::removebackups);
+    on("attachbut", &mainfrm::attachimages);
+    on("datecheckmen", &mainfrm::censusdatecheck);
+    on("flagsmen", &mainfrm::censusflags);
+    on("optionsmen", &mainfrm::showoptions);
+    on("donatemen", &mainfrm::donate);
+    on("aboutmen", &mainfrm::about);
+    const auto helpitem = [this](const char* name, int topic, const QString& command) {
+        if (QAction* a = menuBar()->findChild<QAction*>(QString::fromLatin1(name)))
+            connect(a, &QAction::triggered, this, [this, topic, command] { prompts_.showhelp(topic, command); });
+    };
+    helpitem("helpcreatingentrymen", 12, QString());
+    helpitem("HelpIndexmen", 0, QStringLiteral("Index"));
+    helpitem("HelpSearchmen", 0, QStringLiteral("Search"));
 }
 
 void mainfrm::buildform()
@@ -321,7 +335,10 @@ bool mainfrm::start(const QStringList& arguments)
     const settingsload loaded = loadsettings(store_);
     settings_ = loaded.values;
     settitleandpanel();
+    startoptions();
     loadfile();
+    if (settings_.flagcheck)
+        silentflagcheck();
     clearentry();
     watchfile_ = true;
     return true;
@@ -479,6 +496,8 @@ void mainfrm::openfamilyfile(const QString& path)
         gedcomfile_ = index_->gedcomfile;
         settitleandpanel();
         afterload();
+    } else if (settings_.flagcheck) {
+        silentflagcheck();
     }
     clearentry();
     watchfile_ = true;
@@ -532,11 +551,23 @@ void mainfrm::comingsoon()
     prompts_.tell(QStringLiteral("This part of Quillmark is not available in this version."), icon::information);
 }
 
-int32_t mainfrm::runfind(int32_t)
+void mainfrm::runtool(const std::function<void()>& open)
 {
-    // The Find dialog comes with its own feature; until then nothing is found.
-    comingsoon();
-    return -1;
+    reloadneeded_ = false;
+    watchfile_ = false;
+    open();
+    repaint();
+    if (reloadneeded_)
+        reload();
+    reloadneeded_ = false;
+    watchfile_ = true;
+}
+
+void mainfrm::removebackups()
+{
+    watchfile_ = false;
+    removeoldbackups(prompts_, settings_.backupfolder);
+    watchfile_ = true;
 }
 
 void mainfrm::fillyears()

@@ -8,10 +8,12 @@
 #include "census/selection.h"
 #include "model/gedcomindex.h"
 #include "settings/settings.h"
+#include "writer/censusentry.h"
 
 #include <QMainWindow>
 
 #include <array>
+#include <functional>
 #include <memory>
 
 class QAction;
@@ -76,6 +78,30 @@ private:
     void editmenuopening();
     void clearall();
     void comingsoon();
+
+    // The menus' tools and dialogs, each defined in its feature's folder.
+    // A tool that may rewrite the family file runs with the watch for outside
+    // changes off, and the file is read again afterwards when reloadneeded_ is set.
+    void runtool(const std::function<void()>& open);
+    void removebackups();      // mainfrm.cpp
+    void viewlog();            // log/logmenu_ui.cpp
+    void clearlogfile();       // log/logmenu_ui.cpp
+    void attachimages();       // images/attachmenu_ui.cpp
+    void censusdatecheck();    // tools/datecheckmenu_ui.cpp
+    void censusflags();        // flags/flagsmenu_ui.cpp
+    // After each load when "Flag Check" is on (flags/flagcheckmenu_ui.cpp).
+    void silentflagcheck();
+    void showoptions();        // settings/optionsmenu_ui.cpp
+    // At start, once the settings are read: the options dialog when the
+    // settings are incomplete or their paths fail the checks (same file).
+    void startoptions();
+    void donate();             // app/helpmenu_ui.cpp
+    void about();              // app/helpmenu_ui.cpp
+    // After each saved entry, once Count has been raised (app/helpmenu_ui.cpp).
+    void milestone();
+    // Save step 12: the Census Images dialog for the entry being saved
+    // (images/imagesmenu_ui.cpp). False when the user chose "Cancel saving census".
+    bool chooseentryimages(std::vector<imagechoice>& chosen);
     std::optional<QString> askforfile(bool startup);
 
     // the entry form and its save (entryform_ui.cpp)
@@ -145,6 +171,8 @@ private:
     bool checking_ = false;
     bool reloading_ = false;
     int32_t findresult_ = -1;
+    bool fromfind_ = false;     // the Find dialog asked for the immediate family to be rebuilt
+    bool reloadneeded_ = false; // a tool rewrote the file (or found it changed): read it again
     bool ending_ = false; // closing after a failed rewrite: no questions
     bool saving_ = false; // a save is running (a second click waits its turn)
 

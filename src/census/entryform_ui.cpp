@@ -133,7 +133,8 @@ void mainfrm::askbirthdetails(const QString& entrydate)
             prompts_.tell(idmismatchmessage());
             break;
         case birthcheck::ask: {
-            const std::optional<birthdetails> d = birthfrm::ask(row, entrydate, index_->places, prompts_, this);
+            const std::optional<birthdetails> d = birthfrm::ask(row, entrydate, index_->places, prompts_, this,
+                                                                [this] { prompts_.showhelp(30); });
             if (!d)
                 break;
             d->applyto(row);
@@ -266,9 +267,13 @@ void mainfrm::saveentry()
     if (settings_.birthdate)
         askbirthdetails(entrydate);
 
-    // The images of the entry are chosen with the images dialog, which comes
-    // with its own feature; until then no images are asked for or written.
-    const std::vector<imagechoice> chosenimages;
+    std::vector<imagechoice> chosenimages;
+    if (form.fullentry ? settings_.requestimage : settings_.requestimages2) {
+        if (!chooseentryimages(chosenimages)) {
+            watchfile_ = true;
+            return;
+        }
+    }
 
     busycursor busy(prompts_);
     repaint();
@@ -308,6 +313,7 @@ void mainfrm::saveentry()
     household_->allpeoplelst->clearSelection();
     watchfile_ = true;
     raisecount();
+    milestone();
     panel()->yearcom->setFocus();
 }
 
@@ -316,8 +322,6 @@ void mainfrm::raisecount()
     ++settings_.count;
     store_.write(QStringLiteral("Count"), QString::number(settings_.count));
     store_.sync();
-    // The donation reminder after the 10th, the 20th and every 50th saved
-    // entry comes with the help feature and hooks in here.
 }
 
 void mainfrm::endprogram()

@@ -100,7 +100,7 @@ void mainfrm::peopleclicked(int row)
         k = household_->people->personat(row);
     if (k < 0)
         return;
-    if (rows_.selectioncount == 0 || reloading_)
+    if (rows_.selectioncount == 0 || reloading_ || fromfind_)
         fillfamily(k);
     if (!reloading_)
         selectperson(k);
@@ -253,9 +253,11 @@ void mainfrm::findclicked()
         findresult_ = -1;
     }
     watchfile_ = false;
+    fromfind_ = false;
     findresult_ = runfind(findresult_);
     if (findresult_ != -1)
         peopleclicked(-1);
+    fromfind_ = false;
     watchfile_ = true;
     findresult_ = -1;
 }

@@ -43,6 +43,13 @@ public:
     // Shows the busy pointer while long work runs (see busycursor).
     virtual void setbusy(bool) {}
 
+    // Opens the help window at a topic number, or at its index ("Index") or
+    // search page ("Search") when command says so.
+    virtual void showhelp(int topic, const QString& command = QString()) = 0;
+    // Opens a file or a web address in the program the system keeps for it.
+    // Returns "" when it was handed over, otherwise why not, for the user.
+    virtual QString openexternal(const QString& target) = 0;
+
     // Conveniences for the common forms.
     void tell(const QString& text, icon kind = icon::none, const QString& title = QStringLiteral("Quillmark"))
     {

@@ -120,4 +120,15 @@ void scriptedprompts::clear()
     onnext_ = nullptr;
 }
 
+void scriptedprompts::showhelp(int topic, const QString& command)
+{
+    helpshown << (command.isEmpty() ? QString::number(topic) : command);
+}
+
+QString scriptedprompts::openexternal(const QString& target)
+{
+    opened << target;
+    return openerror;
+}
+
 } // namespace qm

@@ -35,6 +35,8 @@ public:
     std::optional<QString> savefile(const QString& caption, const QString& startpath, const QString& filter) override;
     std::optional<QString> choosefolder(const QString& caption, const QString& startfolder) override;
     void setbusy(bool on) override { busy += on ? 1 : -1; }
+    void showhelp(int topic, const QString& command = QString()) override;
+    QString openexternal(const QString& target) override;
 
     const std::vector<shown>& history() const { return history_; }
     // Texts of the messages shown, in order.
@@ -45,6 +47,12 @@ public:
     void clear();
 
     int busy = 0; // > 0 while the busy pointer is shown
+    // Help pages asked for: the topic number, or the command ("Index", "Search").
+    QStringList helpshown;
+    // Files and addresses handed to the system, and the answer given to the
+    // next ones ("" = opened).
+    QStringList opened;
+    QString openerror;
 
 private:
     struct queued {

@@ -1,9 +1,12 @@
 #include "platform/widgetprompts_ui.h"
 
 #include <QApplication>
+#include <QDesktopServices>
+#include <QFileInfo>
 #include <QFileDialog>
 #include <QGuiApplication>
 #include <QMessageBox>
+#include <QUrl>
 
 namespace qm {
 
@@ -141,6 +144,24 @@ activationnotice::activationnotice(QObject* parent) : QObject(parent)
         if (s == Qt::ApplicationActive)
             emit activated();
     });
+}
+
+void widgetprompts::showhelp(int topic, const QString& command)
+{
+    if (help_)
+        help_(topic, command);
+}
+
+QString widgetprompts::openexternal(const QString& target)
+{
+    const QUrl url = target.startsWith(QLatin1String("https://")) || target.startsWith(QLatin1String("http://"))
+                         ? QUrl(target)
+                         : QUrl::fromLocalFile(target);
+    if (url.isLocalFile() && !QFileInfo(target).isFile())
+        return QStringLiteral("The specified file was not found.");
+    return QDesktopServices::openUrl(url) ? QString()
+                                          : QStringLiteral("There is no application associated with the given "
+                                                           "file name extension.");
 }
 
 } // namespace qm

@@ -6,6 +6,8 @@
 
 #include <QObject>
 
+#include <functional>
+
 class QWidget;
 
 namespace qm {
@@ -23,10 +25,15 @@ public:
     std::optional<QString> choosefolder(const QString& caption, const QString& startfolder) override;
     // Nested calls keep the pointer busy until the outermost one ends.
     void setbusy(bool on) override;
+    // Hands the request to the help window set with sethelp.
+    void showhelp(int topic, const QString& command = QString()) override;
+    void sethelp(std::function<void(int, const QString&)> help) { help_ = std::move(help); }
+    QString openexternal(const QString& target) override;
 
 private:
     QWidget* parent_ = nullptr;
     int busy_ = 0;
+    std::function<void(int, const QString&)> help_;
 };
 
 // Emits `activated` each time the application becomes the active one (the

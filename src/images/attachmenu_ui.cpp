@@ -1,0 +1,11 @@
+#include "app/mainfrm.h"
+
+namespace qm {
+
+// "Attach Images to Existing Sources...".
+void mainfrm::attachimages()
+{
+    comingsoon();
+}
+
+} // namespace qm
