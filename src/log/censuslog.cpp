@@ -21,6 +21,23 @@ QString native(const QString& path)
     return QDir::toNativeSeparators(path);
 }
 
+QString appendlines(const settings& s, const QStringList& lines)
+{
+    QFile f(s.logpath);
+    if (s.logpath.isEmpty() || !f.open(QIODevice::WriteOnly | QIODevice::Append))
+        return QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
+            + native(s.logpath);
+    QByteArray bytes;
+    for (const QString& line : lines) {
+        bytes += line.toUtf8();
+        bytes += "\r\n";
+    }
+    // Write errors after the open are not reported: the change itself stands.
+    f.write(bytes);
+    f.close();
+    return QString();
+}
+
 void modeonelines(const settings& s, const logentry& e, QStringList& out)
 {
     out << QStringLiteral("Census entry added: ") + timestamp();
@@ -102,21 +119,20 @@ QStringList loglines(const settings& s, const logentry& e)
     return out;
 }
 
+QStringList renamelines(const QString& from, const QString& to)
+{
+    return {logseparator(), QStringLiteral("Image renamed on: ") + timestamp(),
+            QStringLiteral("From: ") + native(from), QStringLiteral("To: ") + native(to)};
+}
+
+QString writerenameentry(const settings& s, const QString& from, const QString& to)
+{
+    return appendlines(s, renamelines(from, to));
+}
+
 QString writelogentry(const settings& s, const logentry& e)
 {
-    QFile f(s.logpath);
-    if (s.logpath.isEmpty() || !f.open(QIODevice::WriteOnly | QIODevice::Append))
-        return QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
-            + native(s.logpath);
-    QByteArray bytes;
-    for (const QString& line : loglines(s, e)) {
-        bytes += line.toUtf8();
-        bytes += "\r\n";
-    }
-    // Write errors after the open are not reported: the change itself stands.
-    f.write(bytes);
-    f.close();
-    return QString();
+    return appendlines(s, loglines(s, e));
 }
 
 QString checklogfile(const QString& logpath)

@@ -1,0 +1,213 @@
+#include "images/imagechoices.h"
+
+#include "log/censuslog.h"
+#include "model/gedcomindex.h"
+#include "platform/encoding.h"
+#include "settings/settings.h"
+
+#include <QFile>
+#include <QFileInfo>
+
+#include <algorithm>
+
+namespace qm {
+
+namespace {
+
+qsizetype lastseparator(const QString& path)
+{
+    return std::max(path.lastIndexOf(u'/'), path.lastIndexOf(u'\\'));
+}
+
+QString filename(const QString& path)
+{
+    return path.mid(lastseparator(path) + 1);
+}
+
+// The extension of the file name with its ".", or "".
+QString extensionof(const QString& path)
+{
+    const QString name = filename(path);
+    const qsizetype dot = name.lastIndexOf(u'.');
+    return dot < 0 ? QString() : name.mid(dot);
+}
+
+// Paths compared as the user sees them: ignoring letter case, "/" and "\" alike.
+bool samepath(const QString& a, const QString& b)
+{
+    QString x = a, y = b;
+    x.replace(u'\\', u'/');
+    y.replace(u'\\', u'/');
+    return x.compare(y, Qt::CaseInsensitive) == 0;
+}
+
+} // namespace
+
+QString cleanfilename(QString text)
+{
+    for (const char16_t c : {u':', u'\\', u'/', u'?', u'*', u'<', u'>', u'|', u'\'', u'"'})
+        text.replace(QChar(c), u'_');
+    return text;
+}
+
+QString imagefiletype(const QString& path)
+{
+    const QString last = path.right(4).toLower();
+    if (last == QLatin1String(".bmp"))
+        return QStringLiteral("bmp");
+    if (last == QLatin1String(".gif"))
+        return QStringLiteral("gif");
+    if (last == QLatin1String(".jpg"))
+        return QStringLiteral("jpeg");
+    if (last == QLatin1String(".pcx"))
+        return QStringLiteral("pcx");
+    if (last == QLatin1String(".tif"))
+        return QStringLiteral("tif");
+    const QString ext = extensionof(path);
+    return ext.isEmpty() ? QString() : ext.mid(1).toLower().trimmed();
+}
+
+QString titlefromfilename(const QString& path)
+{
+    const QString name = filename(path);
+    const qsizetype dot = name.lastIndexOf(u'.');
+    return dot <= 0 ? name : name.left(dot);
+}
+
+QString folderof(const QString& path)
+{
+    return path.left(lastseparator(path) + 1);
+}
+
+int nexttitlenumber(const std::vector<imagechoice>& chosen, const QString& base)
+{
+    int highest = 0;
+    for (const imagechoice& c : chosen)
+        if (c.isnew && c.title == base)
+            highest = std::max(highest, c.titlenumber);
+    return highest + 1;
+}
+
+QString fulltitle(const QString& title, int number)
+{
+    return number >= 2 ? title + u' ' + QString::number(number) : title;
+}
+
+QString fulltitle(const imagechoice& image)
+{
+    return fulltitle(image.title, image.titlenumber);
+}
+
+QString refusenewimage(const QString& path, const std::vector<imagechoice>& chosen, const gedcomindex& index)
+{
+    const QString last = path.right(4).toLower();
+    if (last == QLatin1String(".exe"))
+        return QStringLiteral("You have selected an application program rather than an image file.");
+    if (last == QLatin1String(".ged"))
+        return QStringLiteral("You have selected a GEDCOM family history file rather than an image file.");
+    for (const imagechoice& c : chosen)
+        if (samepath(c.file, path))
+            return QStringLiteral("This image has already been selected to be part of this census entry");
+    for (const objectrec& o : index.objects)
+        if (samepath(qs(o.file), path))
+            return QStringLiteral("This image is already loaded into Family Historian and has the title ")
+                + qs(o.title) + QStringLiteral(". Go back to the previous screen and select the 'Link current image' button");
+    return QString();
+}
+
+QString refuseexistingimage(int32_t objectid, const std::vector<imagechoice>& chosen)
+{
+    for (const imagechoice& c : chosen)
+        if (c.objectid == objectid)
+            return QStringLiteral("This image has already been selected to be linked to the new census source being "
+                                  "created and therefore can not be selected again.");
+    return QString();
+}
+
+int32_t firstobjectbase(const gedcomindex& index)
+{
+    int32_t highest = index.maxobjectid;
+    for (const objectrec& o : index.objects)
+        highest = std::max(highest, o.id);
+    return highest;
+}
+
+const imagechoice& addnewimage(std::vector<imagechoice>& chosen, int32_t& nextobjectid, const QString& file,
+                               const QString& title, int titlenumber, const QString& date)
+{
+    imagechoice c;
+    c.objectid = ++nextobjectid;
+    c.date = date;
+    c.file = file;
+    c.form = imagefiletype(file);
+    c.isnew = true;
+    c.title = title;
+    c.titlenumber = titlenumber;
+    chosen.push_back(std::move(c));
+    return chosen.back();
+}
+
+const imagechoice& addexistingimage(std::vector<imagechoice>& chosen, const objectrec& object)
+{
+    imagechoice c;
+    c.objectid = object.id;
+    c.form = qs(object.form);
+    c.title = qs(object.title);
+    c.file = qs(object.file);
+    c.date = qs(object.date);
+    c.isnew = false;
+    c.titlenumber = 0;
+    chosen.push_back(std::move(c));
+    return chosen.back();
+}
+
+QString imagerow(int position, const imagechoice& image)
+{
+    return (QString::number(position) + QStringLiteral(": ") + fulltitle(image)).trimmed();
+}
+
+QString pathrow(const QString& file)
+{
+    return QStringLiteral("...") + file.right(80);
+}
+
+bool mentionscensus(const objectrec& object)
+{
+    return qs(object.title).toUpper().contains(QLatin1String("CENSUS"))
+        || qs(object.file).toUpper().contains(QLatin1String("CENSUS"));
+}
+
+QString renamedpath(const QString& path, const QString& title)
+{
+    return (folderof(path) + cleanfilename(title).trimmed() + extensionof(path)).trimmed();
+}
+
+renameresult renametotitle(const QString& path, const QString& title, const settings& s)
+{
+    renameresult r;
+    r.path = path;
+    const QString to = renamedpath(path, title);
+    if (to.compare(path, Qt::CaseInsensitive) == 0)
+        return r;
+    if (QFileInfo::exists(to)) {
+        r.message = QStringLiteral("A file with the name '") + to
+            + QStringLiteral("' already exists and therefore this file can not be renamed to match the current title. "
+                             "Change the title or deselect the rename option and try again.");
+        return r;
+    }
+    QFile f(path);
+    if (!f.rename(to)) {
+        r.message = QStringLiteral("An error (") + f.errorString()
+            + QStringLiteral(") occurred when attempting to rename the file. Check that the file is not currently being "
+                             "edited in another application and that you have permission to rename the file or "
+                             "deselect the rename option and try again.");
+        return r;
+    }
+    r.path = to;
+    r.renamed = true;
+    if (s.keeplog)
+        r.logerror = writerenameentry(s, path, to);
+    return r;
+}
+
+} // namespace qm
