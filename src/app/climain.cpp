@@ -16,6 +16,9 @@ const std::vector<clicommand>& clicommands()
         {"add-entry", "FILE --entry ENTRY.json [--settings S.ini]",
          "save the census entry described by ENTRY.json into FILE (backup, rewrite, census log); see docs/cli.md",
          cliaddentry},
+        {"flag-check", "FILE [--apply] [--country-for PLACE=COUNTRY]... [--settings S.ini]",
+         "list the census flags to add and remove as the Flag Check dialog does; --apply makes the changes",
+         cliflagcheck},
     };
     return commands;
 }

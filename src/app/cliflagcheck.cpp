@@ -1,0 +1,154 @@
+// quillmark-cli flag-check: lists the census flags out of step with the census
+// events, as the Flag Check dialog does, and with --apply makes the changes.
+#include "app/cli.h"
+
+#include "flags/flagcheck.h"
+#include "flags/flagtable.h"
+#include "model/loadgedcom.h"
+#include "platform/encoding.h"
+#include "writer/saveroad.h"
+
+#include <QDir>
+#include <QFileInfo>
+
+#include <cstdio>
+#include <map>
+#include <string>
+
+namespace qm {
+
+namespace {
+
+void printline(const QString& text)
+{
+    const QByteArray bytes = text.toUtf8() + '\n';
+    std::fwrite(bytes.constData(), 1, static_cast<size_t>(bytes.size()), stdout);
+}
+
+// "UK", "USA", "Ireland" or "Canada" in any letter case, in its own spelling; "" otherwise.
+QString censuscountry(const QString& text)
+{
+    for (const char* c : {"UK", "USA", "Ireland", "Canada"})
+        if (text.compare(QLatin1String(c), Qt::CaseInsensitive) == 0)
+            return QLatin1String(c);
+    return QString();
+}
+
+QString usage()
+{
+    return QStringLiteral("flag-check needs one family file: quillmark-cli flag-check FILE [--apply] "
+                          "[--country-for PLACE=COUNTRY]... [--settings S.ini]");
+}
+
+} // namespace
+
+int cliflagcheck(QStringList args)
+{
+    QString inipath, error;
+    if (!takesettingsoption(args, &inipath, &error))
+        return clifail(error);
+    bool apply = false;
+    std::map<std::string, QString> countryfor; // place key -> country
+    QStringList files;
+    static const QString countryoption = QStringLiteral("--country-for");
+    for (qsizetype i = 0; i < args.size(); ++i) {
+        const QString& a = args[i];
+        QString answer;
+        if (a == QLatin1String("--apply")) {
+            apply = true;
+            continue;
+        }
+        if (a == countryoption) {
+            if (i + 1 >= args.size())
+                return clifail(QStringLiteral("--country-for needs PLACE=COUNTRY"));
+            answer = args[++i];
+        } else if (a.startsWith(countryoption + QLatin1Char('='))) {
+            answer = a.mid(countryoption.size() + 1);
+        } else if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-")) {
+            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
+        } else {
+            files.push_back(a);
+            continue;
+        }
+        // The country follows the last "=": place names may hold one, countries never do.
+        const qsizetype eq = answer.lastIndexOf(QLatin1Char('='));
+        const QString country = eq < 0 ? QString() : censuscountry(answer.mid(eq + 1).trimmed());
+        if (country.isEmpty())
+            return clifail(QStringLiteral("--country-for %1: give PLACE=COUNTRY with COUNTRY one of UK, USA, "
+                                          "Ireland, Canada")
+                               .arg(answer));
+        countryfor[placekey(u8(answer.left(eq)))] = country;
+    }
+    if (files.size() != 1)
+        return clifail(usage());
+    const QString path = files.front();
+    const QFileInfo info(path);
+    if (!info.exists())
+        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
+    if (info.isDir())
+        return clifail(QStringLiteral("%1 is a folder, not a family file").arg(QDir::toNativeSeparators(path)));
+
+    const auto s = opensettings(inipath, &error);
+    if (!s)
+        return clifail(error);
+    flagtable flagdefs;
+    if (!loadflagdefs(*s->store, flagdefs))
+        cliwarn(flagloaderrormessage());
+    loadresult r = loadgedcom(path, flagdefs);
+    if (!r.index)
+        return clifail(r.error);
+    gedcomindex& ix = *r.index;
+    if (!ix.hashead)
+        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
+                           .arg(QDir::toNativeSeparators(path)));
+
+    // The country question is answered from --country-for, or the check fails naming the event.
+    QString unanswered;
+    const countryasker ask = [&](const countryquestion& q) -> countrychoice {
+        const personrec& p = ix.people[static_cast<size_t>(q.person)];
+        const auto given = countryfor.find(placekey(q.place));
+        const QString event = QStringLiteral("individual %1 (ID: %2) has a census event (date %3, place %4)")
+                                  .arg(qs(p.name), QString::number(p.id), qs(q.date),
+                                       q.place.empty() ? QStringLiteral("none") : qs(q.place));
+        const QString countries = q.countries.join(QStringLiteral(", "));
+        if (given == countryfor.end()) {
+            unanswered = event + QStringLiteral(" that matches the flags of %1: say which with --country-for \"%2=COUNTRY\"")
+                                     .arg(countries, qs(q.place));
+            return {};
+        }
+        const qsizetype at = q.countries.indexOf(given->second);
+        if (at < 0) {
+            unanswered = event + QStringLiteral(" that matches the flags of %1, not of %2 given by --country-for")
+                                     .arg(countries, given->second);
+            return {};
+        }
+        return {static_cast<int>(at), false};
+    };
+    const flagcheckresult check = checkflags(ix, true, s->values.country, ask);
+    if (check.cancelled)
+        return clifail(unanswered);
+
+    printline(flagsaddheading());
+    for (const QString& row : check.addlist())
+        printline(row);
+    printline(flagsremoveheading());
+    for (const QString& row : check.removelist())
+        printline(row);
+    std::fflush(stdout);
+    if (!apply || !check.canchange())
+        return 0;
+
+    rewriterequest request;
+    request.mode = rewritemode::flagchanges;
+    request.flagchanges = check.changes;
+    const saveoutcome out = savechange(ix, s->values, request);
+    if (!out.saved())
+        return clifail(out.message);
+    if (!out.logerror.isEmpty())
+        cliwarn(out.logerror);
+    printline(QStringLiteral("Backup: ") + QDir::toNativeSeparators(out.backuppath));
+    std::fflush(stdout);
+    return 0;
+}
+
+} // namespace qm
