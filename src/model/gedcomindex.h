@@ -78,7 +78,7 @@ struct objectrec {
 struct placerec {
     std::string_view name; // the spelling met first in the file
     int32_t count = 0;     // how many PLAC lines carry it
-    std::string country;   // census country learnt by the flag check ("" until then)
+    std::string country{}; // census country learnt by the flag check ("" until then)
 };
 
 struct gedcomindex {

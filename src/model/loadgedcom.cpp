@@ -274,7 +274,7 @@ std::string_view loader::lookupplace(std::string_view raw, int32_t& groupout)
         group = *g;
     } else {
         group = static_cast<int32_t>(groups_.size());
-        groups_.push_back({utf8, 0, {}});
+        groups_.push_back({utf8, 0});
         const std::string_view storedkey = keys_.emplace_back(key);
         groupkeys_.push_back(storedkey);
         groupbykey_.insert(kh, storedkey, group);
