@@ -32,6 +32,7 @@ const std::vector<clicommand>& clicommands();
 // Commands.
 int clistats(QStringList args);
 int cliaddentry(QStringList args);
+int clidatecheck(QStringList args);
 int cliflagcheck(QStringList args);
 
 // Exit status of a command that could not do its work.

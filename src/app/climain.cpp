@@ -19,6 +19,9 @@ const std::vector<clicommand>& clicommands()
         {"flag-check", "FILE [--apply] [--country-for PLACE=COUNTRY]... [--settings S.ini]",
          "list the census flags to add and remove as the Flag Check dialog does; --apply makes the changes",
          cliflagcheck},
+        {"date-check", "FILE [--country C] [--apply] [--settings S.ini]",
+         "list the census event dates as the Census Date Check dialog does; --apply makes the suggested changes",
+         clidatecheck},
     };
     return commands;
 }

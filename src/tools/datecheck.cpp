@@ -1,0 +1,379 @@
+#include "tools/datecheck.h"
+
+#include "census/censustable.h"
+#include "model/gedcomindex.h"
+#include "platform/encoding.h"
+#include "settings/settings.h"
+
+#include <QDir>
+
+#include <algorithm>
+#include <cstdlib>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+
+namespace qm {
+
+namespace {
+
+int rowcount()
+{
+    return static_cast<int>(censustable().size());
+}
+
+const censusdef& rowdef(int row)
+{
+    return censustable()[static_cast<size_t>(row - 1)];
+}
+
+// The official days of the table as UTF-8 (compared with the index's texts)
+// and as calendar dates.
+const std::vector<std::string>& rowdates()
+{
+    static const std::vector<std::string> dates = [] {
+        std::vector<std::string> out;
+        for (const censusdef& c : censustable())
+            out.push_back(u8(c.date));
+        return out;
+    }();
+    return dates;
+}
+
+const std::vector<QDate>& rowdays()
+{
+    static const std::vector<QDate> days = [] {
+        std::vector<QDate> out;
+        for (const censusdef& c : censustable())
+            out.push_back(recognisedate(c.date, dateorder::dmy).value_or(QDate()));
+        return out;
+    }();
+    return days;
+}
+
+// The row after `row`, round from the last to the first.
+int nextrow(int row)
+{
+    return row == rowcount() ? 1 : row + 1;
+}
+
+// The census whose official day is exactly `date`, searched from the first row
+// of the chosen country; -1 when none.
+int officialrow(std::string_view date, int start)
+{
+    const std::vector<std::string>& dates = rowdates();
+    int row = start;
+    do {
+        if (dates[static_cast<size_t>(row - 1)] == date)
+            return row;
+        row = nextrow(row);
+    } while (row != start);
+    return noproposal;
+}
+
+QString occurences(int32_t count)
+{
+    return QStringLiteral(" (") + QString::number(count) + QStringLiteral(" occurence")
+        + (count < 2 ? QStringLiteral(")") : QStringLiteral("s)"));
+}
+
+QString censusname(int row)
+{
+    const censusdef& c = rowdef(row);
+    return c.country + QLatin1Char(' ') + QString::number(c.year) + QStringLiteral(" Census");
+}
+
+// "the UK", "the USA", but "Ireland", "Canada".
+QString countrywords(const QString& country)
+{
+    switch (countryoption(country)) {
+    case 2:
+        return QStringLiteral("Ireland");
+    case 3:
+        return QStringLiteral("Canada");
+    case 1:
+        return QStringLiteral("the USA");
+    default:
+        return QStringLiteral("the UK");
+    }
+}
+
+void sortdetails(std::vector<detailentry>& list)
+{
+    std::stable_sort(list.begin(), list.end(), [](const detailentry& a, const detailentry& b) {
+        const int c = a.text.compare(b.text, Qt::CaseInsensitive);
+        return c != 0 ? c < 0 : a.text < b.text;
+    });
+}
+
+} // namespace
+
+const QStringList& datecheckcountries()
+{
+    static const QStringList countries = {QStringLiteral("UK"), QStringLiteral("USA"), QStringLiteral("Ireland"),
+                                          QStringLiteral("Canada")};
+    return countries;
+}
+
+int countryoption(const QString& country)
+{
+    const qsizetype i = datecheckcountries().indexOf(country);
+    return i < 0 ? 0 : static_cast<int>(i);
+}
+
+countryrows rowsofcountry(const QString& country)
+{
+    const QString name = datecheckcountries()[countryoption(country)];
+    countryrows r{0, -1};
+    for (int row = 1; row <= rowcount(); ++row) {
+        if (rowdef(row).country != name)
+            continue;
+        if (r.first == 0)
+            r.first = row;
+        r.last = row;
+    }
+    return r;
+}
+
+QString currentcountrycaption(const QString& country)
+{
+    return QStringLiteral("Census entries found assumed to be for ") + countrywords(country) + QLatin1Char(':');
+}
+
+QString othercountrycaption(const QString& country)
+{
+    return QStringLiteral("Entries assumed to be for countries other than ") + countrywords(country)
+        + QLatin1Char(':');
+}
+
+std::vector<datechange> analysecensusdates(const gedcomindex& index, const QString& country)
+{
+    const countryrows range = rowsofcountry(country);
+    std::vector<datechange> out;
+    // Position in `out` of each date met, by its text in the index.
+    std::unordered_map<std::string_view, size_t> seen;
+    for (const personrec& p : index.people) {
+        for (const censusrec& c : p.census) {
+            if (c.date.empty())
+                continue;
+            const auto [it, added] = seen.try_emplace(c.date, out.size());
+            if (!added) {
+                ++out[it->second].count;
+                continue;
+            }
+            datechange d;
+            d.founddate = qs(c.date);
+            d.count = 1;
+            d.censusrow = officialrow(c.date, range.first);
+            d.datekind = d.censusrow == noproposal ? 0 : range.contains(d.censusrow) ? 1 : 2;
+            out.push_back(std::move(d));
+        }
+    }
+    return out;
+}
+
+std::optional<QDate> proposaldate(const QString& founddate, dateorder order)
+{
+    if (auto d = recognisedate(founddate, order))
+        return d;
+    if (founddate.size() < 4)
+        return std::nullopt;
+    const QStringView last = QStringView(founddate).right(4);
+    for (QChar c : last)
+        if (c < u'0' || c > u'9')
+            return std::nullopt;
+    const int year = last.toInt();
+    if (std::abs(1900 - year) >= 200)
+        return std::nullopt;
+    return QDate(year, 6, 30);
+}
+
+int nearestcensus(const QDate& d, const QString& country)
+{
+    const int start = rowsofcountry(country).first;
+    const std::vector<QDate>& days = rowdays();
+    int best = noproposal;
+    qint64 bestdistance = 0;
+    int row = start;
+    do {
+        const qint64 distance = std::abs(d.daysTo(days[static_cast<size_t>(row - 1)]));
+        if (best == noproposal || distance < bestdistance) {
+            best = row;
+            bestdistance = distance;
+        }
+        row = nextrow(row);
+    } while (row != start);
+    return best;
+}
+
+void proposecensusdates(std::vector<datechange>& changes, const QString& country, dateorder order)
+{
+    for (datechange& d : changes) {
+        if (d.datekind != 0)
+            continue;
+        d.censusrow = noproposal;
+        d.newdate.clear();
+        if (const auto day = proposaldate(d.founddate, order)) {
+            d.censusrow = nearestcensus(*day, country);
+            d.newdate = rowdef(d.censusrow).date;
+        }
+    }
+}
+
+QString datelisttext(const datechange& d)
+{
+    QString text = d.founddate + occurences(d.count);
+    if (d.datekind != 0) {
+        if (d.censusrow >= 1 && d.censusrow <= rowcount())
+            text += QStringLiteral(" : ") + censusname(d.censusrow);
+        return text;
+    }
+    if (d.censusrow >= 1 && d.censusrow <= rowcount())
+        text += QStringLiteral(" : [Suggest replacing with ") + censusname(d.censusrow) + QStringLiteral(" date ")
+            + rowdef(d.censusrow).date + QLatin1Char(']');
+    else if (d.censusrow == refusedchange)
+        text += QStringLiteral(" : [User has requested Quillmark not to replace this date]");
+    else
+        text += QStringLiteral(" : [Quillmark can not suggest a date to replace this with]");
+    return text;
+}
+
+datelists makedatelists(const std::vector<datechange>& changes)
+{
+    datelists out;
+    for (size_t k = 0; k < changes.size(); ++k) {
+        const datechange& d = changes[k];
+        datelistentry e{datelisttext(d), static_cast<int>(k)};
+        if (d.datekind == 2) {
+            out.other.push_back(std::move(e));
+        } else if (d.datekind == 1) {
+            out.current.push_back(std::move(e));
+        } else {
+            out.unknown.push_back(std::move(e));
+            if (d.censusrow >= 1)
+                out.canchange = true;
+        }
+    }
+    return out;
+}
+
+QStringList censuschoices()
+{
+    QStringList out;
+    for (const censusdef& c : censustable())
+        out << c.country + QLatin1Char(' ') + QString::number(c.year) + QStringLiteral(" Census (") + c.date
+                + QLatin1Char(')');
+    return out;
+}
+
+std::vector<detailentry> datedetails(const gedcomindex& index, const QString& founddate, bool places)
+{
+    const std::string date = u8(founddate);
+    static const QString noplace = QStringLiteral("<no place recorded>");
+    std::vector<detailentry> out;
+    if (!places) {
+        for (size_t k = 0; k < index.people.size(); ++k) {
+            const personrec& p = index.people[k];
+            for (const censusrec& c : p.census)
+                if (c.date == date)
+                    out.push_back({qs(p.name) + QLatin1Char(' ') + qs(c.age) + QLatin1Char(' ')
+                                       + (c.place.empty() ? noplace : qs(c.place)),
+                                   static_cast<int32_t>(k)});
+        }
+    } else {
+        std::vector<std::pair<std::string_view, int32_t>> counted;
+        std::unordered_map<std::string_view, size_t> at;
+        for (const personrec& p : index.people)
+            for (const censusrec& c : p.census)
+                if (c.date == date) {
+                    const auto [it, added] = at.try_emplace(c.place, counted.size());
+                    if (added)
+                        counted.emplace_back(c.place, 0);
+                    ++counted[it->second].second;
+                }
+        for (const auto& [place, n] : counted)
+            out.push_back({(place.empty() ? noplace : qs(place)) + QStringLiteral(" (in ") + QString::number(n)
+                               + QStringLiteral(" census events)"),
+                           -1});
+    }
+    sortdetails(out);
+    return out;
+}
+
+datecheckstate::datecheckstate(const gedcomindex& index, dateorder order) : index_(index), order_(order) {}
+
+void datecheckstate::choosecountry(const QString& country)
+{
+    country_ = datecheckcountries()[countryoption(country)];
+    changes_ = analysecensusdates(index_, country_);
+    proposecensusdates(changes_, country_, order_);
+}
+
+QString datecheckstate::edit(int k, suggestion s, int row)
+{
+    if (k < 0 || k >= static_cast<int>(changes_.size()))
+        return {};
+    datechange& d = changes_[static_cast<size_t>(k)];
+    switch (s) {
+    case suggestion::agree:
+        break;
+    case suggestion::refuse:
+        if (d.datekind == 0) {
+            d.censusrow = refusedchange;
+            d.newdate.clear();
+        }
+        break;
+    case suggestion::changeto:
+        if (row < 1 || row > rowcount())
+            return choosecensusmessage();
+        d.datekind = 0;
+        d.censusrow = row;
+        d.newdate = rowdef(row).date;
+        break;
+    }
+    return {};
+}
+
+std::vector<detailentry> datecheckstate::details(int k, bool places) const
+{
+    if (k < 0 || k >= static_cast<int>(changes_.size()))
+        return {};
+    return datedetails(index_, changes_[static_cast<size_t>(k)].founddate, places);
+}
+
+rewriterequest datechangerequest(const std::vector<datechange>& changes)
+{
+    rewriterequest rq;
+    rq.mode = rewritemode::censusdates;
+    rq.datechanges = changes;
+    return rq;
+}
+
+saveoutcome makedatechanges(const gedcomindex& index, const settings& s, const std::vector<datechange>& changes)
+{
+    saveoutcome out = savechange(index, s, datechangerequest(changes));
+    if (out.status == savestatus::changed)
+        out.message = datesnotchangedmessage(index.gedcomfile);
+    return out;
+}
+
+QString makechangesquestion()
+{
+    return QStringLiteral("Are you sure you want to make the changes to dates as specfied in the 'Unknown census "
+                          "dates' list? Please note that this will also change any matching dates for occupation "
+                          "records linked to the same source. Click No if you don't want to change dates.");
+}
+
+QString datesnotchangedmessage(const QString& gedcomfile)
+{
+    return QDir::toNativeSeparators(gedcomfile)
+        + QStringLiteral(" has been modified by another application. Dates will not be changed as a precaution to "
+                         "ensure there is no data loss. This form will now close and the file will be reloaded.");
+}
+
+QString choosecensusmessage()
+{
+    return QStringLiteral("You must choose a census date from the 'change to' drop-down list");
+}
+
+} // namespace qm

@@ -1,0 +1,201 @@
+// quillmark-cli date-check, run as a user would run it: the three lists on the
+// bundled sample and on a generated family file, --country, --apply and its
+// refusals.
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFile>
+#include <QProcess>
+#include <QRegularExpression>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+#include <fstream>
+
+namespace {
+
+struct run {
+    int status = -1;
+    QString out;
+    QByteArray err;
+};
+
+class CliDateCheck : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        QDir(dir.path()).mkdir(QStringLiteral("backups"));
+        ini = dir.filePath(QStringLiteral("settings.ini"));
+        qm::settings s = qm::defaultsettings();
+        s.backupfolder = dir.filePath(QStringLiteral("backups"));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        qm::savesettings(*qm::settingsstore::onfile(ini), s);
+    }
+
+    run datecheck(const QStringList& args) const
+    {
+        QProcess p;
+        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+        env.insert(QStringLiteral("HOME"), dir.path());
+        env.insert(QStringLiteral("XDG_DATA_HOME"), dir.filePath(QStringLiteral("data")));
+        env.insert(QStringLiteral("XDG_CONFIG_HOME"), dir.filePath(QStringLiteral("config")));
+        p.setProcessEnvironment(env);
+        p.start(QStringLiteral(QM_CLI_PATH),
+                QStringList{QStringLiteral("date-check")} + args + QStringList{QStringLiteral("--settings"), ini});
+        run r;
+        if (!p.waitForFinished(120000) || p.exitStatus() != QProcess::NormalExit)
+            return r;
+        r.status = p.exitCode();
+        r.out = QString::fromUtf8(p.readAllStandardOutput());
+        r.err = p.readAllStandardError();
+        return r;
+    }
+
+    // A copy of the sample with some census dates changed.
+    QString sample(const std::vector<std::pair<std::string, std::string>>& edits = {})
+    {
+        const QString path = dir.filePath(QStringLiteral("sample.ged"));
+        std::string bytes = qmtest::readfile(qmtest::samplefile());
+        for (const auto& [from, to] : edits) {
+            const size_t at = bytes.find(from);
+            EXPECT_NE(at, std::string::npos) << from;
+            if (at != std::string::npos)
+                bytes.replace(at, from.size(), to);
+        }
+        QFile::remove(path);
+        qmtest::writefile(path, bytes);
+        return path;
+    }
+
+    QTemporaryDir dir;
+    QString ini;
+};
+
+void expectfailure(const run& r, const char* contains)
+{
+    EXPECT_EQ(r.status, 2);
+    EXPECT_TRUE(r.out.isEmpty()) << r.out.toStdString();
+    EXPECT_TRUE(r.err.startsWith("quillmark-cli: ")) << r.err.toStdString();
+    EXPECT_TRUE(r.err.contains(contains)) << r.err.toStdString();
+}
+
+} // namespace
+
+TEST_F(CliDateCheck, ListsTheSampleAsTheDialogDoes)
+{
+    const run uk = datecheck({sample()});
+    ASSERT_EQ(uk.status, 0) << uk.err.toStdString();
+    EXPECT_EQ(uk.out, QStringLiteral("Unknown Census dates:\n"
+                                     "Census entries found assumed to be for the UK:\n"
+                                     "6 JUN 1841 (6 occurences) : UK 1841 Census\n"
+                                     "30 MAR 1851 (5 occurences) : UK 1851 Census\n"
+                                     "7 APR 1861 (7 occurences) : UK 1861 Census\n"
+                                     "3 APR 1881 (7 occurences) : UK 1881 Census\n"
+                                     "2 APR 1871 (12 occurences) : UK 1871 Census\n"
+                                     "5 APR 1891 (8 occurences) : UK 1891 Census\n"
+                                     "31 MAR 1901 (3 occurences) : UK 1901 Census\n"
+                                     "Entries assumed to be for countries other than the UK:\n"));
+
+    // From the USA's rows, days shared by several countries are met at the
+    // first of them after the USA's.
+    const run usa = datecheck({sample(), QStringLiteral("--country"), QStringLiteral("usa")});
+    ASSERT_EQ(usa.status, 0);
+    EXPECT_TRUE(usa.out.startsWith(QStringLiteral("Unknown Census dates:\nCensus entries found assumed to be for the "
+                                                  "USA:\nEntries assumed to be for countries other than the USA:\n")));
+    EXPECT_TRUE(usa.out.contains(QStringLiteral("\n2 APR 1871 (12 occurences) : Canada 1871 Census\n")));
+    EXPECT_TRUE(usa.out.contains(QStringLiteral("\n31 MAR 1901 (3 occurences) : Ireland 1901 Census\n")));
+
+    const run unknown = datecheck({sample(), QStringLiteral("--country=France")});
+    expectfailure(unknown, "--country France");
+    expectfailure(datecheck({}), "needs one family file");
+    expectfailure(datecheck({dir.filePath(QStringLiteral("none.ged"))}), "no such file");
+}
+
+TEST_F(CliDateCheck, AppliesTheSuggestedChanges)
+{
+    const QString path = sample({{"2 DATE 6 JUN 1841", "2 DATE ABT 1841"},
+                                 {"2 DATE 30 MAR 1851", "2 DATE 30 Mar 1851"},
+                                 {"2 DATE 7 APR 1861", "2 DATE ABT 1650"}});
+    const std::string before = qmtest::readfile(path);
+    const run r = datecheck({path, QStringLiteral("--apply")});
+    ASSERT_EQ(r.status, 0) << r.err.toStdString();
+    const QStringList lines = r.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts);
+    ASSERT_GE(lines.size(), 6);
+    EXPECT_EQ(lines[0], QStringLiteral("Unknown Census dates:"));
+    EXPECT_EQ(lines[1], QStringLiteral("ABT 1841 (1 occurence) : [Suggest replacing with UK 1841 Census date 6 JUN 1841]"));
+    EXPECT_EQ(lines[2], QStringLiteral("30 Mar 1851 (1 occurence) : [Suggest replacing with UK 1851 Census date 30 MAR 1851]"));
+    EXPECT_EQ(lines[3], QStringLiteral("ABT 1650 (1 occurence) : [Quillmark can not suggest a date to replace this with]"));
+    EXPECT_EQ(lines[lines.size() - 2], QStringLiteral("Changed 2 census event dates and 0 occupation dates"));
+    ASSERT_TRUE(lines.back().startsWith(QStringLiteral("Backup: ")));
+    const QString backup = lines.back().mid(8);
+    EXPECT_EQ(qmtest::readfile(backup), before);
+
+    const std::string after = qmtest::readfile(path);
+    EXPECT_EQ(after.find("2 DATE ABT 1841"), std::string::npos);
+    EXPECT_EQ(after.find("2 DATE 30 Mar 1851"), std::string::npos);
+    EXPECT_NE(after.find("2 DATE ABT 1650"), std::string::npos);
+
+    // Again: nothing left to change, nothing written.
+    const run again = datecheck({path, QStringLiteral("--apply")});
+    ASSERT_EQ(again.status, 0);
+    EXPECT_FALSE(again.out.contains(QStringLiteral("Backup:")));
+    EXPECT_TRUE(again.out.contains(QStringLiteral("6 JUN 1841 (6 occurences) : UK 1841 Census")));
+    EXPECT_EQ(qmtest::readfile(path), after);
+    EXPECT_EQ(QDir(dir.filePath(QStringLiteral("backups"))).entryList(QDir::Files).size(), 1);
+}
+
+// A generated family file of 10,000 individuals: every dated census event is
+// counted once, under one of the three headings.
+TEST_F(CliDateCheck, GeneratedFile)
+{
+    const QString path = QStringLiteral("/work/gen/fam10000.ged");
+    if (!QFile::exists(path))
+        GTEST_SKIP() << "no generated file " << path.toStdString();
+    // The dated census events, counted independently of the program.
+    int64_t dated = 0;
+    {
+        std::ifstream in(path.toStdString(), std::ios::binary);
+        std::string line;
+        bool incensus = false;
+        while (std::getline(in, line)) {
+            if (!line.empty() && (line[0] == '0' || line[0] == '1'))
+                incensus = line.rfind("1 CENS", 0) == 0;
+            else if (incensus && line.rfind("2 DATE ", 0) == 0) {
+                ++dated;
+                incensus = false;
+            }
+        }
+    }
+    const run r = datecheck({path, QStringLiteral("--country"), QStringLiteral("UK")});
+    ASSERT_EQ(r.status, 0) << r.err.toStdString();
+    const QStringList lines = r.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts);
+    const qsizetype current = lines.indexOf(QStringLiteral("Census entries found assumed to be for the UK:"));
+    const qsizetype other = lines.indexOf(QStringLiteral("Entries assumed to be for countries other than the UK:"));
+    ASSERT_EQ(lines.value(0), QStringLiteral("Unknown Census dates:"));
+    ASSERT_GT(current, 0);
+    ASSERT_GT(other, current);
+    static const QRegularExpression entry(QStringLiteral("^(.+) \\((\\d+) occurences?\\) : (.+)$"));
+    int64_t counted = 0;
+    QStringList dates;
+    for (qsizetype i = 1; i < lines.size(); ++i) {
+        if (i == current || i == other)
+            continue;
+        const auto m = entry.match(lines[i]);
+        ASSERT_TRUE(m.hasMatch()) << lines[i].toStdString();
+        counted += m.captured(2).toLongLong();
+        EXPECT_FALSE(dates.contains(m.captured(1))) << lines[i].toStdString();
+        dates << m.captured(1);
+        if (i < current) {
+            EXPECT_TRUE(m.captured(3).startsWith(QLatin1Char('['))) << lines[i].toStdString();
+        }
+    }
+    EXPECT_EQ(counted, dated);
+    EXPECT_TRUE(r.out.contains(QStringLiteral("\n31 Mar 1901 (")));
+    EXPECT_TRUE(lines.contains(QRegularExpression(
+        QStringLiteral("^32 MAR 1901 \\(\\d+ occurences?\\) : \\[Suggest replacing with UK 1901 Census date 31 MAR 1901\\]$"))));
+}

@@ -1,0 +1,327 @@
+// The census date check: sorting the census event dates of a file, the
+// proposals, the list texts, the user's edits, the details and the rewrite of
+// the accepted changes (with occupation dates cited from the same source).
+#include "tools/datecheck.h"
+
+#include "census/censustable.h"
+#include "model/loadgedcom.h"
+#include "platform/clock.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+
+// A family file with one individual per list of census dates (I1, I2 ...),
+// each event at "Leeds" aged 30 unless the date list says otherwise.
+std::string family(const std::vector<std::vector<std::string>>& people)
+{
+    std::string out = "0 HEAD\r\n1 CHAR UTF-8\r\n";
+    int id = 0;
+    for (const auto& dates : people) {
+        ++id;
+        out += "0 @I" + std::to_string(id) + "@ INDI\r\n1 NAME Person" + std::to_string(id) + " /Smith/\r\n";
+        for (const std::string& d : dates)
+            out += "1 CENS\r\n2 DATE " + d + "\r\n2 PLAC Leeds\r\n2 AGE 30\r\n";
+    }
+    return out + "0 TRLR\r\n";
+}
+
+std::unique_ptr<gedcomindex> load(const std::string& bytes)
+{
+    return loadgedcombytes(bytes, flagtable{});
+}
+
+// The entry with this date, or null.
+const datechange* entry(const std::vector<datechange>& changes, const char* date)
+{
+    for (const datechange& d : changes)
+        if (d.founddate == QLatin1String(date))
+            return &d;
+    return nullptr;
+}
+
+// The proposal for one date under a country: its census row, or -1.
+int proposed(const char* date, const char* country = "UK")
+{
+    auto ix = load(family({{date}}));
+    datecheckstate s(*ix, dateorder::dmy);
+    s.choosecountry(QLatin1String(country));
+    EXPECT_EQ(s.changes().size(), 1u);
+    return s.changes().empty() ? -99 : s.changes()[0].censusrow;
+}
+
+int row(const char* country, int year)
+{
+    return findcensusrow(QLatin1String(country), year) + 1;
+}
+
+QStringList texts(const std::vector<datelistentry>& list)
+{
+    QStringList out;
+    for (const datelistentry& e : list)
+        out << e.text;
+    return out;
+}
+
+} // namespace
+
+TEST(DateCheck, CountryRowsAndCaptions)
+{
+    EXPECT_EQ(rowsofcountry(QStringLiteral("UK")).first, 1);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("UK")).last, 7);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("USA")).first, 8);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("USA")).last, 22);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("Ireland")).first, 23);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("Ireland")).last, 24);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("Canada")).first, 25);
+    EXPECT_EQ(rowsofcountry(QStringLiteral("Canada")).last, 33);
+    EXPECT_EQ(countryoption(QStringLiteral("France")), 0);
+    EXPECT_EQ(countryoption(QStringLiteral("Canada")), 3);
+
+    EXPECT_EQ(currentcountrycaption(QStringLiteral("UK")), QStringLiteral("Census entries found assumed to be for the UK:"));
+    EXPECT_EQ(othercountrycaption(QStringLiteral("USA")),
+              QStringLiteral("Entries assumed to be for countries other than the USA:"));
+    EXPECT_EQ(currentcountrycaption(QStringLiteral("Ireland")),
+              QStringLiteral("Census entries found assumed to be for Ireland:"));
+    EXPECT_EQ(othercountrycaption(QStringLiteral("Canada")),
+              QStringLiteral("Entries assumed to be for countries other than Canada:"));
+
+    const QStringList combo = censuschoices();
+    ASSERT_EQ(combo.size(), 33);
+    EXPECT_EQ(combo[1], QStringLiteral("UK 1851 Census (30 MAR 1851)"));
+    EXPECT_EQ(combo[26], QStringLiteral("Canada 1851 Census (12 JAN 1852)"));
+}
+
+TEST(DateCheck, SortsDatesIntoKindsAndCountsThem)
+{
+    auto ix = load(family({{"1851", "30 MAR 1851", "1 JUN 1850"}, {"1851", "31 MAR 1901"}, {"1851", "6 JUN 1841"}}));
+    const auto changes = analysecensusdates(*ix, QStringLiteral("UK"));
+    ASSERT_EQ(changes.size(), 5u);
+    // In the order first met.
+    EXPECT_EQ(changes[0].founddate, QStringLiteral("1851"));
+    EXPECT_EQ(changes[0].count, 3);
+    EXPECT_EQ(changes[0].datekind, 0);
+    EXPECT_EQ(changes[1].datekind, 1);
+    EXPECT_EQ(changes[1].censusrow, 2);
+    EXPECT_EQ(changes[2].datekind, 2); // USA 1850 under the UK
+    EXPECT_EQ(changes[2].censusrow, row("USA", 1850));
+    EXPECT_EQ(changes[3].founddate, QStringLiteral("31 MAR 1901"));
+    EXPECT_EQ(changes[4].count, 1);
+
+    // "31 MAR 1901" is the census of each country that held one on that day.
+    for (const char* c : {"UK", "Ireland", "Canada"}) {
+        const auto k = analysecensusdates(*ix, QLatin1String(c));
+        EXPECT_EQ(entry(k, "31 MAR 1901")->datekind, 1) << c;
+        EXPECT_EQ(entry(k, "31 MAR 1901")->censusrow, row(c, 1901)) << c;
+    }
+    EXPECT_EQ(entry(analysecensusdates(*ix, QStringLiteral("USA")), "31 MAR 1901")->datekind, 2);
+    // Under the USA, 1 JUN 1850 is its own census and 30 MAR 1851 another country's.
+    const auto usa = analysecensusdates(*ix, QStringLiteral("USA"));
+    EXPECT_EQ(entry(usa, "1 JUN 1850")->datekind, 1);
+    EXPECT_EQ(entry(usa, "30 MAR 1851")->datekind, 2);
+}
+
+TEST(DateCheck, EventsWithoutADateAreLeftOut)
+{
+    auto ix = load("0 HEAD\r\n0 @I1@ INDI\r\n1 CENS\r\n2 PLAC Leeds\r\n1 CENS\r\n2 DATE 1881\r\n0 TRLR\r\n");
+    const auto changes = analysecensusdates(*ix, QStringLiteral("UK"));
+    ASSERT_EQ(changes.size(), 1u);
+    EXPECT_EQ(changes[0].founddate, QStringLiteral("1881"));
+}
+
+TEST(DateCheck, ProposesTheNearestCensus)
+{
+    // Calendar dates, whatever their letter case; the compared text stays unrecognised.
+    EXPECT_EQ(proposed("30 Mar 1851"), row("UK", 1851));
+    EXPECT_EQ(proposed("3 apr 1881"), row("UK", 1881));
+    EXPECT_EQ(proposed("APR 1881"), row("UK", 1881));
+    // A year: 30 June of it. ABT 1851 is nearer the UK's 1851 census (92 days)
+    // than Canada's (196 days), whichever country is chosen.
+    EXPECT_EQ(proposed("ABT 1851"), row("UK", 1851));
+    EXPECT_EQ(proposed("ABT 1851", "Canada"), row("UK", 1851));
+    EXPECT_EQ(proposed("1851"), row("UK", 1851));
+    EXPECT_EQ(proposed("1852", "Canada"), row("Canada", 1851)); // 12 JAN 1852
+    EXPECT_EQ(proposed("1850", "USA"), row("USA", 1850));
+    // Far from any census, but within 200 years of 1900.
+    EXPECT_EQ(proposed("ABT 1701"), row("USA", 1790));
+    EXPECT_EQ(proposed("ABT 2099"), row("USA", 1930));
+    EXPECT_EQ(proposed("ABT 1650"), noproposal);
+    EXPECT_EQ(proposed("ABT 2100"), noproposal);
+    EXPECT_EQ(proposed("about"), noproposal);
+    EXPECT_EQ(proposed("851"), noproposal);
+    EXPECT_EQ(proposed("18x1"), noproposal);
+}
+
+TEST(DateCheck, TiesGoToTheCensusMetFirstFromTheChosenCountry)
+{
+    // 2 APR 1871 is the census day of the UK and of Canada: a date one day off
+    // is as near to both.
+    const QDate d(1871, 4, 3);
+    EXPECT_EQ(nearestcensus(d, QStringLiteral("UK")), row("UK", 1871));
+    EXPECT_EQ(nearestcensus(d, QStringLiteral("Canada")), row("Canada", 1871));
+    // From Ireland's or the USA's rows Canada's census is met before the walk wraps round to the UK's.
+    EXPECT_EQ(nearestcensus(d, QStringLiteral("Ireland")), row("Canada", 1871));
+    EXPECT_EQ(nearestcensus(d, QStringLiteral("USA")), row("Canada", 1871));
+    // 31 MAR 1901: UK, Ireland and Canada.
+    EXPECT_EQ(nearestcensus(QDate(1901, 4, 1), QStringLiteral("Ireland")), row("Ireland", 1901));
+    EXPECT_EQ(nearestcensus(QDate(1901, 4, 1), QStringLiteral("USA")), row("Ireland", 1901));
+}
+
+TEST(DateCheck, ListTexts)
+{
+    auto ix = load(family({{"1851", "1851", "1851", "ABT 1650", "1 JUN 1850", "30 MAR 1851"}, {"ABT 1650"}}));
+    datecheckstate s(*ix, dateorder::dmy);
+    s.choosecountry(QStringLiteral("UK"));
+    const datelists l = s.lists();
+    EXPECT_EQ(texts(l.unknown),
+              (QStringList{QStringLiteral("1851 (3 occurences) : [Suggest replacing with UK 1851 Census date 30 MAR 1851]"),
+                           QStringLiteral("ABT 1650 (2 occurences) : [Quillmark can not suggest a date to replace this with]")}));
+    EXPECT_EQ(texts(l.other), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
+    EXPECT_EQ(texts(l.current), QStringList{QStringLiteral("30 MAR 1851 (1 occurence) : UK 1851 Census")});
+    EXPECT_EQ(l.unknown[1].item, 1);
+    EXPECT_EQ(l.other[0].item, 2);
+    EXPECT_TRUE(l.canchange);
+
+    // Nothing to propose: nothing to change.
+    auto none = load(family({{"ABT 1650", "6 JUN 1841"}}));
+    datecheckstate t(*none, dateorder::dmy);
+    t.choosecountry(QStringLiteral("UK"));
+    EXPECT_FALSE(t.lists().canchange);
+}
+
+TEST(DateCheck, EditsAndTheirUndoingByChoosingTheCountryAgain)
+{
+    auto ix = load(family({{"1851", "1 JUN 1850", "6 JUN 1841"}}));
+    datecheckstate s(*ix, dateorder::dmy);
+    s.choosecountry(QStringLiteral("UK"));
+
+    EXPECT_EQ(s.edit(0, suggestion::refuse), QString());
+    EXPECT_EQ(s.changes()[0].censusrow, refusedchange);
+    EXPECT_TRUE(s.changes()[0].newdate.isEmpty());
+    EXPECT_EQ(s.lists().unknown[0].text,
+              QStringLiteral("1851 (1 occurence) : [User has requested Quillmark not to replace this date]"));
+    EXPECT_FALSE(s.lists().canchange);
+    // Agreeing afterwards does not bring the proposal back...
+    s.edit(0, suggestion::agree);
+    EXPECT_EQ(s.changes()[0].censusrow, refusedchange);
+    // ... choosing the country again does.
+    s.choosecountry(QStringLiteral("UK"));
+    EXPECT_EQ(s.changes()[0].censusrow, 2);
+    EXPECT_EQ(s.changes()[0].newdate, QStringLiteral("30 MAR 1851"));
+
+    // Refusing a recognised date changes nothing.
+    s.edit(2, suggestion::refuse);
+    EXPECT_EQ(s.changes()[2].censusrow, 1);
+    EXPECT_EQ(s.changes()[2].datekind, 1);
+
+    // "Change to:" needs a census, and moves a recognised date to the unknown ones.
+    EXPECT_EQ(s.edit(1, suggestion::changeto, 0), choosecensusmessage());
+    EXPECT_EQ(s.changes()[1].datekind, 2);
+    EXPECT_EQ(s.edit(1, suggestion::changeto, 2), QString());
+    EXPECT_EQ(s.changes()[1].datekind, 0);
+    EXPECT_EQ(s.changes()[1].newdate, QStringLiteral("30 MAR 1851"));
+    EXPECT_TRUE(s.changes()[1].applies());
+    const datelists l = s.lists();
+    EXPECT_EQ(l.unknown.size(), 2u);
+    EXPECT_TRUE(l.other.empty());
+    EXPECT_EQ(l.unknown[1].text,
+              QStringLiteral("1 JUN 1850 (1 occurence) : [Suggest replacing with UK 1851 Census date 30 MAR 1851]"));
+}
+
+TEST(DateCheck, Details)
+{
+    const std::string file = "0 HEAD\r\n"
+                             "0 @I1@ INDI\r\n1 NAME Zoe /Adams/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n2 AGE 3\r\n"
+                             "0 @I2@ INDI\r\n1 NAME Al /Brown/\r\n1 CENS\r\n2 DATE 1851\r\n2 AGE 40\r\n"
+                             "1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n"
+                             "1 CENS\r\n2 DATE 1861\r\n2 PLAC Hull\r\n"
+                             "0 @I3@ INDI\r\n1 NAME Cy /Adams/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC bath\r\n2 AGE 7\r\n"
+                             "0 TRLR\r\n";
+    auto ix = load(file);
+    datecheckstate s(*ix, dateorder::dmy);
+    s.choosecountry(QStringLiteral("UK"));
+    const auto people = s.details(0, false);
+    ASSERT_EQ(people.size(), 4u);
+    const QString name1 = qs(ix->people[0].name), name2 = qs(ix->people[1].name), name3 = qs(ix->people[2].name);
+    EXPECT_EQ(people[0].text, name3 + QStringLiteral(" 7 bath"));
+    EXPECT_EQ(people[0].person, 2);
+    EXPECT_EQ(people[1].text, name1 + QStringLiteral(" 3 York"));
+    EXPECT_EQ(people[2].text, name2 + QStringLiteral("  York")); // no age
+    EXPECT_EQ(people[3].text, name2 + QStringLiteral(" 40 <no place recorded>"));
+
+    const auto places = s.details(0, true);
+    ASSERT_EQ(places.size(), 3u);
+    EXPECT_EQ(places[0].text, QStringLiteral("<no place recorded> (in 1 census events)"));
+    EXPECT_EQ(places[1].text, QStringLiteral("bath (in 1 census events)"));
+    EXPECT_EQ(places[2].text, QStringLiteral("York (in 2 census events)"));
+    EXPECT_TRUE(s.details(9, true).empty());
+}
+
+// The accepted replacements written to the file, with the occupation dates
+// that cite the census event's source.
+TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
+{
+    QTemporaryDir dir;
+    ASSERT_TRUE(dir.isValid());
+    const QString path = dir.filePath(QStringLiteral("family.ged"));
+    qmtest::writefile(path,
+                      "0 HEAD\r\n1 CHAR ANSI\r\n"
+                      "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
+                      "1 CENS\r\n2 DATE ABT 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
+                      "1 OCCU Weaver\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
+                      "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
+                      "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
+                      "1 CENS\r\n2 DATE ABT 1650\r\n"
+                      "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
+                      "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
+    loadresult r = loadgedcom(path, flagtable{});
+    ASSERT_TRUE(r.index);
+    settings s = defaultsettings();
+    s.backupfolder = dir.filePath(QStringLiteral("backups"));
+    QDir().mkpath(s.backupfolder);
+    s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+    s.keeplog = true;
+    setclockfortests(QDateTime(QDate(2026, 12, 6), QTime(10, 0, 0)));
+
+    datecheckstate st(*r.index, dateorder::dmy);
+    st.choosecountry(QStringLiteral("UK"));
+    st.edit(3, suggestion::refuse); // 1881: kept as it is
+    const saveoutcome out = makedatechanges(*r.index, s, st.changes());
+    setclockfortests(QDateTime());
+    ASSERT_TRUE(out.saved()) << out.message.toStdString();
+    EXPECT_EQ(out.rewrite.censusdateschanged, 1);
+    EXPECT_EQ(out.rewrite.occdateschanged, 1);
+    EXPECT_TRUE(QFile::exists(out.backuppath));
+    EXPECT_EQ(qmtest::readfile(path),
+              "0 HEAD\r\n1 CHAR ANSI\r\n"
+              "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
+              "1 CENS\r\n2 DATE 30 MAR 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
+              "1 OCCU Weaver\r\n2 DATE 30 MAR 1851\r\n2 SOUR @S1@\r\n"
+              "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
+              "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
+              "1 CENS\r\n2 DATE ABT 1650\r\n"
+              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
+              "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
+              "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
+    const std::string log = qmtest::readfile(s.logpath);
+    EXPECT_NE(log.find("Changed 1 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
+    EXPECT_EQ(log.find("1881"), std::string::npos) << log;
+
+    // A file changed since it was read is left alone, with the check's own message.
+    const std::string now = qmtest::readfile(path);
+    qmtest::writefile(path, now + "\r\n");
+    const saveoutcome late = makedatechanges(*r.index, s, st.changes());
+    EXPECT_EQ(late.status, savestatus::changed);
+    EXPECT_EQ(late.message, datesnotchangedmessage(path));
+    EXPECT_TRUE(late.message.endsWith(QStringLiteral(" has been modified by another application. Dates will not be "
+                                                     "changed as a precaution to ensure there is no data loss. This "
+                                                     "form will now close and the file will be reloaded.")));
+    EXPECT_EQ(qmtest::readfile(path), now + "\r\n");
+}
