@@ -1,11 +1,35 @@
 #include "app/mainfrm.h"
 
+#include "flags/flagcheckfrm.h"
+#include "flags/flagfrm.h"
+
 namespace qm {
 
-// "Census Flags...".
+// "Census Flags...": the flag definitions are stored when the dialog closes;
+// the file is read again when its Flag Check rewrote it, and the program ends
+// when that rewrite failed.
 void mainfrm::censusflags()
 {
-    comingsoon();
+    if (!index_)
+        return;
+    bool fatal = false;
+    runtool([this, &fatal] {
+        flagfrm* owner = nullptr;
+        flagfrm d(
+            *index_, settings_, store_, prompts_,
+            [this, &fatal, &owner] {
+                const flagcheckend end = flagcheckfrm::open(*index_, settings_, store_, prompts_, owner);
+                fatal = end == flagcheckend::fatal;
+                return end != flagcheckend::unchanged;
+            },
+            this);
+        owner = &d;
+        d.exec();
+        if (d.reloadneeded() && !fatal)
+            reloadneeded_ = true;
+    });
+    if (fatal)
+        endprogram();
 }
 
 } // namespace qm

@@ -1,0 +1,383 @@
+// The Census Flags dialog and its two choosers on the offscreen platform: the
+// allocation rules as the user meets them, deletion, the "Flag Use" setting,
+// the flag check hand-off, and one allocation made from the main window's menu.
+#include "flags/flagdatefrm.h"
+#include "flags/flagfrm.h"
+#include "flags/flagnamefrm.h"
+
+#include "flags/flagalloc.h"
+#include "model/gedcomindex.h"
+#include "support/mainfrmfixture.h"
+
+#include <QAction>
+#include <QCheckBox>
+#include <QFontInfo>
+#include <QListWidget>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QtTest>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+template <class T = QPushButton>
+T* child(const QWidget* w, const char* name)
+{
+    T* c = w->findChild<T*>(QString::fromLatin1(name));
+    if (!c)
+        qWarning("no control %s", name);
+    return c;
+}
+
+QStringList rows(const QWidget* w, const char* list = "flagslst")
+{
+    QStringList out;
+    const auto* l = child<QListWidget>(w, list);
+    for (int i = 0; i < l->count(); ++i)
+        out << l->item(i)->text();
+    return out;
+}
+
+void clickrow(QListWidget* l, const QString& text)
+{
+    const QList<QListWidgetItem*> found = l->findItems(text, Qt::MatchExactly);
+    QVERIFY2(!found.isEmpty(), qPrintable(text));
+    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(found.front()).center());
+}
+
+personrec holding(std::initializer_list<int32_t> flags)
+{
+    personrec p;
+    p.flagids = flags;
+    return p;
+}
+
+// One dialog's surroundings: a family of three, the settings and their store.
+struct bench {
+    QTemporaryDir dir;
+    std::unique_ptr<settingsstore> store = settingsstore::onfile(dir.filePath(QStringLiteral("s.ini")));
+    scriptedprompts prompts;
+    settings s = defaultsettings();
+    gedcomindex ix;
+
+    bench()
+    {
+        ix.flags = {{"__C1881", "Census 1881", "1881", 2, "UK"},
+                    {"__UNUSED", "Unused", "5 APR 1891", 0, "UK"},
+                    {"__C1901", "Census 1901", "31 MAR 1901", 1, "Ireland"},
+                    {"__OLD", "Old flag", "", 1, ""}};
+        ix.people.push_back(holding({0, 2}));
+        ix.people.push_back(holding({0}));
+        ix.people.push_back(holding({3}));
+    }
+    QString stored(int n, const char* value) const
+    {
+        return store->read(QStringLiteral("Flags/%1").arg(n), QString::fromLatin1(value)).value_or(QString());
+    }
+};
+
+} // namespace
+
+class flagfrmtest : public QObject {
+    Q_OBJECT
+
+private:
+    windowfiles files_;
+
+private slots:
+    void controlsandsetting()
+    {
+        bench b;
+        b.s.flaguse = true;
+        flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
+        d.show();
+        QCOMPARE(d.objectName(), QStringLiteral("flagfrm"));
+        QCOMPARE(d.windowTitle(), QStringLiteral("Census Flags"));
+        for (const char* name : {"Datebut", "flagbut", "delbut", "flagcheckbut", "okbut", "helpbut"})
+            QVERIFY2(child(&d, name) && !child(&d, name)->accessibleName().isEmpty(), name);
+        for (const char* name : {"datelab", "flaglab", "countrylab"})
+            QVERIFY2(child<QLineEdit>(&d, name)->isReadOnly(), name);
+        QCOMPARE(rows(&d), (QStringList{"1881           UK             Census 1881",
+                                        "5 APR 1891     UK             Unused",
+                                        "31 MAR 1901    Ireland        Census 1901"}));
+        QVERIFY(QFontInfo(child<QListWidget>(&d, "flagslst")->font()).fixedPitch());
+        QCOMPARE(child<QLabel>(&d, "headinglab")->text(), flagheading());
+        QVERIFY(!child(&d, "delbut")->isEnabled());
+        QVERIFY(child(&d, "flagcheckbut")->isEnabled());
+        QVERIFY(child(&d, "okbut")->isDefault());
+
+        // Shown from the setting without storing it; a click stores it at once.
+        auto* flagschk = child<QCheckBox>(&d, "flagschk");
+        QVERIFY(flagschk->isChecked());
+        QVERIFY(!b.store->read(QStringLiteral("Flag Use")));
+        QTest::mouseClick(flagschk, Qt::LeftButton);
+        QCOMPARE(b.store->read(QStringLiteral("Flag Use")), QStringLiteral("0"));
+        QVERIFY(!b.s.flaguse);
+
+        QTest::mouseClick(child(&d, "helpbut"), Qt::LeftButton);
+        QCOMPARE(b.prompts.helpshown, QStringList{"45"});
+
+        // Escape closes, and the definitions are written.
+        QTest::keyClick(&d, Qt::Key_Escape);
+        QVERIFY(!d.isVisible());
+        QCOMPARE(b.stored(3, "Country"), QStringLiteral("Ireland"));
+
+        // No individuals: nothing for the flag check to do.
+        b.ix.people.clear();
+        flagfrm e(b.ix, b.s, *b.store, b.prompts, {});
+        QVERIFY(!child(&e, "flagcheckbut")->isEnabled());
+        QCOMPARE(b.prompts.unexpected(), 0);
+    }
+
+    // Allocating with "Flag Use" off asks whether to record flags: No leaves
+    // the setting, Yes ticks and stores it.
+    void allocateasksforflaguse()
+    {
+        bench b;
+        flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
+        d.setcensus(QStringLiteral("Canada"), QStringLiteral("4 APR 1881"));
+        QCOMPARE(child<QLineEdit>(&d, "datelab")->text(), QStringLiteral("4 APR 1881"));
+        QCOMPARE(child<QLineEdit>(&d, "countrylab")->text(), QStringLiteral("Canada"));
+        QCOMPARE(rows(&d).size(), 3); // no name yet: nothing allocated
+
+        b.prompts.expect(answer::no, flaguseprompt());
+        d.setflagname(QStringLiteral("Canada 1881"));
+        QCOMPARE(b.prompts.unexpected(), 0);
+        const message& m = b.prompts.history().back().m;
+        QVERIFY(m.choice == buttons::yesno && m.kind == icon::question && m.title == QStringLiteral("Quillmark"));
+        QCOMPARE(rows(&d).back(), QStringLiteral("4 APR 1881     Canada         Canada 1881"));
+        QCOMPARE(child<QListWidget>(&d, "flagslst")->currentRow(), 3);
+        for (const char* name : {"datelab", "flaglab", "countrylab"})
+            QVERIFY2(child<QLineEdit>(&d, name)->text().isEmpty(), name);
+        QVERIFY(!child<QCheckBox>(&d, "flagschk")->isChecked());
+        QVERIFY(!b.store->read(QStringLiteral("Flag Use")));
+        QCOMPARE(b.ix.flags.back().code, "__CANADA_1881");
+
+        // An existing name first, the census second; Yes this time.
+        b.prompts.expect(answer::yes, flaguseprompt());
+        d.setflagname(QStringLiteral("Old flag"), 3);
+        d.setcensus(QStringLiteral("UK"), QStringLiteral("30 MAR 1851"));
+        QCOMPARE(b.ix.flags.size(), size_t(5));
+        QCOMPARE(b.ix.flags[3].date, "30 MAR 1851");
+        QVERIFY(child<QCheckBox>(&d, "flagschk")->isChecked());
+        QCOMPARE(b.store->read(QStringLiteral("Flag Use")), QStringLiteral("1"));
+        QVERIFY(b.s.flaguse);
+
+        // With "Flag Use" on, no question.
+        d.setflagname(QStringLiteral("USA 1900"));
+        d.setcensus(QStringLiteral("USA"), QStringLiteral("1900"));
+        QCOMPARE(b.prompts.unexpected(), 0);
+        QCOMPARE(b.prompts.history().size(), size_t(2));
+        d.accept();
+        QCOMPARE(b.stored(6, "Name"), QStringLiteral("USA 1900"));
+    }
+
+    // A flag held by two individuals loses its census only: it leaves the
+    // list, is offered by Census Flag Names, and is not stored on close.
+    void deleteheldflag()
+    {
+        bench b;
+        flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        auto* list = child<QListWidget>(&d, "flagslst");
+        clickrow(list, rows(&d)[0]);
+        QVERIFY(child(&d, "delbut")->isEnabled());
+        QTest::mouseClick(child(&d, "delbut"), Qt::LeftButton);
+        QCOMPARE(rows(&d), (QStringList{"5 APR 1891     UK             Unused",
+                                        "31 MAR 1901    Ireland        Census 1901"}));
+        QVERIFY(!child(&d, "delbut")->isEnabled());
+        QCOMPARE(b.ix.flags.size(), size_t(4));
+        QCOMPARE(b.ix.flags[0].country, "UK");
+
+        flagnamefrm names(b.ix.flags, b.prompts);
+        QCOMPARE(rows(&names), (QStringList{"Census 1881", "Old flag"}));
+
+        // The unheld flag before "Census 1901" goes; holders keep their flags.
+        clickrow(list, rows(&d)[0]);
+        QTest::mouseClick(child(&d, "delbut"), Qt::LeftButton);
+        QCOMPARE(b.ix.flags.size(), size_t(3));
+        QCOMPARE(b.ix.flags[b.ix.people[0].flagids[1]].code, "__C1901");
+        QCOMPARE(b.ix.flags[b.ix.people[2].flagids[0]].code, "__OLD");
+        QCOMPARE(rows(&d), QStringList{"31 MAR 1901    Ireland        Census 1901"});
+
+        QTest::mouseClick(child(&d, "okbut"), Qt::LeftButton);
+        QCOMPARE(b.stored(1, "Code"), QStringLiteral("__C1901"));
+        QVERIFY(!b.store->groupexists(QStringLiteral("Flags/2")));
+        QCOMPARE(b.prompts.unexpected(), 0);
+    }
+
+    void flagcheckclosesonreload()
+    {
+        bench b;
+        int runs = 0;
+        bool reload = false;
+        flagfrm d(b.ix, b.s, *b.store, b.prompts, [&] { ++runs; return reload; });
+        d.show();
+        QTest::mouseClick(child(&d, "flagcheckbut"), Qt::LeftButton);
+        QCOMPARE(runs, 1);
+        QVERIFY(d.isVisible());
+        QVERIFY(!d.reloadneeded());
+        reload = true;
+        QTest::mouseClick(child(&d, "flagcheckbut"), Qt::LeftButton);
+        QVERIFY(!d.isVisible());
+        QVERIFY(d.reloadneeded());
+        QCOMPARE(b.stored(1, "Code"), QStringLiteral("__C1881"));
+    }
+
+    // A UK flag for the year 1881 refuses the UK census of 3 APR 1881 but not
+    // the Canadian one of 4 APR 1881.
+    void datechooser()
+    {
+        bench b;
+        b.s.country = QStringLiteral("Ireland");
+        flagdatefrm d(b.ix.flags, b.s.country, b.prompts);
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        QCOMPARE(d.windowTitle(), QStringLiteral("Census Flag Date"));
+        QVERIFY(child<QRadioButton>(&d, "IrelandOpt")->isChecked());
+        QCOMPARE(rows(&d, "datelst"), QStringList{"2 APR 1911"});
+        QVERIFY(!child(&d, "datebut")->isEnabled() && !child(&d, "Yearbut")->isEnabled());
+
+        QTest::mouseClick(child<QRadioButton>(&d, "ukopt"), Qt::LeftButton);
+        QCOMPARE(rows(&d, "datelst"),
+                 (QStringList{"6 JUN 1841", "30 MAR 1851", "7 APR 1861", "2 APR 1871", "3 APR 1881", "31 MAR 1901"}));
+        clickrow(child<QListWidget>(&d, "datelst"), QStringLiteral("3 APR 1881"));
+        QCOMPARE(child<QLineEdit>(&d, "datelab")->text(), QStringLiteral("3 APR 1881"));
+        QCOMPARE(child<QLineEdit>(&d, "yearlab")->text(), QStringLiteral("1881"));
+        const QString refusal = QStringLiteral(
+            "Another flag has already been associated with UK 3 APR 1881. Either choose another date or press cancel.");
+        b.prompts.expect(answer::ok, refusal);
+        QTest::mouseClick(child(&d, "datebut"), Qt::LeftButton);
+        b.prompts.expect(answer::ok, QStringLiteral("with UK 1881."));
+        QTest::mouseClick(child(&d, "Yearbut"), Qt::LeftButton);
+        QCOMPARE(b.prompts.unexpected(), 0);
+        QCOMPARE(b.prompts.texts().front(), refusal);
+        QVERIFY(d.isVisible());
+        QVERIFY(!d.chosen());
+
+        QTest::mouseClick(child<QRadioButton>(&d, "CanadaOpt"), Qt::LeftButton);
+        QVERIFY(child<QLineEdit>(&d, "datelab")->text().isEmpty());
+        clickrow(child<QListWidget>(&d, "datelst"), QStringLiteral("4 APR 1881"));
+        QTest::mouseClick(child(&d, "datebut"), Qt::LeftButton);
+        QVERIFY(!d.isVisible());
+        QVERIFY(d.chosen());
+        QCOMPARE(d.chosen()->country, QStringLiteral("Canada"));
+        QCOMPARE(d.chosen()->date, QStringLiteral("4 APR 1881"));
+
+        // A year: the year of the census day; any other country setting opens on UK.
+        flagdatefrm y(b.ix.flags, QStringLiteral("France"), b.prompts);
+        y.show();
+        QVERIFY(child<QRadioButton>(&y, "ukopt")->isChecked());
+        clickrow(child<QListWidget>(&y, "datelst"), QStringLiteral("7 APR 1861"));
+        QTest::mouseClick(child(&y, "Yearbut"), Qt::LeftButton);
+        QVERIFY(y.chosen());
+        QCOMPARE(y.chosen()->date, QStringLiteral("1861"));
+        QCOMPARE(b.prompts.history().size(), size_t(2));
+        QTest::mouseClick(child(&y, "helpbut"), Qt::LeftButton);
+        QCOMPARE(b.prompts.helpshown, QStringList{"45"});
+    }
+
+    void namechooser()
+    {
+        bench b;
+        flagnamefrm d(b.ix.flags, b.prompts);
+        d.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        QCOMPARE(d.windowTitle(), QStringLiteral("Census Flag Names"));
+        const QList<QRadioButton*> opt = d.findChildren<QRadioButton*>(QStringLiteral("optflag"));
+        QCOMPARE(opt.size(), 2);
+        QVERIFY(opt[0]->isChecked());
+        QCOMPARE(rows(&d), QStringList{"Old flag"});
+        auto* ok = child(&d, "okbut");
+        QVERIFY(!ok->isEnabled());
+
+        // Typing chooses a new name; OK only for a name that is not blank.
+        auto* text = child<QLineEdit>(&d, "flagnametxt");
+        QTest::keyClicks(text, QStringLiteral("  "));
+        QVERIFY(opt[1]->isChecked());
+        QVERIFY(!ok->isEnabled());
+        QTest::keyClicks(text, QStringLiteral("o.l.d"));
+        QVERIFY(ok->isEnabled());
+        const QString toosimilar = QStringLiteral("Name is too similar to an existing flag name.");
+        b.prompts.expect(answer::ok, toosimilar);
+        QTest::mouseClick(ok, Qt::LeftButton);
+        QVERIFY(d.isVisible());
+        QVERIFY(text->hasFocus());
+        QCOMPARE(b.prompts.history().back().m.kind, icon::critical);
+
+        // A row clicked chooses the existing flag again.
+        clickrow(child<QListWidget>(&d, "flagslst"), QStringLiteral("Old flag"));
+        QVERIFY(opt[0]->isChecked() && ok->isEnabled());
+        QTest::mouseClick(text, Qt::LeftButton);
+        QVERIFY(opt[1]->isChecked());
+        // (on the button's indicator: the stretched button reacts only there and on its text)
+        QTest::mouseClick(opt[0], Qt::LeftButton, {}, QPoint(6, opt[0]->height() / 2));
+        QVERIFY(opt[0]->isChecked() && ok->isEnabled());
+        QVERIFY(child<QListWidget>(&d, "flagslst")->hasFocus());
+        QTest::mouseClick(ok, Qt::LeftButton);
+        QVERIFY(d.chosen());
+        QCOMPARE(d.chosen()->name, QStringLiteral("Old flag"));
+        QCOMPARE(d.chosen()->existing, std::optional<size_t>(3));
+        QCOMPARE(b.prompts.unexpected(), 0);
+
+        // No unallocated flag: only a new name, given back trimmed.
+        b.ix.flags.pop_back();
+        flagnamefrm n(b.ix.flags, b.prompts);
+        n.show();
+        const QList<QRadioButton*> nopt = n.findChildren<QRadioButton*>(QStringLiteral("optflag"));
+        QVERIFY(!nopt[0]->isEnabled() && nopt[1]->isChecked());
+        QTest::keyClicks(child<QLineEdit>(&n, "flagnametxt"), QStringLiteral(" Census 1891 "));
+        QTest::keyClick(child<QLineEdit>(&n, "flagnametxt"), Qt::Key_Return);
+        QCOMPARE(n.result(), int(QDialog::Accepted));
+        QVERIFY(n.chosen());
+        QCOMPARE(n.chosen()->name, QStringLiteral("Census 1891"));
+        QVERIFY(!n.chosen()->existing);
+    }
+
+    // From the main window: a census and a new name chosen through both
+    // choosers; the row appears and the definition is stored on close.
+    void fromthemenu()
+    {
+        auto run = files_.opened(files_.sample());
+        QVERIFY(run);
+        const QString name = QStringLiteral("Canada Census 1881");
+        bool checked = false;
+        dialoganswers answers;
+        answers.expect(QStringLiteral("flagfrm"), [&](QDialog* d) {
+            QTimer::singleShot(0, d, [&, d] {
+                QTest::mouseClick(child(d, "Datebut"), Qt::LeftButton);
+                QTest::mouseClick(child(d, "flagbut"), Qt::LeftButton);
+                checked = rows(d).contains(QStringLiteral("4 APR 1881     Canada         ") + name);
+                QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
+            });
+        });
+        answers.expect(QStringLiteral("flagdatefrm"), [](QDialog* d) {
+            QTest::mouseClick(child<QRadioButton>(d, "CanadaOpt"), Qt::LeftButton);
+            clickrow(child<QListWidget>(d, "datelst"), QStringLiteral("4 APR 1881"));
+            QTest::mouseClick(child(d, "datebut"), Qt::LeftButton);
+        });
+        answers.expect(QStringLiteral("flagnamefrm"), [&](QDialog* d) {
+            QTest::keyClicks(child<QLineEdit>(d, "flagnametxt"), name);
+            QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
+        });
+        run->prompts.expect(answer::no, flaguseprompt());
+        run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
+        QCOMPARE(answers.unexpected, 0);
+        QCOMPARE(answers.pending(), 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QVERIFY(checked);
+        QVERIFY(run->w->watching());
+        const auto group = QStringLiteral("Flags/1");
+        QCOMPARE(run->store->read(group, QStringLiteral("Code")), QStringLiteral("__CANADA_CENSUS"));
+        QCOMPARE(run->store->read(group, QStringLiteral("Name")), name);
+        QCOMPARE(run->store->read(group, QStringLiteral("Date")), QStringLiteral("4 APR 1881"));
+        QCOMPARE(run->store->read(group, QStringLiteral("Country")), QStringLiteral("Canada"));
+        QVERIFY(!run->store->groupexists(QStringLiteral("Flags/2")));
+    }
+};
+
+QTEST_MAIN(flagfrmtest)
+#include "flagfrm_test.moc"
