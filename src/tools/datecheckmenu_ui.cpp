@@ -1,11 +1,24 @@
 #include "app/mainfrm.h"
+#include "tools/datecheckfrm.h"
 
 namespace qm {
 
-// "Census Date Check...".
+// "Census Date Check...": the dialog runs with the watch for outside changes
+// off; the file is read again when it was rewritten (or found changed), and a
+// failed rewrite ends the program.
 void mainfrm::censusdatecheck()
 {
-    comingsoon();
+    if (!index_)
+        return;
+    bool fatal = false;
+    runtool([this, &fatal] {
+        Datecheckfrm dialog(prompts_, *index_, settings_, this);
+        dialog.exec();
+        fatal = dialog.fatal();
+        reloadneeded_ = dialog.reloadneeded() && !fatal;
+    });
+    if (fatal)
+        endprogram();
 }
 
 } // namespace qm

@@ -1,0 +1,296 @@
+// The Census Date Check dialog on the offscreen platform, opened from the main
+// window's Tools menu: the three lists, the edit frame (agree, refuse, change
+// to another census), the details, choosing another country, making the
+// changes (the file rewritten and read again) and a file changed by another
+// program before the changes are confirmed.
+#include "tools/datecheckfrm.h"
+
+#include "platform/clock.h"
+#include "support/mainfrmfixture.h"
+
+#include <QAction>
+#include <QGroupBox>
+#include <QListWidget>
+#include <QMenuBar>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QStringListModel>
+#include <QtTest>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+QStringList filelines(const QString& path)
+{
+    QFile f(path);
+    if (!f.open(QIODevice::ReadOnly))
+        return {};
+    return QString::fromUtf8(f.readAll()).split(QStringLiteral("\r\n"));
+}
+
+// Replaces whole lines (1-based numbers), each only when it reads `from`.
+bool editlines(const QString& path, const std::vector<std::tuple<int, const char*, const char*>>& edits)
+{
+    QStringList lines = filelines(path);
+    for (const auto& [n, from, to] : edits) {
+        if (lines.value(n - 1) != QLatin1String(from))
+            return false;
+        lines[n - 1] = QLatin1String(to);
+    }
+    QFile f(path);
+    return f.open(QIODevice::WriteOnly | QIODevice::Truncate) && f.write(lines.join(QStringLiteral("\r\n")).toUtf8()) > 0;
+}
+
+template <class T>
+T* control(QDialog* d, const QString& name)
+{
+    return d->findChild<T*>(name);
+}
+
+QStringList rows(QDialog* d, const char* list)
+{
+    QStringList out;
+    auto* l = control<QListWidget>(d, QString::fromLatin1(list));
+    for (int i = 0; l && i < l->count(); ++i)
+        out << l->item(i)->text();
+    return out;
+}
+
+void clickentry(QDialog* d, const char* list, int row)
+{
+    auto* l = control<QListWidget>(d, QString::fromLatin1(list));
+    QListWidgetItem* item = l->item(row);
+    l->scrollToItem(item);
+    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(item).center());
+}
+
+void click(QDialog* d, const QString& name)
+{
+    control<QAbstractButton>(d, name)->click();
+}
+
+QStringList details(QDialog* d)
+{
+    auto* v = control<QListView>(d, QStringLiteral("peoplelst"));
+    return static_cast<QStringListModel*>(v->model())->stringList();
+}
+
+void opendatecheck(mainfrm& w)
+{
+    QAction* a = w.menuBar()->findChild<QAction*>(QStringLiteral("datecheckmen"));
+    QVERIFY(a);
+    QCOMPARE(a->text(), QStringLiteral("Census Date Check..."));
+    a->trigger();
+}
+
+} // namespace
+
+class datecheckfrmtest : public QObject {
+    Q_OBJECT
+
+    windowfiles files;
+    QString backups;
+
+    settings testsettings() const
+    {
+        settings s = defaultsettings();
+        s.backupfolder = backups;
+        s.logpath = files.filepath(QStringLiteral("censuslog.txt"));
+        return s;
+    }
+
+    int backupcount() const { return static_cast<int>(QDir(backups).entryList(QDir::Files).size()); }
+
+    // The sample with four census dates that are no census day and one of
+    // another country's census; William's 1851 occupation cites his 1851 census.
+    QString family()
+    {
+        const QString path = files.sample();
+        const bool ok = editlines(path, {{23, "2 DATE 6 JUN 1841", "2 DATE ABT 1841"},
+                                         {30, "2 DATE 30 MAR 1851", "2 DATE 1 JUN 1850"},
+                                         {37, "2 DATE 7 APR 1861", "2 DATE 7 Apr 1861"},
+                                         {115, "2 DATE 30 MAR 1851", "2 DATE ABT 1851"},
+                                         {122, "2 DATE 30 MAR 1851", "2 DATE ABT 1851"}});
+        return ok ? path : QString();
+    }
+
+private slots:
+    void initTestCase()
+    {
+        QVERIFY(files.valid());
+        backups = files.filepath(QStringLiteral("backups"));
+        QVERIFY(QDir().mkpath(backups));
+        setclockfortests(QDateTime(QDate(2026, 12, 6), QTime(14, 30, 0)));
+    }
+    void cleanupTestCase() { setclockfortests(QDateTime()); }
+
+    void listseditsandchanges()
+    {
+        const QString file = family();
+        QVERIFY(!file.isEmpty());
+        const settings s = testsettings();
+        auto run = files.opened(file, &s);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        const int before = backupcount();
+
+        auto dialogs = std::make_unique<dialoganswers>();
+        bool done = false;
+        dialogs->expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
+            done = true;
+            QCOMPARE(d->windowTitle(), QStringLiteral("Census Date Check"));
+            QVERIFY(control<QRadioButton>(d, QStringLiteral("countryopt0"))->isChecked());
+            QCOMPARE(control<QLabel>(d, QStringLiteral("currentcountrylab"))->text(),
+                     QStringLiteral("Census entries found assumed to be for the UK:"));
+            QCOMPARE(control<QLabel>(d, QStringLiteral("countrylab"))->text(),
+                     QStringLiteral("Entries assumed to be for countries other than the UK:"));
+            QCOMPARE(rows(d, "changelst"),
+                     (QStringList{
+                         QStringLiteral("ABT 1841 (1 occurence) : [Suggest replacing with UK 1841 Census date 6 JUN 1841]"),
+                         QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with UK 1861 Census date 7 APR 1861]"),
+                         QStringLiteral("ABT 1851 (1 occurence) : [Suggest replacing with UK 1851 Census date 30 MAR 1851]")}));
+            QCOMPARE(rows(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
+            const QStringList current = rows(d, "currentlst");
+            QCOMPARE(current.size(), 7);
+            QCOMPARE(current[0], QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
+            QVERIFY(current.contains(QStringLiteral("31 MAR 1901 (3 occurences) : UK 1901 Census")));
+            auto* changebut = control<QPushButton>(d, QStringLiteral("changebut"));
+            QVERIFY(changebut->isEnabled());
+            auto* frame = control<QGroupBox>(d, QStringLiteral("suggestionframe"));
+            QVERIFY(frame->isHidden());
+            auto* combo = control<QComboBox>(d, QStringLiteral("suggestcombo"));
+            QCOMPARE(combo->count(), 33);
+            QCOMPARE(combo->itemText(1), QStringLiteral("UK 1851 Census (30 MAR 1851)"));
+
+            // Help.
+            click(d, QStringLiteral("helpbut"));
+            QCOMPARE(run->prompts.helpshown, QStringList{QStringLiteral("35")});
+
+            // Another country's date: only "Don't make change" or "Change to:".
+            clickentry(d, "countrylst", 0);
+            QVERIFY(frame->isVisible());
+            QCOMPARE(control<QLabel>(d, QStringLiteral("datelab"))->text(), QStringLiteral("1 JUN 1850"));
+            QVERIFY(!control<QRadioButton>(d, QStringLiteral("suggestopt0"))->isEnabled());
+            QVERIFY(control<QRadioButton>(d, QStringLiteral("suggestopt1"))->isChecked());
+            QVERIFY(!combo->isEnabled());
+            QCOMPARE(details(d), QStringList{qs(w.index()->people[0].name) + QStringLiteral(" 43 Hebden Bridge, Yorkshire, England")});
+            // ... left as it is.
+            click(d, QStringLiteral("OKbut"));
+            QVERIFY(frame->isHidden());
+            QCOMPARE(rows(d, "countrylst").size(), 1);
+
+            // Refuse the first proposal.
+            clickentry(d, "changelst", 0);
+            QVERIFY(control<QRadioButton>(d, QStringLiteral("suggestopt0"))->isChecked());
+            click(d, QStringLiteral("suggestopt1"));
+            click(d, QStringLiteral("OKbut"));
+            QCOMPARE(rows(d, "changelst")[0],
+                     QStringLiteral("ABT 1841 (1 occurence) : [User has requested Quillmark not to replace this date]"));
+
+            // Change the second to another census: first without choosing one.
+            clickentry(d, "changelst", 1);
+            click(d, QStringLiteral("suggestopt2"));
+            QVERIFY(combo->isEnabled());
+            run->prompts.expect(answer::ok, QStringLiteral("You must choose a census date from the 'change to' drop-down list"));
+            click(d, QStringLiteral("OKbut"));
+            QCOMPARE(run->prompts.unexpected(), 0);
+            QVERIFY(frame->isVisible());
+            combo->setCurrentIndex(combo->findText(QStringLiteral("Canada 1861 Census (14 JAN 1861)")));
+            click(d, QStringLiteral("OKbut"));
+            QCOMPARE(rows(d, "changelst")[1],
+                     QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with Canada 1861 Census date 14 JAN 1861]"));
+
+            // Places of a date.
+            clickentry(d, "currentlst", 0);
+            QVERIFY(rows(d, "changelst").size() == 3 && control<QListWidget>(d, QStringLiteral("changelst"))->selectedItems().isEmpty());
+            click(d, QStringLiteral("peopleopt1"));
+            QCOMPARE(details(d), QStringList{QStringLiteral("Heptonstall, Yorkshire, England (in 5 census events)")});
+
+            // Confirm; "No" first changes nothing.
+            run->prompts.expect(answer::no, QStringLiteral("Are you sure you want to make the changes to dates"));
+            changebut->click();
+            QVERIFY(d->isVisible());
+            run->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to make the changes to dates as specfied "
+                                                            "in the 'Unknown census dates' list?"));
+            changebut->click();
+        });
+        opendatecheck(w);
+        QTRY_VERIFY(done);
+        QCOMPARE(dialogs->unexpected, 0);
+        dialogs.reset();
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QCOMPARE(backupcount(), before + 1);
+
+        const QStringList lines = filelines(file);
+        QCOMPARE(lines[22], QStringLiteral("2 DATE ABT 1841"));   // refused
+        QCOMPARE(lines[29], QStringLiteral("2 DATE 1 JUN 1850"));  // another country's census: left
+        QCOMPARE(lines[36], QStringLiteral("2 DATE 14 JAN 1861")); // changed to the census chosen
+        QCOMPARE(lines[114], QStringLiteral("2 DATE 30 MAR 1851")); // the proposal agreed
+        QCOMPARE(lines[121], QStringLiteral("2 DATE 30 MAR 1851")); // and the occupation citing the same source
+        // The file was read again: the index holds the new dates.
+        QCOMPARE(qs(w.index()->people[2].census[1].date), QStringLiteral("30 MAR 1851"));
+        QVERIFY(w.watching());
+
+        // Choosing the country again discards the edits; USA's captions.
+        dialoganswers again;
+        bool seen = false;
+        again.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
+            seen = true;
+            QCOMPARE(rows(d, "changelst").size(), 1); // only ABT 1841 is left
+            click(d, QStringLiteral("countryopt1"));
+            QCOMPARE(control<QLabel>(d, QStringLiteral("currentcountrylab"))->text(),
+                     QStringLiteral("Census entries found assumed to be for the USA:"));
+            QCOMPARE(rows(d, "currentlst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
+            click(d, QStringLiteral("exitbut"));
+        });
+        opendatecheck(w);
+        QTRY_VERIFY(seen);
+        QCOMPARE(again.unexpected, 0);
+        QCOMPARE(backupcount(), before + 1);
+    }
+
+    // The file changed by another program while the dialog was open: nothing
+    // written, the dialog closes and the file is read again.
+    void outsidechangerefused()
+    {
+        const QString file = family();
+        QVERIFY(!file.isEmpty());
+        const settings s = testsettings();
+        auto run = files.opened(file, &s);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        const int before = backupcount();
+        QByteArray changed;
+
+        dialoganswers dialogs;
+        bool done = false;
+        dialogs.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
+            done = true;
+            QVERIFY(replaceinfile(file, "2 DATE ABT 1841", "2 DATE ABT 1842"));
+            QFile f(file);
+            QVERIFY(f.open(QIODevice::ReadOnly));
+            changed = f.readAll();
+            run->prompts.expect(answer::yes, QStringLiteral("Are you sure"));
+            run->prompts.expect(answer::ok, QDir::toNativeSeparators(file)
+                                                + QStringLiteral(" has been modified by another application. Dates will "
+                                                                 "not be changed as a precaution to ensure there is no "
+                                                                 "data loss. This form will now close and the file will "
+                                                                 "be reloaded."));
+            control<QPushButton>(d, QStringLiteral("changebut"))->click();
+        });
+        opendatecheck(w);
+        QTRY_VERIFY(done);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QCOMPARE(backupcount(), before);
+        QFile f(file);
+        QVERIFY(f.open(QIODevice::ReadOnly));
+        QCOMPARE(f.readAll(), changed);
+        QCOMPARE(qs(w.index()->people[0].census[0].date), QStringLiteral("ABT 1842"));
+    }
+};
+
+QTEST_MAIN(datecheckfrmtest)
+#include "datecheckfrm_test.moc"
