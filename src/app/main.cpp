@@ -2,6 +2,7 @@
 //
 // The composition root: builds the prompts, the settings store and the main
 // window, and hands each what it needs.
+#include "app/helpfrm.h"
 #include "app/mainfrm.h"
 #include "platform/settingsstore.h"
 #include "platform/widgetprompts_ui.h"
@@ -29,6 +30,7 @@ int main(int argc, char* argv[])
     qm::widgetprompts prompts;
     qm::mainfrm window(prompts, *store);
     prompts.setparent(&window);
+    prompts.sethelp([&window](int topic, const QString& command) { qm::helpfrm::open(&window, topic, command); });
     qm::activationnotice activation;
     QObject::connect(&activation, &qm::activationnotice::activated, &window, &qm::mainfrm::checkonactivate);
 

@@ -51,6 +51,7 @@ mainfrm::mainfrm(prompts& p, settingsstore& store, QWidget* parent)
     setWindowTitle(versiontitle());
     buildform();
     buildmenus();
+    helpkeys();
 }
 
 mainfrm::~mainfrm() = default;

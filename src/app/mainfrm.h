@@ -97,6 +97,7 @@ private:
     void startoptions();
     void donate();             // app/helpmenu_ui.cpp
     void about();              // app/helpmenu_ui.cpp
+    void helpkeys();           // app/helpmenu_ui.cpp: F1
     // After each saved entry, once Count has been raised (app/helpmenu_ui.cpp).
     void milestone();
     // Save step 12: the Census Images dialog for the entry being saved

@@ -1,0 +1,344 @@
+// The help window, the About box and the donation window on the offscreen
+// platform: pages opened by topic, the buttons and the search panel, the help
+// window staying usable under a modal dialog; and, through the main window, the
+// Help menu, F1, About, "Make a Donation..." and the milestone after a save.
+#include "app/aboutfrm.h"
+#include "app/donatefrm.h"
+#include "app/helpfrm.h"
+#include "app/helptopics.h"
+#include "support/mainfrmfixture.h"
+
+#include <QAction>
+#include <QDir>
+#include <QListWidget>
+#include <QMenuBar>
+#include <QPushButton>
+#include <QTextBrowser>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+QPushButton* button(QWidget* w, const char* name)
+{
+    return w->findChild<QPushButton*>(QString::fromLatin1(name));
+}
+
+QString pagetext(helpfrm& h)
+{
+    return h.findChild<QTextBrowser*>(QStringLiteral("helptxt"))->toPlainText();
+}
+
+void trigger(mainfrm& w, const char* name)
+{
+    QAction* a = w.menuBar()->findChild<QAction*>(QString::fromLatin1(name));
+    QVERIFY2(a, name);
+    a->trigger();
+}
+
+} // namespace
+
+class helpfrm_test : public QObject {
+    Q_OBJECT
+
+private:
+    windowfiles files_;
+
+private slots:
+    void initTestCase() { QVERIFY(files_.valid()); }
+
+    void opensthepageofeverytopic()
+    {
+        helpfrm h;
+        for (const helptopic& t : helptopics()) {
+            h.showtopic(t.topic);
+            QCOMPARE(h.currentpage(), t.page);
+            QVERIFY2(!pagetext(h).isEmpty(), qPrintable(t.page));
+        }
+        QVERIFY(h.isVisible());
+        h.showtopic(45);
+        QVERIFY(pagetext(h).contains(QLatin1String("Census Flags")));
+        QCOMPARE(h.windowTitle(), QStringLiteral("Quillmark Help - Census Flags and Census Flag Date"));
+        h.showtopic(0, QStringLiteral("Index"));
+        QCOMPARE(h.currentpage(), QStringLiteral("index.html"));
+        QVERIFY(!h.findChild<QWidget*>(QStringLiteral("searchpanel"))->isVisible());
+        h.showtopic(0, QStringLiteral("Search"));
+        QCOMPARE(h.currentpage(), QStringLiteral("search.html"));
+        QVERIFY(h.findChild<QWidget*>(QStringLiteral("searchpanel"))->isVisible());
+    }
+
+    // Every page of the resources loads, with its stylesheet.
+    void everypageloadsfromtheresources()
+    {
+        helpfrm h; // registers the pages
+        const QStringList pages = QDir(helpfolder()).entryList({QStringLiteral("*.html")});
+        QVERIFY(pages.size() >= 14);
+        QVERIFY(QFile::exists(helpfolder() + QStringLiteral("/help.css")));
+        for (const QString& page : pages) {
+            QFile f(helpfolder() + QLatin1Char('/') + page);
+            QFile source(QStringLiteral(QM_SOURCE_DIR "/src/app/help/") + page);
+            QVERIFY(f.open(QIODevice::ReadOnly) && source.open(QIODevice::ReadOnly));
+            QCOMPARE(f.readAll(), source.readAll());
+        }
+    }
+
+    void backforwardhomeindex()
+    {
+        helpfrm h;
+        h.showtopic(17);
+        QVERIFY(!button(&h, "backbut")->isEnabled());
+        h.showtopic(55);
+        QVERIFY(button(&h, "backbut")->isEnabled());
+        button(&h, "backbut")->click();
+        QCOMPARE(h.currentpage(), QStringLiteral("main-window.html"));
+        QVERIFY(button(&h, "forwardbut")->isEnabled());
+        button(&h, "forwardbut")->click();
+        QCOMPARE(h.currentpage(), QStringLiteral("flag-check.html"));
+        button(&h, "indexbut")->click();
+        QCOMPARE(h.currentpage(), QStringLiteral("index.html"));
+        button(&h, "homebut")->click();
+        QCOMPARE(h.currentpage(), QStringLiteral("main-window.html"));
+        // A link followed inside the page.
+        auto* browser = h.findChild<QTextBrowser*>(QStringLiteral("helptxt"));
+        browser->setSource(QUrl(QStringLiteral("options.html#titletemplate")));
+        QCOMPARE(h.currentpage(), QStringLiteral("options.html"));
+    }
+
+    void searchlistspagesandopensthechosenone()
+    {
+        helpfrm h;
+        h.show();
+        button(&h, "searchbut")->click();
+        QCOMPARE(h.currentpage(), QStringLiteral("search.html"));
+        auto* box = h.findChild<QLineEdit*>(QStringLiteral("searchtxt"));
+        QTest::keyClicks(box, QStringLiteral("Flag"));
+        QTest::keyClick(box, Qt::Key_Return);
+        auto* results = h.findChild<QListWidget*>(QStringLiteral("resultlst"));
+        QVERIFY(results->count() >= 3);
+        const QStringList top = {results->item(0)->data(Qt::UserRole).toString(),
+                                 results->item(1)->data(Qt::UserRole).toString()};
+        QVERIFY(top.contains(QStringLiteral("census-flags.html")) && top.contains(QStringLiteral("flag-check.html")));
+        QVERIFY(h.findChild<QLabel*>(QStringLiteral("resultlab"))->text().contains(QLatin1String("pages found")));
+        results->setCurrentRow(1);
+        QTest::mouseClick(results->viewport(), Qt::LeftButton, {}, results->visualItemRect(results->item(1)).center());
+        QCOMPARE(h.currentpage(), results->item(1)->data(Qt::UserRole).toString());
+        // The page opens at the first word found.
+        auto* browser = h.findChild<QTextBrowser*>(QStringLiteral("helptxt"));
+        QCOMPARE(browser->textCursor().selectedText().toLower(), QStringLiteral("flag"));
+
+        h.search(QStringLiteral("zebrafish"));
+        QCOMPARE(results->count(), 0);
+        QVERIFY(h.findChild<QLabel*>(QStringLiteral("resultlab"))->text().startsWith(QLatin1String("No page")));
+    }
+
+    // Opened from a modal dialog, the help belongs to that dialog (so that it
+    // can be used while the dialog waits) and goes back to its home when the
+    // dialog closes, staying open.
+    void staysusableunderamodaldialog()
+    {
+        QWidget home;
+        home.show();
+        helpfrm* h = helpfrm::open(&home, 17, QString());
+        QCOMPARE(h->parentWidget(), &home);
+        QCOMPARE(helpfrm::open(&home, 20, QString()), h); // one window, reused
+        QDialog d(&home);
+        d.setModal(true);
+        d.show();
+        QTRY_COMPARE(QApplication::activeModalWidget(), &d);
+        helpfrm::open(&home, 20, QString());
+        QCOMPARE(h->parentWidget(), &d);
+        QVERIFY(h->isVisible());
+        QCOMPARE(h->currentpage(), QStringLiteral("options.html"));
+        d.hide();
+        QCOMPARE(h->parentWidget(), &home);
+        QVERIFY(h->isVisible());
+        QCOMPARE(h->currentpage(), QStringLiteral("options.html"));
+    }
+
+    void aboutshowsthebuildversion()
+    {
+        scriptedprompts prompts;
+        systemlookup none;
+        aboutfrm a(prompts, nullptr, none);
+        const QString version = QStringLiteral("%1.%2.%3").arg(QM_VERSION_MAJOR).arg(QM_VERSION_MINOR).arg(QM_VERSION_PATCH);
+        QCOMPARE(a.windowTitle(), QStringLiteral("About Quillmark ") + version);
+        QCOMPARE(a.findChild<QLabel*>(QStringLiteral("lblVersion"))->text(), QStringLiteral("v ") + version);
+        for (const char* name : {"lblTitle", "lblDescription", "lblAcknowledgements", "lblDisclaimer"})
+            QVERIFY2(!a.findChild<QLabel*>(QString::fromLatin1(name))->text().isEmpty(), name);
+        QVERIFY(a.findChild<QLabel*>(QStringLiteral("lblDisclaimer"))->text().contains(QLatin1String("GEDCOM")));
+        QVERIFY(a.findChild<QLabel*>(QStringLiteral("lblAcknowledgements"))->text().contains(QLatin1String("Qt")));
+        QCOMPARE(button(&a, "cmdSysInfo")->text(), QStringLiteral("&System Info..."));
+    }
+
+    void systeminfostartsthetoolorsaysitisunavailable()
+    {
+        scriptedprompts prompts;
+        systemlookup machine;
+        machine.findprogram = [](const QString& name) {
+            return name == QLatin1String("hardinfo") ? QStringLiteral("/usr/bin/hardinfo") : QString();
+        };
+        QStringList started;
+        bool starts = true;
+        aboutfrm a(prompts, nullptr, machine, [&](const systemtool& t) {
+            started << t.program;
+            return starts;
+        });
+        button(&a, "cmdSysInfo")->click();
+        QCOMPARE(started, QStringList{QStringLiteral("/usr/bin/hardinfo")});
+        QCOMPARE(prompts.history().size(), size_t(0));
+
+        // A tool that does not start, and no tool at all.
+        starts = false;
+        prompts.expect(answer::ok, QStringLiteral("System Information Is Unavailable At This Time"));
+        button(&a, "cmdSysInfo")->click();
+        aboutfrm none(prompts, nullptr, systemlookup{}, [&](const systemtool&) { return true; });
+        prompts.expect(answer::ok, QStringLiteral("System Information Is Unavailable At This Time"));
+        button(&none, "cmdSysInfo")->click();
+        QCOMPARE(prompts.unexpected(), 0);
+        QCOMPARE(prompts.texts(), QStringList(2, QStringLiteral("System Information Is Unavailable At This Time")));
+        QCOMPARE(started.size(), 2);
+    }
+
+    void donationwindowforms()
+    {
+        scriptedprompts prompts;
+        donatefrm ask(prompts, std::nullopt);
+        QCOMPARE(ask.windowTitle(), QStringLiteral("Would you like to make a donation?"));
+        QVERIFY(ask.findChild<QLabel*>(QStringLiteral("mainlab"))->isHidden());
+        button(&ask, "donatebut")->click();
+        button(&ask, "regularbut")->click();
+        QCOMPARE(prompts.opened,
+                 (QStringList{QStringLiteral("https://quillmark.org/donate"), QStringLiteral("https://quillmark.org/donate/regular")}));
+        // A page that does not open is not reported.
+        prompts.openerror = QStringLiteral("no browser");
+        button(&ask, "donatebut")->click();
+        QCOMPARE(prompts.history().size(), size_t(0));
+
+        donatefrm reached(prompts, 50);
+        QCOMPARE(reached.windowTitle(), QStringLiteral("Milestone"));
+        auto* mainlab = reached.findChild<QLabel*>(QStringLiteral("mainlab"));
+        QVERIFY(!mainlab->isHidden());
+        QCOMPARE(mainlab->text(),
+                 QStringLiteral("For your information you have now used Quillmark to create at least 50 census entries."));
+        reached.show();
+        button(&reached, "closebut")->click();
+        QVERIFY(!reached.isVisible());
+    }
+
+    // The Help menu and F1 reach the prompts with their topics.
+    void helpmenuandf1throughthemainwindow()
+    {
+        auto run = files_.opened(files_.sample());
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        trigger(w, "helpcreatingentrymen");
+        trigger(w, "HelpIndexmen");
+        trigger(w, "HelpSearchmen");
+        QCOMPARE(run->prompts.helpshown,
+                 (QStringList{QStringLiteral("12"), QStringLiteral("Index"), QStringLiteral("Search")}));
+        w.activateWindow();
+        QTRY_VERIFY(w.isActiveWindow());
+        QTest::keyClick(&w, Qt::Key_F1);
+        QCOMPARE(run->prompts.helpshown.last(), QStringLiteral("17"));
+
+        // F1 in a dialog presses its Help button.
+        QDialog d(&w);
+        d.setModal(true);
+        auto* help = new QPushButton(QStringLiteral("&Help"), &d);
+        auto* box = new QLineEdit(&d);
+        int pressed = 0;
+        connect(help, &QPushButton::clicked, [&] { ++pressed; });
+        d.show();
+        QTRY_COMPARE(QApplication::activeModalWidget(), &d);
+        QTest::keyClick(box, Qt::Key_F1);
+        QCOMPARE(pressed, 1);
+        QCOMPARE(run->prompts.helpshown.size(), 4);
+    }
+
+    void aboutanddonatefromthehelpmenu()
+    {
+        auto run = files_.opened(files_.sample());
+        QVERIFY(run);
+        dialoganswers answers;
+        QString caption;
+        answers.expect(QStringLiteral("aboutfrm"), [&](QDialog* d) {
+            caption = d->windowTitle();
+            button(d, "cmdOK")->click();
+        });
+        answers.expect(QStringLiteral("donatefrm"), [&](QDialog* d) {
+            caption += QLatin1Char('|') + d->windowTitle();
+            button(d, "donatebut")->click();
+            button(d, "closebut")->click();
+        });
+        trigger(*run->w, "aboutmen");
+        trigger(*run->w, "donatemen");
+        QCOMPARE(answers.unexpected, 0);
+        QCOMPARE(caption, QStringLiteral("About Quillmark %1.%2.%3|Would you like to make a donation?")
+                              .arg(QM_VERSION_MAJOR)
+                              .arg(QM_VERSION_MINOR)
+                              .arg(QM_VERSION_PATCH));
+        QCOMPARE(run->prompts.opened, QStringList{QStringLiteral("https://quillmark.org/donate")});
+    }
+
+    // The tenth saved entry shows the milestone window; the eleventh does not.
+    void milestoneafterthetenthsavedentry()
+    {
+        settings s = defaultsettings();
+        const QString folder = files_.filepath(QStringLiteral("milestone"));
+        QDir().mkpath(folder + QStringLiteral("/backups"));
+        s.backupfolder = folder + QStringLiteral("/backups");
+        s.logpath = folder + QStringLiteral("/censuslog.txt");
+        s.requestimage = false;
+        s.birthdate = false;
+        s.nosourcetextwarning = false;
+
+        session run(files_.ini());
+        savesettings(*run.store, s);
+        saveflagsettings(*run.store, s);
+        run.store->write(QStringLiteral("Count"), QStringLiteral("9"));
+        run.make();
+        run.prompts.expect(answer::no, QStringLiteral("by default"));
+        QVERIFY(run.w->start({QLatin1Char('"') + files_.sample() + QLatin1Char('"')}));
+        run.w->show();
+        QVERIFY(QTest::qWaitForWindowExposed(run.w.get()));
+        mainfrm& w = *run.w;
+
+        const auto typeentry = [&](int32_t id) {
+            chooseyear(w, QStringLiteral("1881"));
+            w.panel()->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
+            w.panel()->referencetxt->setText(QStringLiteral("RG11/4426/52"));
+            clickid(w, peoplelist(w), id);
+            typerow(w, 0, QStringLiteral("28"));
+        };
+        dialoganswers answers;
+        QString caption, text;
+        bool shown = false;
+        answers.expect(QStringLiteral("donatefrm"), [&](QDialog* d) {
+            caption = d->windowTitle();
+            auto* mainlab = d->findChild<QLabel*>(QStringLiteral("mainlab"));
+            text = mainlab->text();
+            shown = !mainlab->isHidden();
+            button(d, "closebut")->click();
+        });
+        typeentry(11);
+        button(&w, "addbut")->click();
+        QCOMPARE(run.read("Count"), QStringLiteral("10"));
+        QCOMPARE(answers.unexpected, 0);
+        QCOMPARE(answers.pending(), 0);
+        QCOMPARE(caption, QStringLiteral("Milestone"));
+        QVERIFY(shown);
+        QCOMPARE(text,
+                 QStringLiteral("For your information you have now used Quillmark to create at least 10 census entries."));
+
+        typeentry(27);
+        button(&w, "addbut")->click();
+        QCOMPARE(run.read("Count"), QStringLiteral("11"));
+        QCOMPARE(answers.unexpected, 0);
+        QCOMPARE(answers.seen, QStringList{QStringLiteral("donatefrm")});
+        QCOMPARE(run.prompts.unexpected(), 0);
+    }
+};
+
+QTEST_MAIN(helpfrm_test)
+#include "helpfrm_test.moc"

@@ -1,0 +1,201 @@
+// The help pages in the source folder (built into the program's resources):
+// every topic has its page, every page is in the resource file, every link and
+// anchor resolves; and the full-text search.
+#include "app/helptopics.h"
+
+#include <QDir>
+#include <QFile>
+#include <QRegularExpression>
+#include <QSet>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+namespace {
+
+QString helpdir()
+{
+    return QStringLiteral(QM_SOURCE_DIR "/src/app/help");
+}
+
+QString readtext(const QString& path)
+{
+    QFile f(path);
+    return f.open(QIODevice::ReadOnly) ? QString::fromUtf8(f.readAll()) : QString();
+}
+
+QStringList pages()
+{
+    return QDir(helpdir()).entryList({QStringLiteral("*.html")}, QDir::Files, QDir::Name);
+}
+
+QStringList qrcfiles()
+{
+    static const QRegularExpression file(QStringLiteral("<file>([^<]+)</file>"));
+    QStringList out;
+    for (auto it = file.globalMatch(readtext(helpdir() + QStringLiteral("/help.qrc"))); it.hasNext();)
+        out << it.next().captured(1);
+    return out;
+}
+
+} // namespace
+
+TEST(HelpTopics, EveryTopicHasItsOwnPageInTheResources)
+{
+    const QStringList listed = qrcfiles();
+    QSet<QString> seen;
+    std::vector<int> numbers;
+    for (const helptopic& t : helptopics()) {
+        numbers.push_back(t.topic);
+        EXPECT_TRUE(listed.contains(t.page)) << t.page.toStdString();
+        EXPECT_TRUE(QFile::exists(helpdir() + QLatin1Char('/') + t.page)) << t.page.toStdString();
+        EXPECT_FALSE(seen.contains(t.page)) << "two topics share " << t.page.toStdString();
+        seen.insert(t.page);
+        EXPECT_EQ(pagefor(t.topic), t.page);
+    }
+    EXPECT_EQ(numbers, (std::vector<int>{12, 14, 17, 18, 19, 20, 23, 24, 30, 35, 45, 55}));
+}
+
+TEST(HelpTopics, CommandsAndUnknownTopics)
+{
+    EXPECT_EQ(pagefor(0, QStringLiteral("Index")), QStringLiteral("index.html"));
+    EXPECT_EQ(pagefor(0, QStringLiteral("Search")), QStringLiteral("search.html"));
+    EXPECT_EQ(pagefor(45, QStringLiteral("Search")), QStringLiteral("search.html")); // the command wins
+    EXPECT_EQ(pagefor(45), QStringLiteral("census-flags.html"));
+    EXPECT_EQ(pagefor(99), QStringLiteral("index.html"));
+    EXPECT_EQ(pagefor(maintopic), QStringLiteral("main-window.html"));
+}
+
+TEST(HelpTopics, ResourceFileListsExactlyThePagesOfTheFolder)
+{
+    QStringList listed = qrcfiles();
+    for (const QString& f : listed)
+        EXPECT_TRUE(QFile::exists(helpdir() + QLatin1Char('/') + f)) << f.toStdString();
+    QStringList folder = QDir(helpdir()).entryList({QStringLiteral("*.html"), QStringLiteral("*.css")}, QDir::Files);
+    listed.sort();
+    folder.sort();
+    EXPECT_EQ(listed, folder);
+    EXPECT_TRUE(folder.contains(indexpage()));
+    EXPECT_TRUE(folder.contains(searchpage()));
+}
+
+TEST(HelpTopics, EveryLinkAndAnchorResolves)
+{
+    ASSERT_GE(pages().size(), 14);
+    for (const QString& page : pages()) {
+        const QString html = readtext(helpdir() + QLatin1Char('/') + page);
+        const helpdoc d = parsehelp(page, html);
+        EXPECT_FALSE(d.title.isEmpty()) << page.toStdString();
+        EXPECT_TRUE(html.contains(QLatin1String("<h1>"))) << page.toStdString();
+        for (const QString& link : helplinks(html)) {
+            if (link.startsWith(QLatin1String("https://")))
+                continue;
+            const QString target = link.section(u'#', 0, 0);
+            const QString anchor = link.section(u'#', 1);
+            const QString file = target.isEmpty() ? page : target;
+            const std::string where = (page + QStringLiteral(" -> ") + link).toStdString();
+            ASSERT_TRUE(QFile::exists(helpdir() + QLatin1Char('/') + file)) << where;
+            if (!anchor.isEmpty()) {
+                EXPECT_TRUE(helpanchors(readtext(helpdir() + QLatin1Char('/') + file)).contains(anchor)) << where;
+            }
+        }
+    }
+}
+
+TEST(HelpTopics, IndexLinksEveryPage)
+{
+    QSet<QString> linked;
+    for (const QString& link : helplinks(readtext(helpdir() + QStringLiteral("/index.html"))))
+        linked.insert(link.section(u'#', 0, 0));
+    for (const QString& page : pages()) {
+        if (page != indexpage()) {
+            EXPECT_TRUE(linked.contains(page)) << page.toStdString();
+        }
+    }
+}
+
+TEST(HelpTopics, PageTextDropsMarkupAndDecodesEntities)
+{
+    const helpdoc d = parsehelp(QStringLiteral("p.html"),
+                                QStringLiteral("<html><head><title>Options &amp; more</title><style>b{}</style></head>"
+                                               "<body><p>Choose from &quot;&lt;&lt;Add Reference&quot;&#33;</p>"
+                                               "<a href=\"x.html#top\">link</a></body></html>"));
+    EXPECT_EQ(d.title, QStringLiteral("Options & more"));
+    EXPECT_EQ(d.text, QStringLiteral("Choose from \"<<Add Reference\"! link"));
+    EXPECT_EQ(helplinks(QStringLiteral("<a HREF = \"a.html\">a</a> <a href=\"b.html#c\">")),
+              (QStringList{QStringLiteral("a.html"), QStringLiteral("b.html#c")}));
+    EXPECT_EQ(helpanchors(QStringLiteral("<a name=\"top\"></a><h2 id=\"x\">")),
+              (QStringList{QStringLiteral("top"), QStringLiteral("x")}));
+}
+
+TEST(HelpSearch, WholeWordsAnyCaseRankedByMatches)
+{
+    const std::vector<helpdoc> docs = {
+        {QStringLiteral("a.html"), QStringLiteral("Alpha"), QStringLiteral("Flag flag and flags")},
+        {QStringLiteral("b.html"), QStringLiteral("Flag page"), QStringLiteral("one flag here")},
+        {QStringLiteral("c.html"), QStringLiteral("Gamma"), QStringLiteral("flagged, flagpole, flags")},
+        {QStringLiteral("index.html"), QStringLiteral("Index"), QStringLiteral("flag flag flag flag flag flag")},
+    };
+    const std::vector<helphit> hits = searchhelp(docs, QStringLiteral("FLAG"));
+    ASSERT_EQ(hits.size(), 2u); // c.html has no whole word "flag"; the index is left out
+    EXPECT_EQ(hits[0].page, QStringLiteral("b.html")); // 1 in the text + 5 for the title
+    EXPECT_EQ(hits[0].score, 6);
+    EXPECT_EQ(hits[1].page, QStringLiteral("a.html"));
+    EXPECT_EQ(hits[1].score, 2);
+    EXPECT_EQ(hits[1].excerpt, QStringLiteral("Flag flag and flags"));
+
+    const std::vector<helphit> prefix = searchhelp(docs, QStringLiteral("flag*"));
+    ASSERT_EQ(prefix.size(), 3u);
+    EXPECT_EQ(prefix[2].page, QStringLiteral("c.html"));
+    EXPECT_EQ(prefix[2].score, 3);
+
+    // The words of the query side by side count ten more.
+    const std::vector<helpdoc> phrase = {
+        {QStringLiteral("p.html"), QStringLiteral("P"), QStringLiteral("source source source where within it")},
+        {QStringLiteral("q.html"), QStringLiteral("Q"), QStringLiteral("Where within source")},
+    };
+    const std::vector<helphit> together = searchhelp(phrase, QStringLiteral("where within source"));
+    ASSERT_EQ(together.size(), 2u);
+    EXPECT_EQ(together[0].page, QStringLiteral("q.html"));
+    EXPECT_EQ(together[0].score, 13);
+    EXPECT_EQ(together[1].score, 5);
+
+    // Every word must occur; nothing typed finds nothing.
+    EXPECT_EQ(searchhelp(docs, QStringLiteral("flag here")).size(), 1u);
+    EXPECT_TRUE(searchhelp(docs, QStringLiteral("flag absent")).empty());
+    EXPECT_TRUE(searchhelp(docs, QStringLiteral("  ,. ")).empty());
+}
+
+TEST(HelpSearch, ExcerptShowsTheFirstMatchInWholeWords)
+{
+    QString text = QString(QStringLiteral("word ")).repeated(40) + QStringLiteral("target ") +
+                   QString(QStringLiteral("more ")).repeated(60);
+    const std::vector<helphit> hits =
+        searchhelp({{QStringLiteral("p.html"), QStringLiteral("P"), text.trimmed()}}, QStringLiteral("target"));
+    ASSERT_EQ(hits.size(), 1u);
+    const QString e = hits[0].excerpt;
+    EXPECT_TRUE(e.startsWith(QLatin1String("...word "))) << e.toStdString();
+    EXPECT_TRUE(e.endsWith(QLatin1String(" more..."))) << e.toStdString();
+    EXPECT_TRUE(e.contains(QLatin1String(" target ")));
+}
+
+TEST(HelpSearch, FlagFindsTheFlagPagesFirst)
+{
+    const std::vector<helpdoc> docs = readhelp(helpdir());
+    ASSERT_EQ(docs.size(), static_cast<size_t>(pages().size()));
+    const std::vector<helphit> hits = searchhelp(docs, QStringLiteral("flag"));
+    ASSERT_GE(hits.size(), 3u);
+    QStringList top = {hits[0].page, hits[1].page};
+    top.sort();
+    EXPECT_EQ(top, (QStringList{QStringLiteral("census-flags.html"), QStringLiteral("flag-check.html")}));
+    EXPECT_GE(hits[1].score, hits[2].score);
+    for (const helphit& h : hits) {
+        EXPECT_NE(h.page, indexpage());
+        EXPECT_TRUE(h.excerpt.contains(QLatin1String("flag"), Qt::CaseInsensitive));
+    }
+    // The recording methods are explained where a reader looks for them.
+    const std::vector<helphit> methods = searchhelp(docs, QStringLiteral("where within source"));
+    ASSERT_FALSE(methods.empty());
+    EXPECT_EQ(methods[0].page, QStringLiteral("recording-methods.html"));
+}
