@@ -1,0 +1,162 @@
+// quillmark-cli flag-check, run as a process on small family files.
+#include "flags/flagtable.h"
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFileInfo>
+#include <QProcess>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using qmtest::readfile;
+using qmtest::writefile;
+
+namespace {
+
+// John lacks the 1881 flag, Mary holds it without an event, Ann has a 1901
+// event in Dublin (UK or Ireland), Kate holds the UK 1901 flag for hers.
+const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
+                           "0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n"
+                           "0 @I2@ INDI\r\n1 NAME Mary /Smith/\r\n1 _FLGS\r\n2 __CENSUS_1881 Census 1881\r\n"
+                           "0 @I3@ INDI\r\n1 NAME Ann /Byrne/\r\n1 CENS\r\n2 DATE 31 MAR 1901\r\n2 PLAC Dublin\r\n"
+                           "0 @I4@ INDI\r\n1 NAME Kate /Byrne/\r\n1 CENS\r\n2 DATE 31 MAR 1901\r\n2 PLAC Cork\r\n"
+                           "1 _FLGS\r\n2 __CENSUS_UK_1901 Census UK 1901\r\n"
+                           "0 TRLR\r\n";
+
+struct run {
+    int status = -1;
+    QStringList out;
+    std::string err;
+};
+
+qm::flagrec flag(const char* code, const char* name, const char* date, const char* country)
+{
+    qm::flagrec f;
+    f.code = code;
+    f.name = name;
+    f.date = date;
+    f.country = country;
+    return f;
+}
+
+class CliFlagCheck : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        QDir(dir.path()).mkdir(QStringLiteral("backups"));
+        file = dir.filePath(QStringLiteral("family.ged"));
+        writefile(file, family);
+        ini = dir.filePath(QStringLiteral("settings.ini"));
+        qm::settings s = qm::defaultsettings();
+        s.backupfolder = dir.filePath(QStringLiteral("backups"));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        auto store = qm::settingsstore::onfile(ini);
+        qm::savesettings(*store, s);
+        qm::saveflagdefs(*store, {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
+                                  flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
+                                  flag("__CENSUS_1881", "Census 1881", "1881", "UK")});
+        store->sync();
+    }
+
+    run cli(QStringList args) const
+    {
+        QProcess p;
+        args.prepend(QStringLiteral("flag-check"));
+        args << QStringLiteral("--settings") << ini;
+        p.start(QStringLiteral(QM_CLI_PATH), args);
+        run r;
+        if (!p.waitForFinished(60000))
+            return r;
+        r.status = p.exitCode();
+        QString out = QString::fromUtf8(p.readAllStandardOutput());
+        if (out.endsWith(QLatin1Char('\n')))
+            out.chop(1);
+        r.out = out.split(QLatin1Char('\n'));
+        r.err = p.readAllStandardError().toStdString();
+        return r;
+    }
+
+    QStringList backups() const
+    {
+        return QDir(dir.filePath(QStringLiteral("backups"))).entryList(QDir::Files);
+    }
+
+    QTemporaryDir dir;
+    QString file, ini;
+};
+
+TEST_F(CliFlagCheck, ListsTheRowsUnderTheHeadingsAndWritesNothing)
+{
+    const run r = cli({file, QStringLiteral("--country-for"), QStringLiteral("dublin=ireland")});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.out, QStringList({QStringLiteral("Flags that need to be added to individuals:"),
+                                  QStringLiteral("'Census 1881' flag to individual Smith, John (ID: 1)"),
+                                  QStringLiteral("'Census Ireland 1901' flag to individual Byrne, Ann (ID: 3)"),
+                                  QStringLiteral("Flags that need to be removed from individuals:"),
+                                  QStringLiteral("'Census 1881' flag from individual Smith, Mary (ID: 2)")}));
+    EXPECT_EQ(readfile(file), family);
+    EXPECT_TRUE(backups().isEmpty());
+}
+
+TEST_F(CliFlagCheck, CountryQuestionWithoutAnAnswerFailsNamingTheEvent)
+{
+    run r = cli({file});
+    EXPECT_EQ(r.status, 2);
+    EXPECT_EQ(r.out, QStringList({QString()}));
+    EXPECT_NE(r.err.find("Byrne, Ann (ID: 3)"), std::string::npos) << r.err;
+    EXPECT_NE(r.err.find("date 31 MAR 1901, place Dublin"), std::string::npos) << r.err;
+    EXPECT_NE(r.err.find("--country-for"), std::string::npos) << r.err;
+    EXPECT_EQ(std::count(r.err.begin(), r.err.end(), '\n'), 1) << r.err;
+
+    // An answer for another place, or a country none of the flags has, does not answer it.
+    r = cli({file, QStringLiteral("--apply"), QStringLiteral("--country-for=Cork=UK")});
+    EXPECT_EQ(r.status, 2);
+    r = cli({file, QStringLiteral("--apply"), QStringLiteral("--country-for"), QStringLiteral("Dublin=Canada")});
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.find("not of Canada"), std::string::npos) << r.err;
+    EXPECT_EQ(readfile(file), family);
+    EXPECT_TRUE(backups().isEmpty());
+
+    // Not a census country, or no "=".
+    EXPECT_EQ(cli({file, QStringLiteral("--country-for"), QStringLiteral("Dublin=Eire")}).status, 2);
+    EXPECT_EQ(cli({file, QStringLiteral("--country-for"), QStringLiteral("Dublin")}).status, 2);
+    EXPECT_EQ(cli({file, QStringLiteral("--country-for")}).status, 2);
+    EXPECT_EQ(cli({QStringLiteral("--apply")}).status, 2);
+}
+
+TEST_F(CliFlagCheck, ApplyMakesTheChangesAfterABackup)
+{
+    const run r = cli({file, QStringLiteral("--apply"), QStringLiteral("--country-for"), QStringLiteral("DUBLIN=UK")});
+    ASSERT_EQ(r.status, 0) << r.err;
+    ASSERT_EQ(r.out.size(), 6);
+    EXPECT_EQ(r.out[2], QStringLiteral("'Census UK 1901' flag to individual Byrne, Ann (ID: 3)"));
+    ASSERT_TRUE(r.out[5].startsWith(QStringLiteral("Backup: "))) << r.out[5].toStdString();
+    const QString backup = r.out[5].mid(8);
+    EXPECT_TRUE(QFileInfo(backup).isFile());
+    EXPECT_EQ(readfile(backup), family);
+    EXPECT_EQ(backups().size(), 1);
+
+    const std::string now = readfile(file);
+    EXPECT_NE(now.find("1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n1 _FLGS\r\n2 __CENSUS_1881 Census 1881\r\n"),
+              std::string::npos)
+        << now;
+    EXPECT_EQ(now.find("1 NAME Mary /Smith/\r\n1 _FLGS"), std::string::npos) << now;
+    // The census log has the change.
+    EXPECT_FALSE(readfile(dir.filePath(QStringLiteral("censuslog.txt"))).empty());
+
+    // In step now: the two nothing rows, and --apply writes nothing.
+    const run again = cli({file, QStringLiteral("--apply")});
+    ASSERT_EQ(again.status, 0) << again.err;
+    EXPECT_EQ(again.out,
+              QStringList({QStringLiteral("Flags that need to be added to individuals:"),
+                           QStringLiteral("(There are no individuals with missing census flags)"),
+                           QStringLiteral("Flags that need to be removed from individuals:"),
+                           QStringLiteral("(There are no individuals with census flags that need to be removed)")}));
+    EXPECT_EQ(backups().size(), 1);
+}
+
+} // namespace

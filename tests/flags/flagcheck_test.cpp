@@ -1,0 +1,349 @@
+// The flag check over small family files: the matching rule, missing and
+// superfluous flags, the country question and the place memory, silent mode,
+// and the flag changes written back by the rewrite.
+#include "flags/flagcheck.h"
+
+#include "model/loadgedcom.h"
+#include "platform/clock.h"
+#include "settings/settings.h"
+#include "writer/rewritefile.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+
+using namespace qm;
+
+namespace {
+
+flagrec flag(const char* code, const char* name, const char* date, const char* country)
+{
+    flagrec f;
+    f.code = code;
+    f.name = name;
+    f.date = date;
+    f.country = country;
+    return f;
+}
+
+// UK and Ireland share the 1901 census day; the 1881 flag is a year flag.
+flagtable definitions()
+{
+    return {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
+            flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
+            flag("__CENSUS_1881", "Census 1881", "1881", "UK")};
+}
+
+std::string indi(int id, const char* name, const std::string& body)
+{
+    return "0 @I" + std::to_string(id) + "@ INDI\r\n1 NAME " + name + "\r\n" + body;
+}
+
+std::string cens(const char* date, const char* place = nullptr)
+{
+    std::string s = "1 CENS\r\n2 DATE " + std::string(date) + "\r\n";
+    if (place)
+        s += "2 PLAC " + std::string(place) + "\r\n";
+    return s;
+}
+
+std::string flags(std::initializer_list<const char*> lines)
+{
+    std::string s = "1 _FLGS\r\n";
+    for (const char* l : lines)
+        s += std::string("2 ") + l + "\r\n";
+    return s;
+}
+
+std::string family(const std::string& records)
+{
+    return "0 HEAD\r\n1 CHAR ANSI\r\n" + records + "0 TRLR\r\n";
+}
+
+std::unique_ptr<gedcomindex> load(const std::string& bytes, const flagtable& defs = definitions())
+{
+    return loadgedcombytes(bytes, defs);
+}
+
+// Answers every country question with one country, counting the questions.
+struct answers {
+    QString country;
+    bool always = false;
+    int asked = 0;
+    std::vector<countryquestion> questions{};
+
+    countryasker asker()
+    {
+        return [this](const countryquestion& q) {
+            ++asked;
+            questions.push_back(q);
+            return countrychoice{static_cast<int>(q.countries.indexOf(country)), always};
+        };
+    }
+};
+
+TEST(FlagMatch, ExactDateOrFourCharacterYearWithin)
+{
+    const flagrec day = flag("__D", "Day", "3 APR 1881", "UK");
+    EXPECT_TRUE(eventmatchesflag("3 APR 1881", day));
+    EXPECT_FALSE(eventmatchesflag("4 APR 1881", day));
+    EXPECT_FALSE(eventmatchesflag("3 apr 1881", day)); // case counts
+    EXPECT_FALSE(eventmatchesflag("1881", day));
+    EXPECT_FALSE(eventmatchesflag("ABT 3 APR 1881", day));
+
+    const flagrec year = flag("__Y", "Year", "1881", "Canada"); // the country plays no part
+    EXPECT_TRUE(eventmatchesflag("3 APR 1881", year));
+    EXPECT_TRUE(eventmatchesflag("1881", year));
+    EXPECT_TRUE(eventmatchesflag("ABT 1881", year));
+    EXPECT_FALSE(eventmatchesflag("1882", year));
+    EXPECT_FALSE(eventmatchesflag("", year));
+
+    // Only a four-character date is looked for within the event's.
+    EXPECT_FALSE(eventmatchesflag("3 APR 1881", flag("__M", "Month", "APR 1881", "UK")));
+    EXPECT_FALSE(eventmatchesflag("", flag("__E", "Empty", "", "UK")));
+    EXPECT_FALSE(eventmatchesflag("1881", flag("__E", "Empty", "", "UK")));
+}
+
+class FlagCheck : public ::testing::Test {
+protected:
+    // John: two 1881 events. Mary: holds the 1881 flag and an unallocated one,
+    // no census events. Ann and Pat: 1901 in Dublin (any case), holding
+    // neither 1901 flag. Kate: 1901, holding the UK one.
+    const std::string mixed = family(
+        indi(1, "John /Smith/", cens("3 APR 1881", "Leeds") + cens("3 APR 1881", "Leeds, Yorkshire")) +
+        indi(2, "Mary /Smith/", flags({"__CENSUS_1881 Census 1881", "__OLD Old flag"})) +
+        indi(3, "Ann /Byrne/", cens("31 MAR 1901", "Dublin")) +
+        indi(4, "Pat /Byrne/", cens("31 MAR 1901", "DUBLIN")) +
+        indi(5, "Kate /Byrne/", cens("31 MAR 1901", "Cork") + flags({"__CENSUS_UK_1901 Census UK 1901"})));
+};
+
+TEST_F(FlagCheck, RowsForMissingAndSuperfluousFlags)
+{
+    auto ix = load(mixed);
+    ASSERT_TRUE(ix);
+    answers a{QStringLiteral("Ireland"), true};
+    const flagcheckresult r = checkflags(*ix, true, QStringLiteral("UK"), a.asker());
+    ASSERT_FALSE(r.cancelled);
+    EXPECT_TRUE(r.outofstep);
+    // Two events of one date give one suggestion; the "always" answer for
+    // Dublin decides DUBLIN without asking.
+    EXPECT_EQ(r.addrows, QStringList({QStringLiteral("'Census 1881' flag to individual Smith, John (ID: 1)"),
+                                      QStringLiteral("'Census Ireland 1901' flag to individual Byrne, Ann (ID: 3)"),
+                                      QStringLiteral("'Census Ireland 1901' flag to individual Byrne, Pat (ID: 4)")}));
+    // The unallocated flag is never suggested for removal.
+    EXPECT_EQ(r.removerows, QStringList({QStringLiteral("'Census 1881' flag from individual Smith, Mary (ID: 2)")}));
+    EXPECT_EQ(a.asked, 1);
+    ASSERT_EQ(r.changes.size(), 4u);
+    EXPECT_EQ(r.changes[0].person, 0);
+    EXPECT_EQ(r.changes[0].flag, 2);
+    EXPECT_TRUE(r.changes[0].add);
+    EXPECT_EQ(r.changes[1].person, 1);
+    EXPECT_EQ(r.changes[1].flag, 2);
+    EXPECT_FALSE(r.changes[1].add);
+    EXPECT_EQ(r.changes[2].flag, 1);
+    EXPECT_EQ(r.changes[3].person, 3);
+    EXPECT_TRUE(r.canchange());
+    EXPECT_EQ(r.addlist(), r.addrows);
+}
+
+TEST_F(FlagCheck, CountryQuestionOffersTheCandidatesWithTheSettingPreselected)
+{
+    auto ix = load(mixed);
+    answers a{QStringLiteral("UK")};
+    checkflags(*ix, true, QStringLiteral("Ireland"), a.asker());
+    // Without "always" both Dublin events are asked.
+    ASSERT_EQ(a.asked, 2);
+    const countryquestion& q = a.questions[0];
+    EXPECT_EQ(q.person, 2);
+    EXPECT_EQ(q.date, "31 MAR 1901");
+    EXPECT_EQ(q.place, "Dublin");
+    EXPECT_EQ(q.countries, QStringList({QStringLiteral("UK"), QStringLiteral("Ireland")}));
+    EXPECT_EQ(q.candidates, (std::vector<size_t>{0, 1}));
+    EXPECT_EQ(q.preselected, 1);
+    EXPECT_EQ(a.questions[1].place, "DUBLIN");
+
+    answers none{QStringLiteral("UK")};
+    checkflags(*ix, true, QStringLiteral("Canada"), none.asker());
+    EXPECT_EQ(none.questions.at(0).preselected, -1);
+}
+
+TEST_F(FlagCheck, PlaceCountryIsRememberedUntilTheFileIsReadAgain)
+{
+    auto ix = load(mixed);
+    answers a{QStringLiteral("UK"), true};
+    const flagcheckresult first = checkflags(*ix, true, QStringLiteral("UK"), a.asker());
+    EXPECT_EQ(a.asked, 1);
+    EXPECT_EQ(first.addrows.at(1), QStringLiteral("'Census UK 1901' flag to individual Byrne, Ann (ID: 3)"));
+    EXPECT_EQ(ix->places[static_cast<size_t>(findplace(*ix, "dublin"))].country, "UK");
+
+    // A later check on the same index asks nothing.
+    answers later{QStringLiteral("Ireland")};
+    const flagcheckresult second = checkflags(*ix, true, QStringLiteral("UK"), later.asker());
+    EXPECT_EQ(later.asked, 0);
+    EXPECT_EQ(second.addrows, first.addrows);
+
+    // A remembered country that none of the candidates has is asked as for an unknown place.
+    ix->places[static_cast<size_t>(findplace(*ix, "Dublin"))].country = "USA";
+    answers asked{QStringLiteral("Ireland")};
+    checkflags(*ix, true, QStringLiteral("UK"), asked.asker());
+    EXPECT_EQ(asked.asked, 2);
+
+    // A fresh load knows no country.
+    EXPECT_TRUE(load(mixed)->places[static_cast<size_t>(findplace(*ix, "Dublin"))].country.empty());
+}
+
+TEST_F(FlagCheck, CancelledQuestionEndsTheCheckWithNothingToChange)
+{
+    auto ix = load(mixed);
+    int asked = 0;
+    const flagcheckresult r = checkflags(*ix, true, QStringLiteral("UK"), [&](const countryquestion&) {
+        ++asked;
+        return countrychoice{-1, true};
+    });
+    EXPECT_EQ(asked, 1);
+    EXPECT_TRUE(r.cancelled);
+    EXPECT_TRUE(r.changes.empty());
+    EXPECT_TRUE(r.addrows.isEmpty());
+    EXPECT_TRUE(r.removerows.isEmpty());
+    EXPECT_FALSE(r.canchange());
+    EXPECT_TRUE(ix->places[static_cast<size_t>(findplace(*ix, "Dublin"))].country.empty());
+    // An answer outside the options ("OK" with none selected) is a cancel too.
+    EXPECT_TRUE(checkflags(*ix, true, QStringLiteral("UK"), [](const countryquestion&) {
+                    return countrychoice{7, false};
+                }).cancelled);
+    // With nobody to ask, the question cannot be answered.
+    EXPECT_TRUE(checkflags(*ix, true, QStringLiteral("UK")).cancelled);
+}
+
+TEST_F(FlagCheck, SilentModeStopsAtTheFirstIndividualOutOfStep)
+{
+    // John is out of step: the scan ends with him.
+    auto ix = load(mixed);
+    const flagcheckresult r = checkflags(*ix, false, QStringLiteral("UK"));
+    EXPECT_TRUE(r.outofstep);
+    EXPECT_EQ(r.peoplechecked, 1);
+    EXPECT_TRUE(r.changes.empty());
+    EXPECT_TRUE(r.addrows.isEmpty());
+    EXPECT_TRUE(flagsoutofstep(*ix));
+
+    // Kate holds one of the two 1901 flags: in step. Ann holds neither: out of
+    // step, with no question asked. Tom after her is never looked at.
+    const std::string bytes = family(
+        indi(1, "Kate /Byrne/", cens("31 MAR 1901", "Cork") + flags({"__CENSUS_IRELAN Census Ireland 1901"})) +
+        indi(2, "Ann /Byrne/", cens("31 MAR 1901", "Dublin")) + indi(3, "Tom /Byrne/", cens("1881")));
+    auto two = load(bytes);
+    const flagcheckresult s = checkflags(*two, false, QStringLiteral("UK"), [](const countryquestion&) {
+        ADD_FAILURE() << "silent mode asks nothing";
+        return countrychoice{};
+    });
+    EXPECT_TRUE(s.outofstep);
+    EXPECT_EQ(s.peoplechecked, 2);
+
+    // A superfluous flag alone is enough.
+    auto held = load(family(indi(1, "Kate /Byrne/", cens("31 MAR 1901", "Cork") +
+                                                         flags({"__CENSUS_UK_1901 Census UK 1901"})) +
+                            indi(2, "Mary /Smith/", cens("1891") + flags({"__CENSUS_1881 Census 1881"}))));
+    EXPECT_TRUE(flagsoutofstep(*held));
+}
+
+TEST_F(FlagCheck, InStepFilesAndEmptyFilesGiveTheTwoNothingRows)
+{
+    const QStringList none = {QStringLiteral("(There are no individuals with missing census flags)")};
+    const QStringList noremove = {
+        QStringLiteral("(There are no individuals with census flags that need to be removed)")};
+
+    // In step: an ABT year event holding its year flag, Kate holding one 1901 flag.
+    auto instep = load(family(
+        indi(1, "Tom /Byrne/", cens("ABT 1881") + flags({"__CENSUS_1881 Census 1881"})) +
+        indi(2, "Kate /Byrne/", cens("31 MAR 1901", "Cork") + flags({"__CENSUS_IRELAN Census Ireland 1901"}))));
+    flagcheckresult r = checkflags(*instep, true, QStringLiteral("UK"));
+    EXPECT_FALSE(r.outofstep);
+    EXPECT_EQ(r.addlist(), none);
+    EXPECT_EQ(r.removelist(), noremove);
+    EXPECT_FALSE(r.canchange());
+    EXPECT_FALSE(flagsoutofstep(*instep));
+
+    auto nobody = load(family(""));
+    r = checkflags(*nobody, true, QStringLiteral("UK"));
+    EXPECT_EQ(r.addlist(), none);
+    EXPECT_EQ(r.removelist(), noremove);
+    EXPECT_FALSE(r.canchange());
+
+    // No allocated flags: flags held and census events are left alone.
+    auto unallocated = load(mixed, flagtable{});
+    r = checkflags(*unallocated, true, QStringLiteral("UK"));
+    EXPECT_FALSE(r.outofstep);
+    EXPECT_EQ(r.addlist(), none);
+    EXPECT_EQ(r.removelist(), noremove);
+    EXPECT_FALSE(r.canchange());
+}
+
+TEST_F(FlagCheck, MessagesAndHeadings)
+{
+    EXPECT_EQ(flagsfilechangedmessage(QStringLiteral("/tmp/a.ged")),
+              QStringLiteral("/tmp/a.ged has been modified by another application. Flags will not be changed as a "
+                             "precaution to ensure there is no data loss. This form will now close and the file "
+                             "will be reloaded."));
+    EXPECT_EQ(flagsaddheading(), QStringLiteral("Flags that need to be added to individuals:"));
+    EXPECT_EQ(flagsremoveheading(), QStringLiteral("Flags that need to be removed from individuals:"));
+}
+
+// The changes of a check written by the rewrite (mode 4), read back and checked again.
+class FlagRewrite : public ::testing::Test {
+protected:
+    void SetUp() override { setclockfortests(QDateTime(QDate(2026, 12, 6), QTime(10, 11, 12))); }
+    void TearDown() override { setclockfortests(QDateTime()); }
+
+    std::string apply(const std::string& input, const QString& answer = QStringLiteral("UK"))
+    {
+        auto ix = load(input);
+        answers a{answer, true};
+        const flagcheckresult r = checkflags(*ix, true, QStringLiteral("UK"), a.asker());
+        rewriterequest rq;
+        rq.mode = rewritemode::flagchanges;
+        rq.flagchanges = r.changes;
+        std::string out;
+        const rewriteresult w = rewritebytes(input, out, *ix, defaultsettings(), rq);
+        EXPECT_TRUE(w.ok) << w.message.toStdString();
+        return out;
+    }
+};
+
+TEST_F(FlagRewrite, RemovingTheLastFlagDropsItsHeader)
+{
+    const std::string input = family(indi(1, "Mary /Smith/", flags({"__CENSUS_1881 Census 1881"}) + "1 SEX F\r\n") +
+                                     indi(2, "Tom /Smith/", "1 SEX M\r\n"));
+    const std::string out = apply(input);
+    EXPECT_EQ(out.find("_FLGS"), std::string::npos) << out;
+    EXPECT_EQ(out.find("__CENSUS_1881"), std::string::npos) << out;
+    EXPECT_NE(out.find("1 NAME Mary /Smith/\r\n1 SEX F\r\n1 CHAN\r\n2 DATE 06 DEC 2026\r\n"), std::string::npos)
+        << out;
+    EXPECT_NE(out.find("0 @I2@ INDI\r\n1 NAME Tom /Smith/\r\n1 SEX M\r\n0 TRLR"), std::string::npos) << out;
+    EXPECT_FALSE(flagsoutofstep(*load(out)));
+}
+
+TEST_F(FlagRewrite, AddsAndRemovalsLeaveTheFileInStep)
+{
+    const std::string input = family(
+        indi(1, "Mary /Smith/", cens("1891") + flags({"__OLD Old flag", "__CENSUS_1881 Census 1881"})) +
+        indi(2, "Ann /Byrne/", cens("31 MAR 1901", "Dublin") + cens("31 MAR 1901", "dublin")) +
+        indi(3, "John /Smith/", cens("3 APR 1881") + cens("3 APR 1881")));
+    const std::string out = apply(input, QStringLiteral("Ireland"));
+    // The unallocated flag stays; the allocated one without an event goes.
+    EXPECT_NE(out.find("1 _FLGS\r\n2 __OLD Old flag\r\n"), std::string::npos) << out;
+    EXPECT_GT(out.find("__CENSUS_1881"), out.find("0 @I2@")) << out;
+    EXPECT_NE(out.find("1 _FLGS\r\n2 __CENSUS_IRELAN Census Ireland 1901\r\n"), std::string::npos) << out;
+    // One flag line for John's two events.
+    const size_t john = out.find("0 @I3@");
+    ASSERT_NE(john, std::string::npos);
+    const size_t first = out.find("2 __CENSUS_1881 Census 1881", john);
+    ASSERT_NE(first, std::string::npos) << out;
+    EXPECT_EQ(out.find("2 __CENSUS_1881 Census 1881", first + 1), std::string::npos) << out;
+
+    auto again = load(out);
+    EXPECT_FALSE(flagsoutofstep(*again));
+    EXPECT_FALSE(checkflags(*again, true, QStringLiteral("UK")).canchange());
+}
+
+} // namespace

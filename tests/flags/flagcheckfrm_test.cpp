@@ -1,0 +1,336 @@
+// The Flag Check dialogs on the offscreen platform: the silent check after a
+// family file is opened with "Flag Check" on, the country question (answered,
+// remembered for the place, cancelled), making the changes, a family file
+// changed by another program before the changes are made, and the dialog's
+// own controls.
+#include "flags/flagcheckfrm.h"
+
+#include "flags/flagcheck.h"
+#include "flags/flagtable.h"
+#include "model/loadgedcom.h"
+#include "support/mainfrmfixture.h"
+
+#include <QCheckBox>
+#include <QListWidget>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QtTest>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+flagrec flag(const char* code, const char* name, const char* date, const char* country)
+{
+    flagrec f;
+    f.code = code;
+    f.name = name;
+    f.date = date;
+    f.country = country;
+    return f;
+}
+
+flagtable definitions()
+{
+    return {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
+            flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
+            flag("__CENSUS_1881", "Census 1881", "1881", "UK")};
+}
+
+// John lacks the 1881 flag; Mary holds it with no census event; Ann and Pat
+// were counted on the 1901 census day in Dublin (UK or Ireland?).
+const QByteArray family = "0 HEAD\r\n1 CHAR ANSI\r\n"
+                          "0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n2 PLAC Leeds\r\n"
+                          "0 @I2@ INDI\r\n1 NAME Mary /Smith/\r\n1 _FLGS\r\n2 __CENSUS_1881 Census 1881\r\n"
+                          "0 @I3@ INDI\r\n1 NAME Ann /Byrne/\r\n1 CENS\r\n2 DATE 31 MAR 1901\r\n2 PLAC Dublin\r\n"
+                          "0 @I4@ INDI\r\n1 NAME Pat /Byrne/\r\n1 CENS\r\n2 DATE 31 MAR 1901\r\n2 PLAC dublin\r\n"
+                          "0 TRLR\r\n";
+
+QStringList rows(QDialog* d, const char* list)
+{
+    QStringList out;
+    auto* l = d->findChild<QListWidget*>(QString::fromLatin1(list));
+    for (int i = 0; l && i < l->count(); ++i)
+        out << l->item(i)->text();
+    return out;
+}
+
+QByteArray bytesof(const QString& path)
+{
+    QFile f(path);
+    return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray();
+}
+
+} // namespace
+
+class flagcheckfrmtest : public QObject {
+    Q_OBJECT
+
+    windowfiles files;
+    QString backups;
+
+    settings checking()
+    {
+        settings s = defaultsettings();
+        s.flagcheck = true;
+        s.backupfolder = backups;
+        s.logpath = files.filepath(QStringLiteral("censuslog.txt"));
+        return s;
+    }
+
+    QString familyfile()
+    {
+        static int n = 0;
+        const QString path = files.filepath(QStringLiteral("family%1.ged").arg(++n));
+        QFile f(path);
+        if (!f.open(QIODevice::WriteOnly) || f.write(family) != family.size())
+            return QString();
+        return path;
+    }
+
+    int backupcount() const { return static_cast<int>(QDir(backups).entryList(QDir::Files).size()); }
+
+    // Starts the main window on `file` with the flag definitions in its store;
+    // `queue` queues the prompts' answers after the default-file question.
+    std::unique_ptr<session> start(const QString& file, const settings& s,
+                                   const std::function<void(scriptedprompts&)>& queue)
+    {
+        auto r = std::make_unique<session>(files.ini());
+        savesettings(*r->store, s);
+        saveflagsettings(*r->store, s);
+        saveflagdefs(*r->store, definitions());
+        r->store->sync();
+        r->make();
+        r->prompts.expect(answer::no, QStringLiteral("by default"));
+        queue(r->prompts);
+        if (!r->w->start({QLatin1Char('"') + file + QLatin1Char('"')}))
+            return nullptr;
+        r->w->show();
+        return r;
+    }
+
+private slots:
+    void initTestCase()
+    {
+        QVERIFY(files.valid());
+        backups = files.filepath(QStringLiteral("backups"));
+        QVERIFY(QDir().mkpath(backups));
+    }
+
+    // Opening a file with "Flag Check" on: the message, the question for Ann
+    // (Ireland, for all of Dublin: Pat is not asked), the dialog's rows, the
+    // changes made and the file read again.
+    void silentcheckopensthedialogandmakesthechanges()
+    {
+        const QString file = familyfile();
+        const int before = backupcount();
+        dialoganswers dialogs;
+        QStringList countries;
+        QString shownname, shownid, showndate, shownplace;
+        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [&](QDialog* d) {
+            for (int i = 0; i < 4; ++i) {
+                auto* o = d->findChild<QRadioButton*>(QStringLiteral("countryopt%1").arg(i));
+                if (o && !o->isHidden())
+                    countries << o->text() + (o->isChecked() ? QStringLiteral("*") : QString());
+            }
+            shownname = d->findChild<QLabel*>(QStringLiteral("namelab"))->text();
+            shownid = d->findChild<QLabel*>(QStringLiteral("idlab"))->text();
+            showndate = d->findChild<QLabel*>(QStringLiteral("datelab"))->text();
+            shownplace = d->findChild<QLabel*>(QStringLiteral("placelab"))->text();
+            d->findChild<QRadioButton*>(QStringLiteral("countryopt1"))->click();
+            d->findChild<QCheckBox*>(QStringLiteral("alwayschk"))->setChecked(true);
+            d->findChild<QPushButton*>(QStringLiteral("okbut"))->click();
+        });
+        QStringList added, removed;
+        bool enabled = false;
+        dialogs.expect(QStringLiteral("flagcheckfrm"), [&](QDialog* d) {
+            added = rows(d, "addlst");
+            removed = rows(d, "removelst");
+            auto* change = d->findChild<QPushButton*>(QStringLiteral("Changebut"));
+            enabled = change->isEnabled();
+            QVERIFY(d->findChild<QCheckBox*>(QStringLiteral("flagschk"))->isChecked());
+            change->click();
+        });
+        auto r = start(file, checking(), [](scriptedprompts& p) {
+            p.expect(answer::ok, QStringLiteral("out of sync with the census entries"));
+            p.expect(answer::yes, QStringLiteral("Are you sure you want to set/unset flags as suggested?"));
+        });
+        QVERIFY(r);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(dialogs.pending(), 0);
+        QCOMPARE(r->prompts.unexpected(), 0);
+        QCOMPARE(countries, QStringList({QStringLiteral("UK*"), QStringLiteral("Ireland")}));
+        QCOMPARE(shownname, QStringLiteral("Byrne, Ann"));
+        QCOMPARE(shownid, QStringLiteral("3"));
+        QCOMPARE(showndate, QStringLiteral("31 MAR 1901"));
+        QCOMPARE(shownplace, QStringLiteral("Dublin"));
+        QCOMPARE(added, QStringList({QStringLiteral("'Census 1881' flag to individual Smith, John (ID: 1)"),
+                                     QStringLiteral("'Census Ireland 1901' flag to individual Byrne, Ann (ID: 3)"),
+                                     QStringLiteral("'Census Ireland 1901' flag to individual Byrne, Pat (ID: 4)")}));
+        QCOMPARE(removed, QStringList({QStringLiteral("'Census 1881' flag from individual Smith, Mary (ID: 2)")}));
+        QVERIFY(enabled);
+
+        // The file holds the changes, its backup the file as it was, and the
+        // window has read it again.
+        const QByteArray now = bytesof(file);
+        QVERIFY(now.contains("2 PLAC Leeds\r\n1 _FLGS\r\n2 __CENSUS_1881 Census 1881\r\n1 CHAN"));
+        QVERIFY(now.contains("1 NAME Mary /Smith/\r\n1 CHAN"));
+        QVERIFY(now.contains("2 PLAC Dublin\r\n1 _FLGS\r\n2 __CENSUS_IRELAN Census Ireland 1901\r\n1 CHAN"));
+        QVERIFY(now.contains("2 PLAC dublin\r\n1 _FLGS\r\n2 __CENSUS_IRELAN Census Ireland 1901\r\n1 CHAN"));
+        QCOMPARE(backupcount(), before + 1);
+        const gedcomindex* ix = r->w->index();
+        QVERIFY(ix);
+        QCOMPARE(ix->people.at(0).flagids.size(), size_t{1});
+        QVERIFY(ix->people.at(1).flagids.empty());
+        QVERIFY(!flagsoutofstep(*ix));
+        QVERIFY(r->w->watching());
+    }
+
+    // Cancelling the country question ends the check: the message, no Flag
+    // Check dialog, nothing written.
+    void cancelledquestionwritesnothing()
+    {
+        const QString file = familyfile();
+        const int before = backupcount();
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
+            d->findChild<QPushButton*>(QStringLiteral("cancelbut"))->click();
+        });
+        auto r = start(file, checking(), [](scriptedprompts& p) {
+            p.expect(answer::ok, QStringLiteral("out of sync"));
+            p.expect(answer::ok, QStringLiteral("Flag check was cancelled. The flags in the file have not been changed."));
+        });
+        QVERIFY(r);
+        QTest::qWait(30);
+        QCOMPARE(dialogs.seen, QStringList({QStringLiteral("flagcheckcountryfrm")}));
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(r->prompts.unexpected(), 0);
+        QCOMPARE(bytesof(file), family);
+        QCOMPARE(backupcount(), before);
+    }
+
+    // The family file changes outside the program while the dialog is open:
+    // nothing is written, the user is told, and the file is read again.
+    void outsidechangeisnotwrittenover()
+    {
+        const QString file = familyfile();
+        const int before = backupcount();
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
+            d->findChild<QPushButton*>(QStringLiteral("okbut"))->click(); // UK, preselected
+        });
+        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
+            d->findChild<QPushButton*>(QStringLiteral("okbut"))->click();
+        });
+        dialogs.expect(QStringLiteral("flagcheckfrm"), [&](QDialog* d) {
+            QVERIFY(replaceinfile(file, "1 NAME Pat /Byrne/", "1 NAME Patrick /Byrne/"));
+            d->findChild<QPushButton*>(QStringLiteral("Changebut"))->click();
+        });
+        auto r = start(file, checking(), [&](scriptedprompts& p) {
+            p.expect(answer::ok, QStringLiteral("out of sync"));
+            p.expect(answer::yes, QStringLiteral("set/unset"));
+            p.expect(answer::ok, QDir::toNativeSeparators(file) +
+                                     QStringLiteral(" has been modified by another application. Flags will not be "
+                                                    "changed as a precaution to ensure there is no data loss. This "
+                                                    "form will now close and the file will be reloaded."));
+        });
+        QVERIFY(r);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(dialogs.pending(), 0);
+        QCOMPARE(r->prompts.unexpected(), 0);
+        QByteArray changed = family;
+        changed.replace("1 NAME Pat /Byrne/", "1 NAME Patrick /Byrne/");
+        QCOMPARE(bytesof(file), changed);
+        QCOMPARE(backupcount(), before);
+        QCOMPARE(QString::fromUtf8(r->w->index()->people.at(3).name), QStringLiteral("Byrne, Patrick"));
+    }
+
+    // "Don't make changes" writes nothing; with the flags in step nothing is shown at all.
+    void nochangesandinstepfiles()
+    {
+        const QString file = familyfile();
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
+            d->findChild<QCheckBox*>(QStringLiteral("alwayschk"))->setChecked(true);
+            d->findChild<QPushButton*>(QStringLiteral("okbut"))->click();
+        });
+        dialogs.expect(QStringLiteral("flagcheckfrm"), [](QDialog* d) {
+            d->findChild<QPushButton*>(QStringLiteral("closebut"))->click();
+        });
+        auto r = start(file, checking(), [](scriptedprompts& p) { p.expect(answer::ok, QStringLiteral("out of sync")); });
+        QVERIFY(r);
+        QCOMPARE(dialogs.pending(), 0);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(r->prompts.unexpected(), 0);
+        QCOMPARE(bytesof(file), family);
+
+        const QString instep = files.filepath(QStringLiteral("instep.ged"));
+        QFile f(instep);
+        QVERIFY(f.open(QIODevice::WriteOnly));
+        f.write("0 HEAD\r\n0 @I1@ INDI\r\n1 NAME Tom /Smith/\r\n1 CENS\r\n2 DATE 1881\r\n1 _FLGS\r\n"
+                "2 __CENSUS_1881 Census 1881\r\n0 TRLR\r\n");
+        f.close();
+        dialoganswers none;
+        auto quiet = start(instep, checking(), [](scriptedprompts&) {});
+        QVERIFY(quiet);
+        QTest::qWait(30);
+        QVERIFY(none.seen.isEmpty());
+        QCOMPARE(quiet->prompts.unexpected(), 0);
+    }
+
+    // The dialog alone: "Flag Check" stored when ticked by the user only, the
+    // help topic, the two nothing rows, a failed backup keeping it open.
+    void dialogcontrols()
+    {
+        auto store = settingsstore::onfile(files.ini());
+        scriptedprompts prompts;
+        settings s = checking();
+        std::unique_ptr<gedcomindex> ix = loadgedcombytes("0 HEAD\r\n0 TRLR\r\n", definitions());
+        {
+            flagcheckfrm d(*ix, s, *store, prompts);
+            QCOMPARE(d.objectName(), QStringLiteral("flagcheckfrm"));
+            QCOMPARE(d.windowTitle(), QStringLiteral("Flag Check"));
+            QCOMPARE(rows(&d, "addlst"), QStringList({QStringLiteral("(There are no individuals with missing census flags)")}));
+            QCOMPARE(rows(&d, "removelst"),
+                     QStringList({QStringLiteral("(There are no individuals with census flags that need to be removed)")}));
+            QVERIFY(!d.findChild<QPushButton*>(QStringLiteral("Changebut"))->isEnabled());
+            auto* chk = d.findChild<QCheckBox*>(QStringLiteral("flagschk"));
+            QVERIFY(chk->isChecked());
+            QVERIFY(!store->read(QStringLiteral("Flag Check")));
+            chk->click();
+            QCOMPARE(store->read(QStringLiteral("Flag Check")).value_or(QString()), QStringLiteral("0"));
+            QVERIFY(!s.flagcheck);
+            d.findChild<QPushButton*>(QStringLiteral("helpbut"))->click();
+            QCOMPARE(prompts.helpshown, QStringList({QStringLiteral("55")}));
+        }
+
+        // A backup that cannot be made: the message, the dialog stays, nothing written.
+        const QString file = files.filepath(QStringLiteral("john.ged"));
+        const QByteArray john = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n0 TRLR\r\n";
+        QFile f(file);
+        QVERIFY(f.open(QIODevice::WriteOnly));
+        f.write(john);
+        f.close();
+        loadresult loaded = loadgedcom(file, definitions());
+        QVERIFY(loaded.index);
+        s.backupfolder = file + QStringLiteral("/backups"); // under a file: cannot be made
+        flagcheckfrm d(*loaded.index, s, *store, prompts, nullptr);
+        QVERIFY(!d.cancelled());
+        d.show();
+        auto* change = d.findChild<QPushButton*>(QStringLiteral("Changebut"));
+        QVERIFY(change->isEnabled());
+        prompts.expect(answer::no, QStringLiteral("set/unset"));
+        change->click();
+        prompts.expect(answer::yes, QStringLiteral("set/unset"));
+        prompts.expect(answer::ok);
+        change->click();
+        QCOMPARE(prompts.unexpected(), 0);
+        QVERIFY(d.isVisible());
+        QCOMPARE(d.outcome(), flagcheckend::unchanged);
+        QCOMPARE(bytesof(file), john);
+    }
+};
+
+QTEST_MAIN(flagcheckfrmtest)
+#include "flagcheckfrm_test.moc"
