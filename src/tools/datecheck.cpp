@@ -98,12 +98,26 @@ QString countrywords(const QString& country)
     }
 }
 
+// Alphabetical order ignoring letter case; the case-folded texts are made
+// once, since a date may have hundreds of thousands of events.
 void sortdetails(std::vector<detailentry>& list)
 {
-    std::stable_sort(list.begin(), list.end(), [](const detailentry& a, const detailentry& b) {
-        const int c = a.text.compare(b.text, Qt::CaseInsensitive);
-        return c != 0 ? c < 0 : a.text < b.text;
+    std::vector<std::pair<QString, size_t>> keys;
+    keys.reserve(list.size());
+    for (size_t k = 0; k < list.size(); ++k)
+        keys.emplace_back(list[k].text.toCaseFolded(), k);
+    std::sort(keys.begin(), keys.end(), [&list](const auto& a, const auto& b) {
+        if (a.first != b.first)
+            return a.first < b.first;
+        if (list[a.second].text != list[b.second].text)
+            return list[a.second].text < list[b.second].text;
+        return a.second < b.second;
     });
+    std::vector<detailentry> sorted;
+    sorted.reserve(list.size());
+    for (const auto& key : keys)
+        sorted.push_back(std::move(list[key.second]));
+    list = std::move(sorted);
 }
 
 } // namespace

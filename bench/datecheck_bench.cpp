@@ -1,0 +1,88 @@
+// The census date check on generated family files (gen_family_gedcom.py; the
+// folder is QM_BENCH_DIR, else /work/gen): the analysis with its proposals,
+// run when the dialog opens and at each country chosen, and the details of the
+// most frequent date (the individuals of the longest list the dialog fills).
+#include "model/loadgedcom.h"
+#include "tools/datecheck.h"
+
+#include <QFileInfo>
+
+#include <benchmark/benchmark.h>
+
+#include <cstdlib>
+#include <map>
+#include <memory>
+
+namespace {
+
+QString benchfile(const char* name)
+{
+    const char* dir = std::getenv("QM_BENCH_DIR");
+    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
+}
+
+// Each file is loaded once for all the benchmarks that use it.
+const qm::gedcomindex* indexof(const char* name)
+{
+    static std::map<std::string, std::unique_ptr<qm::gedcomindex>> loaded;
+    auto& slot = loaded[name];
+    if (!slot) {
+        const QString path = benchfile(name);
+        if (!QFileInfo(path).isFile())
+            return nullptr;
+        slot = qm::loadgedcom(path, {}).index;
+    }
+    return slot.get();
+}
+
+void analysis(benchmark::State& state, const char* name)
+{
+    const qm::gedcomindex* ix = indexof(name);
+    if (!ix) {
+        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+        return;
+    }
+    size_t dates = 0;
+    for (auto _ : state) {
+        qm::datecheckstate check(*ix, qm::dateorder::dmy);
+        check.choosecountry(QStringLiteral("UK"));
+        const qm::datelists lists = check.lists();
+        dates = check.changes().size();
+        benchmark::DoNotOptimize(lists.canchange);
+    }
+    state.SetItemsProcessed(static_cast<int64_t>(state.iterations()) * ix->censusevents);
+    state.counters["census_events"] = static_cast<double>(ix->censusevents);
+    state.counters["dates"] = static_cast<double>(dates);
+}
+
+void details(benchmark::State& state, const char* name)
+{
+    const qm::gedcomindex* ix = indexof(name);
+    if (!ix) {
+        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+        return;
+    }
+    qm::datecheckstate check(*ix, qm::dateorder::dmy);
+    check.choosecountry(QStringLiteral("UK"));
+    int most = 0;
+    for (size_t k = 0; k < check.changes().size(); ++k)
+        if (check.changes()[k].count > check.changes()[static_cast<size_t>(most)].count)
+            most = static_cast<int>(k);
+    size_t rows = 0;
+    for (auto _ : state) {
+        rows = check.details(most, false).size();
+        benchmark::DoNotOptimize(rows);
+    }
+    state.counters["rows"] = static_cast<double>(rows);
+}
+
+} // namespace
+
+BENCHMARK_CAPTURE(analysis, fam10000, "fam10000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(analysis, fam100000, "fam100000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(analysis, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(3);
+BENCHMARK_CAPTURE(details, fam10000, "fam10000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(details, fam100000, "fam100000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(details, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(3);
+
+BENCHMARK_MAIN();
