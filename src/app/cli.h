@@ -34,6 +34,7 @@ int clistats(QStringList args);
 int cliaddentry(QStringList args);
 int clidatecheck(QStringList args);
 int cliflagcheck(QStringList args);
+int cliattachimages(QStringList args);
 
 // Exit status of a command that could not do its work.
 constexpr int clifailure = 2;

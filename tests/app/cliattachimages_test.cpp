@@ -1,0 +1,168 @@
+// quillmark-cli attach-images, run as a process on copies of family files.
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFile>
+#include <QJsonArray>
+#include <QJsonDocument>
+#include <QJsonObject>
+#include <QProcess>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using qmtest::readfile;
+using qmtest::writefile;
+
+namespace {
+
+// S1 is cited by two census events of 3 APR 1881; S2 has one image already.
+const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
+                           "0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n2 SOUR @S1@\r\n"
+                           "0 @I2@ INDI\r\n1 NAME Mary /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n2 SOUR @S1@\r\n"
+                           "0 @S1@ SOUR\r\n1 TITL Census 1881 Leeds RG11/4500\r\n"
+                           "0 @S2@ SOUR\r\n1 TITL Census 1891 Leeds\r\n1 OBJE @O5@\r\n"
+                           "0 @O5@ OBJE\r\n1 FORM jpg\r\n1 TITL Leeds 1891 page\r\n1 _FILE pages/leeds.jpg\r\n"
+                           "0 TRLR\r\n";
+
+struct run {
+    int status = -1;
+    std::string out, err;
+    QJsonObject json() const { return QJsonDocument::fromJson(QByteArray::fromStdString(out)).object(); }
+};
+
+class CliAttachImages : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        QDir(dir.path()).mkdir(QStringLiteral("backups"));
+        file = dir.filePath(QStringLiteral("family.ged"));
+        writefile(file, family);
+        ini = dir.filePath(QStringLiteral("settings.ini"));
+        qm::settings s = qm::defaultsettings();
+        s.backupfolder = dir.filePath(QStringLiteral("backups"));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        s.asid = false;
+        const auto store = qm::settingsstore::onfile(ini);
+        qm::savesettings(*store, s);
+        qm::saveflagsettings(*store, s); // kept apart from the others, but read with them
+        page1 = image("page1.png");
+        page2 = image("page2.jpg");
+    }
+
+    QString image(const char* name)
+    {
+        const QString path = dir.filePath(QString::fromLatin1(name));
+        writefile(path, "not really a picture");
+        return path;
+    }
+
+    run attach(const QStringList& args)
+    {
+        QProcess p;
+        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+        env.insert(QStringLiteral("XDG_DATA_HOME"), dir.path());
+        p.setProcessEnvironment(env);
+        p.start(QStringLiteral(QM_CLI_PATH),
+                QStringList{QStringLiteral("attach-images"), file} + args
+                    + QStringList{QStringLiteral("--settings"), ini});
+        p.waitForFinished(60000);
+        return {p.exitCode(), p.readAllStandardOutput().toStdString(), p.readAllStandardError().toStdString()};
+    }
+
+    // Refused: status 2, the message on standard error, nothing written.
+    void expectrefused(const QStringList& args, const std::string& message)
+    {
+        const run r = attach(args);
+        EXPECT_EQ(r.status, 2) << args.join(u' ').toStdString();
+        EXPECT_NE(r.err.find(message), std::string::npos) << r.err;
+        EXPECT_EQ(r.out, "");
+        EXPECT_EQ(readfile(file), family);
+        EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty());
+    }
+
+    std::string native(const QString& path) const { return QDir::toNativeSeparators(path).toStdString(); }
+
+    QTemporaryDir dir;
+    QString file, ini, page1, page2;
+};
+
+} // namespace
+
+TEST_F(CliAttachImages, NewFilesAndAnExistingRecord)
+{
+    const run r = attach({QStringLiteral("--source"), QStringLiteral("S1"), QStringLiteral("--image"), page1,
+                          QStringLiteral("--object"), QStringLiteral("@O5@"), QStringLiteral("--image"), page2});
+    ASSERT_EQ(r.status, 0) << r.err;
+    const QJsonObject j = r.json();
+    EXPECT_EQ(j.value(QStringLiteral("source")).toInt(), 1);
+    EXPECT_EQ(j.value(QStringLiteral("new_objects")).toArray(), (QJsonArray{6, 7}));
+    EXPECT_EQ(j.value(QStringLiteral("linked_objects")).toArray(), (QJsonArray{5}));
+    EXPECT_TRUE(j.value(QStringLiteral("log")).toBool());
+    EXPECT_EQ(readfile(j.value(QStringLiteral("backup")).toString()), family);
+
+    const std::string now = readfile(file);
+    // The links in the order given, the new records after the last one, titled
+    // after the source and numbered, dated with the source's census date.
+    EXPECT_NE(now.find("0 @S1@ SOUR\r\n1 TITL Census 1881 Leeds RG11/4500\r\n"
+                       "1 OBJE @O6@\r\n1 OBJE @O5@\r\n1 OBJE @O7@\r\n1 CHAN\r\n"),
+              std::string::npos)
+        << now;
+    EXPECT_NE(now.find("0 @O6@ OBJE\r\n1 FORM png\r\n1 TITL Census 1881 Leeds RG11/4500\r\n1 _FILE " + native(page1)
+                       + "\r\n1 _DATE 3 APR 1881\r\n"),
+              std::string::npos)
+        << now;
+    EXPECT_NE(now.find("0 @O7@ OBJE\r\n1 FORM jpeg\r\n"), std::string::npos) << now;
+    EXPECT_LT(now.find("0 @O5@ OBJE"), now.find("0 @O6@ OBJE"));
+    EXPECT_NE(now.find("0 @O5@ OBJE\r\n1 FORM jpg\r\n1 TITL Leeds 1891 page\r\n1 _FILE pages/leeds.jpg\r\n0 @O6@ OBJE"),
+              std::string::npos);
+}
+
+TEST_F(CliAttachImages, OwnTitle)
+{
+    const run r = attach({QStringLiteral("--source=1"), QStringLiteral("--image=") + page1 + QStringLiteral("=Leeds page 92")});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_NE(readfile(file).find("1 TITL Leeds page 92\r\n1 _FILE " + native(page1) + "\r\n"), std::string::npos);
+}
+
+TEST_F(CliAttachImages, RefusalsWriteNothing)
+{
+    const QString src = QStringLiteral("--source");
+    const QString img = QStringLiteral("--image");
+    expectrefused({src, QStringLiteral("9"), img, page1}, "there is no source @S9@");
+    expectrefused({src, QStringLiteral("1"), QStringLiteral("--object"), QStringLiteral("8")},
+                  "there is no multimedia record @O8@");
+    expectrefused({src, QStringLiteral("1"), img, dir.filePath(QStringLiteral("missing.png"))}, "no such image file");
+    expectrefused({src, QStringLiteral("1"), img, page1, img, page1},
+                  "This image has already been selected to be part of this census entry");
+    expectrefused({src, QStringLiteral("1"), QStringLiteral("--object"), QStringLiteral("5"), QStringLiteral("--object"),
+                   QStringLiteral("O5")},
+                  "This image has already been selected");
+    expectrefused({src, QStringLiteral("1"), img, image("tool.EXE")},
+                  "You have selected an application program rather than an image file.");
+    expectrefused({src, QStringLiteral("1"), img, file},
+                  "You have selected a GEDCOM family history file rather than an image file.");
+    expectrefused({src, QStringLiteral("1")}, "attach-images needs");
+    expectrefused({src, QStringLiteral("X1"), img, page1}, "--source needs");
+    expectrefused({src, QStringLiteral("1"), img}, "--image needs a value");
+}
+
+TEST_F(CliAttachImages, FileOfAnExistingRecordIsRefused)
+{
+    QDir(dir.path()).mkdir(QStringLiteral("pages"));
+    const QString leeds = dir.filePath(QStringLiteral("pages/leeds.jpg"));
+    writefile(leeds, "x");
+    std::string withpath = family;
+    const std::string from = "1 _FILE pages/leeds.jpg";
+    withpath.replace(withpath.find(from), from.size(), "1 _FILE " + native(leeds));
+    writefile(file, withpath);
+    const run r = attach({QStringLiteral("--source"), QStringLiteral("1"), QStringLiteral("--image"), leeds});
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.find("This image is already loaded into Family Historian and has the title Leeds 1891 page."),
+              std::string::npos)
+        << r.err;
+    EXPECT_EQ(readfile(file), withpath);
+}
