@@ -1,10 +1,14 @@
 #include "images/imagechoices.h"
 
+#include "app/recentfiles.h"
+
 #include "log/censuslog.h"
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
+#include "platform/settingsstore.h"
 #include "settings/settings.h"
 
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 
@@ -14,20 +18,10 @@ namespace qm {
 
 namespace {
 
-qsizetype lastseparator(const QString& path)
-{
-    return std::max(path.lastIndexOf(u'/'), path.lastIndexOf(u'\\'));
-}
-
-QString filename(const QString& path)
-{
-    return path.mid(lastseparator(path) + 1);
-}
-
 // The extension of the file name with its ".", or "".
 QString extensionof(const QString& path)
 {
-    const QString name = filename(path);
+    const QString name = filenameof(path);
     const qsizetype dot = name.lastIndexOf(u'.');
     return dot < 0 ? QString() : name.mid(dot);
 }
@@ -69,14 +63,9 @@ QString imagefiletype(const QString& path)
 
 QString titlefromfilename(const QString& path)
 {
-    const QString name = filename(path);
+    const QString name = filenameof(path);
     const qsizetype dot = name.lastIndexOf(u'.');
     return dot <= 0 ? name : name.left(dot);
-}
-
-QString folderof(const QString& path)
-{
-    return path.left(lastseparator(path) + 1);
 }
 
 int nexttitlenumber(const std::vector<imagechoice>& chosen, const QString& base)
@@ -175,6 +164,32 @@ bool mentionscensus(const objectrec& object)
 {
     return qs(object.title).toUpper().contains(QLatin1String("CENSUS"))
         || qs(object.file).toUpper().contains(QLatin1String("CENSUS"));
+}
+
+imagedialogvalues readimagevalues(const settingsstore& store, const settings& s)
+{
+    imagedialogvalues v;
+    v.folder = store.read(QStringLiteral("Image Folder")).value_or(s.imagefolder).trimmed();
+    if (!v.folder.isEmpty() && !QFileInfo(v.folder).isDir())
+        v.folder.clear();
+    const QString option = store.read(QStringLiteral("Image Option")).value_or(s.imageoption);
+    v.option = option.size() == 1 && option[0] >= u'0' && option[0] <= u'3' ? option[0].unicode() - u'0' : 0;
+    const std::optional<QString> rename = store.read(QStringLiteral("Rename File"));
+    v.rename = rename && rename->size() == 1 ? *rename == QLatin1String("1") : s.renamefile;
+    return v;
+}
+
+void saveimagefolder(settingsstore& store, const QString& chosenfile)
+{
+    store.write(QStringLiteral("Image Folder"), QDir::toNativeSeparators(folderof(chosenfile)));
+    store.sync();
+}
+
+void saveimagechoice(settingsstore& store, int option, bool rename)
+{
+    store.write(QStringLiteral("Image Option"), QString::number(option >= 0 && option <= 3 ? option : 0));
+    store.write(QStringLiteral("Rename File"), rename ? QStringLiteral("1") : QStringLiteral("0"));
+    store.sync();
 }
 
 QString renamedpath(const QString& path, const QString& title)

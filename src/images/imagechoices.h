@@ -16,6 +16,7 @@ namespace qm {
 struct gedcomindex;
 struct objectrec;
 struct settings;
+class settingsstore;
 
 // A title made fit for a file name: each of : \ / ? * < > | ' " becomes "_".
 QString cleanfilename(QString text);
@@ -28,9 +29,6 @@ QString imagefiletype(const QString& path);
 // The file name without its folder and its extension (kept whole when its
 // only "." is its first character, or when it has none).
 QString titlefromfilename(const QString& path);
-
-// The folder of a path, up to and including its last "/" or "\".
-QString folderof(const QString& path);
 
 // The number the next new image titled `base` gets: one more than the highest
 // among the new images of that exact title, or 1.
@@ -64,6 +62,19 @@ QString imagerow(int position, const imagechoice& image);
 QString pathrow(const QString& file);
 // "CENSUS" in the record's title or file path, ignoring case.
 bool mentionscensus(const objectrec& object);
+
+// The values the Add a new image... dialog keeps in the settings store: the
+// folder of the last image file chosen, the title option last used (0-3) and
+// the state of "Rename the file to match the title?". Read afresh each time,
+// since the dialog writes them while the program runs.
+struct imagedialogvalues {
+    QString folder;
+    int option = 0;
+    bool rename = false;
+};
+imagedialogvalues readimagevalues(const settingsstore& store, const settings& s);
+void saveimagefolder(settingsstore& store, const QString& chosenfile);
+void saveimagechoice(settingsstore& store, int option, bool rename);
 
 // Renaming a chosen file to match its title.
 struct renameresult {

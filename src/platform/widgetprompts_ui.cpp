@@ -1,8 +1,9 @@
 #include "platform/widgetprompts_ui.h"
 
+#include "platform/opencheck.h"
+
 #include <QApplication>
 #include <QDesktopServices>
-#include <QFileInfo>
 #include <QFileDialog>
 #include <QGuiApplication>
 #include <QMessageBox>
@@ -157,8 +158,10 @@ QString widgetprompts::openexternal(const QString& target)
     const QUrl url = target.startsWith(QLatin1String("https://")) || target.startsWith(QLatin1String("http://"))
                          ? QUrl(target)
                          : QUrl::fromLocalFile(target);
-    if (url.isLocalFile() && !QFileInfo(target).isFile())
-        return QStringLiteral("The specified file was not found.");
+    // A local path may come from a family file: never let it start a program.
+    if (url.isLocalFile())
+        if (const QString refused = refuseopen(target); !refused.isEmpty())
+            return refused;
     return QDesktopServices::openUrl(url) ? QString()
                                           : QStringLiteral("There is no application associated with the given "
                                                            "file name extension.");

@@ -103,6 +103,8 @@ private:
         QDir().mkpath(folder + QStringLiteral("/backups"));
         s.backupfolder = folder + QStringLiteral("/backups");
         s.logpath = folder + QStringLiteral("/censuslog.txt");
+        // The Census Images dialog is tested on its own (imagesfrm_test).
+        s.requestimage = false;
         return s;
     }
     int runs_ = 0;
