@@ -97,8 +97,11 @@ flagcheckfrm::flagcheckfrm(gedcomindex& index, settings& s, settingsstore& store
     check_ = checkflags(index_, true, settings_.country, ask);
     if (check_.cancelled)
         prompts_.tell(flagcheckcancelledmessage());
-    addlst_->addItems(check_.addlist());
-    removelst_->addItems(check_.removelist());
+    {
+        busycursor busy(prompts_);
+        addlst_->addItems(check_.addlist());
+        removelst_->addItems(check_.removelist());
+    }
     Changebut_->setEnabled(check_.canchange());
 
     loading_ = true;
