@@ -6,6 +6,7 @@
 #include <QRegularExpression>
 
 #include <algorithm>
+#include <limits>
 
 namespace qm {
 
@@ -248,21 +249,28 @@ std::vector<helphit> searchhelp(const std::vector<helpdoc>& docs, const QString&
         const QStringList textwords = helpwords(d.text);
         const QStringList titlewords = helpwords(d.title);
         int score = 0;
-        bool all = true;
+        int least = std::numeric_limits<int>::max();
         for (const QString& q : words) {
             const int n = count(q, textwords);
             if (n == 0) {
-                all = false;
+                least = 0;
                 break;
             }
-            score += n + 5 * count(q, titlewords);
+            const int weighed = n + 5 * count(q, titlewords);
+            score += weighed;
+            least = std::min(least, weighed);
         }
-        if (all && phrase.size() > 1)
+        if (least == 0)
+            continue;
+        if (phrase.size() > 1)
             score += 10 * phrases(phrase, textwords);
-        if (all)
-            hits.push_back({d.page, d.title, score, excerptat(d.text, firstmatch(d.text, words))});
+        hits.push_back({d.page, d.title, score, least, excerptat(d.text, firstmatch(d.text, words))});
     }
-    std::stable_sort(hits.begin(), hits.end(), [](const helphit& a, const helphit& b) { return a.score > b.score; });
+    // A page that has every word often beats one that has one common word
+    // very often ("census flag": the flag pages before the pages about censuses).
+    std::stable_sort(hits.begin(), hits.end(), [](const helphit& a, const helphit& b) {
+        return a.least != b.least ? a.least > b.least : a.score > b.score;
+    });
     return hits;
 }
 

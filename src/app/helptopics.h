@@ -49,14 +49,16 @@ struct helphit {
     QString page;
     QString title;
     int score = 0;   // matches in the text, plus extra weight for the title and the whole phrase
+    int least = 0;   // the matches (title weighed in) of the query word found least often
     QString excerpt; // the text around the first match
 };
 
 // The pages holding every word of the query, best first: whole words,
 // letter case ignored; a word ending in "*" matches every word that begins
-// with it. Pages score by their number of matches, a title match counting
-// five and the query's words found together, in order, ten more; equal scores
-// keep page order. The index and search pages are left out.
+// with it. Each word's matches are counted, a title match counting five;
+// pages rank by the count of their rarest query word, then by the score: all
+// counts plus ten for each place where the query's words stand together, in
+// order. Equal pages keep page order. The index and search pages are left out.
 std::vector<helphit> searchhelp(const std::vector<helpdoc>& docs, const QString& query);
 
 // The words of a query or a text, lower-cased.

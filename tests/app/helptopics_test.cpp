@@ -161,6 +161,18 @@ TEST(HelpSearch, WholeWordsAnyCaseRankedByMatches)
     EXPECT_EQ(together[0].score, 13);
     EXPECT_EQ(together[1].score, 5);
 
+    // The rarest word of the query decides first: one page with both words
+    // twice beats one with a single word many times.
+    const std::vector<helpdoc> mixed = {
+        {QStringLiteral("m.html"), QStringLiteral("M"), QStringLiteral("census census census census census census flag")},
+        {QStringLiteral("n.html"), QStringLiteral("N"), QStringLiteral("census flag census flag")},
+    };
+    const std::vector<helphit> both = searchhelp(mixed, QStringLiteral("census flag"));
+    ASSERT_EQ(both.size(), 2u);
+    EXPECT_EQ(both[0].page, QStringLiteral("n.html"));
+    EXPECT_EQ(both[0].least, 2);
+    EXPECT_EQ(both[1].score, 17); // 6 + 1 + 10 for the words side by side
+
     // Every word must occur; nothing typed finds nothing.
     EXPECT_EQ(searchhelp(docs, QStringLiteral("flag here")).size(), 1u);
     EXPECT_TRUE(searchhelp(docs, QStringLiteral("flag absent")).empty());
@@ -190,6 +202,11 @@ TEST(HelpSearch, FlagFindsTheFlagPagesFirst)
     top.sort();
     EXPECT_EQ(top, (QStringList{QStringLiteral("census-flags.html"), QStringLiteral("flag-check.html")}));
     EXPECT_GE(hits[1].score, hits[2].score);
+    const std::vector<helphit> censusflag = searchhelp(docs, QStringLiteral("census flag"));
+    ASSERT_GE(censusflag.size(), 2u);
+    top = QStringList{censusflag[0].page, censusflag[1].page};
+    top.sort();
+    EXPECT_EQ(top, (QStringList{QStringLiteral("census-flags.html"), QStringLiteral("flag-check.html")}));
     for (const helphit& h : hits) {
         EXPECT_NE(h.page, indexpage());
         EXPECT_TRUE(h.excerpt.contains(QLatin1String("flag"), Qt::CaseInsensitive));
