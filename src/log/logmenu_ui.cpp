@@ -1,16 +1,19 @@
 #include "app/mainfrm.h"
 
+#include "log/clearlog.h"
+#include "log/logfrm.h"
+
 namespace qm {
 
 // "View Log..." and "Clear Log File".
 void mainfrm::viewlog()
 {
-    comingsoon();
+    logfrm::view(settings_.logpath, prompts_, this);
 }
 
 void mainfrm::clearlogfile()
 {
-    comingsoon();
+    clearlog(prompts_, settings_.logpath);
 }
 
 } // namespace qm

@@ -1,12 +1,38 @@
 #include "app/mainfrm.h"
 
+#include "census/householdpanel_ui.h"
+#include "census/peoplelist_ui.h"
+#include "model/loadgedcom.h"
+#include "platform/prompts.h"
+#include "tools/findfrm.h"
+#include "tools/findindividual.h"
+
 namespace qm {
 
-// The Find dialog, from the Find button: the individual chosen, or -1.
-int32_t mainfrm::runfind(int32_t)
+// The Find dialog, from the Find button: the individual chosen, or -1. Sets
+// fromfind_ when the immediate family is to be rebuilt around it.
+int32_t mainfrm::runfind(int32_t start)
 {
-    comingsoon();
-    return -1;
+    if (!index_)
+        return -1;
+    std::vector<listentry> entries;
+    {
+        busycursor busy(prompts_);
+        std::vector<listentry> mainlist;
+        // Above 32,000 individuals the dialog offers what the people list holds.
+        if (!peoplelistshown(*index_)) {
+            const peoplelistmodel* people = household_->people;
+            mainlist.reserve(static_cast<size_t>(people->rowCount()));
+            for (int r = 0; r < people->rowCount(); ++r)
+                mainlist.push_back({people->textat(r), people->personat(r)});
+        }
+        entries = findlist(*index_, settings_.idonly, std::move(mainlist));
+    }
+    findfrm dialog(*index_, std::move(entries), start, prompts_, this);
+    if (dialog.exec() != QDialog::Accepted)
+        return -1;
+    fromfind_ = dialog.refocus();
+    return dialog.result();
 }
 
 } // namespace qm

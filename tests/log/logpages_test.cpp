@@ -1,0 +1,159 @@
+#include "log/clearlog.h"
+#include "log/logpages.h"
+
+#include "platform/scriptedprompts.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+#include <unistd.h>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+// Lines of 98 characters and CR LF: 100 characters each on a page.
+std::string lines(int count, char fill = 'x')
+{
+    std::string out;
+    for (int i = 0; i < count; ++i)
+        out += std::string(98, fill) + "\r\n";
+    return out;
+}
+
+class LogPages : public ::testing::Test {
+protected:
+    QTemporaryDir dir;
+    QString log = dir.filePath(QStringLiteral("censuslog.txt"));
+};
+
+} // namespace
+
+// 650 lines make 65,000 characters: one line more reaches 65,001 and ends the page.
+TEST_F(LogPages, OnePageEndsAtTheLineReaching65001)
+{
+    writefile(log, lines(650) + std::string(1, 'y') + "\r\n");
+    logpages pages;
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_EQ(pages.page(), 1);
+    EXPECT_EQ(pages.text().size(), 65003);
+    EXPECT_TRUE(pages.text().endsWith(QStringLiteral("x\r\ny\r\n")));
+    EXPECT_FALSE(pages.more());
+
+    writefile(log, lines(650) + "y\r\nlast line\r\n");
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_TRUE(pages.more());
+    EXPECT_TRUE(pages.text().endsWith(QStringLiteral("y\r\n")));
+    pages.nextpage();
+    EXPECT_EQ(pages.page(), 2);
+    EXPECT_EQ(pages.text(), QStringLiteral("last line\r\n"));
+    EXPECT_FALSE(pages.more());
+}
+
+// A page under 65,001 characters takes the next line too, however long.
+TEST_F(LogPages, LongLineStaysWhole)
+{
+    writefile(log, lines(649) + std::string(5000, 'z') + "\r\nnext\r\n");
+    logpages pages;
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_EQ(pages.text().size(), 64900 + 5002);
+    EXPECT_TRUE(pages.more());
+    pages.nextpage();
+    EXPECT_EQ(pages.text(), QStringLiteral("next\r\n"));
+}
+
+TEST_F(LogPages, TrailingSpacesAndLineEnds)
+{
+    // Spaces at the end go, tabs and inner spaces stay; any line end reads as one.
+    writefile(log, "a b   \r\n\tc \nlast   ");
+    logpages pages;
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_EQ(pages.text(), QStringLiteral("a b\r\n\tc\r\nlast\r\n"));
+    EXPECT_FALSE(pages.more());
+}
+
+TEST_F(LogPages, EncodingsAndStart)
+{
+    // UTF-8 as written by the log, and an older log's Windows-1252 bytes.
+    writefile(log, "Name: Brontë, Anne\r\nPlace: Ch\xe2teau\r\n");
+    logpages pages;
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_EQ(pages.text(), QStringLiteral("Name: Brontë, Anne\r\nPlace: Château\r\n"));
+
+    writefile(log, lines(700));
+    ASSERT_TRUE(pages.open(log));
+    pages.nextpage();
+    EXPECT_EQ(pages.page(), 2);
+    EXPECT_EQ(pages.text().size(), 49 * 100);
+    EXPECT_TRUE(pages.restart());
+    EXPECT_EQ(pages.page(), 1);
+    EXPECT_EQ(pages.text().size(), 651 * 100);
+}
+
+TEST_F(LogPages, EmptyAndMissing)
+{
+    writefile(log, "");
+    logpages pages;
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_EQ(pages.page(), 1);
+    EXPECT_EQ(pages.text(), QString());
+    EXPECT_FALSE(pages.more());
+    EXPECT_FALSE(pages.open(dir.filePath(QStringLiteral("none.txt"))));
+    EXPECT_FALSE(pages.more());
+}
+
+TEST_F(LogPages, ClearLog)
+{
+    scriptedprompts asker;
+    // Missing: told, nothing created.
+    asker.expect(answer::ok, QStringLiteral("does not exist"));
+    EXPECT_FALSE(clearlog(asker, log));
+    EXPECT_FALSE(QFile::exists(log));
+    EXPECT_EQ(asker.texts().back(),
+              QStringLiteral("The file specified does not exist or does not have a valid file path"));
+    asker.expect(answer::ok, QStringLiteral("does not exist"));
+    EXPECT_FALSE(clearlog(asker, dir.path())); // a folder is no log
+
+    // No keeps it.
+    writefile(log, "entry\r\n");
+    asker.expect(answer::no, QStringLiteral("Are you sure you want to clear the log file?"));
+    EXPECT_FALSE(clearlog(asker, log));
+    EXPECT_EQ(readfile(log), "entry\r\n");
+    const message& q = asker.history().back().m;
+    EXPECT_EQ(q.title, QStringLiteral("Clear Log"));
+    EXPECT_TRUE(q.choice == buttons::yesno && q.kind == icon::exclamation && q.defaultanswer == answer::no);
+
+    // Yes empties it.
+    asker.expect(answer::yes, QStringLiteral("Are you sure"));
+    asker.expect(answer::ok, QStringLiteral("The log file has been cleared"));
+    EXPECT_TRUE(clearlog(asker, log));
+    EXPECT_TRUE(QFile::exists(log));
+    EXPECT_EQ(QFileInfo(log).size(), 0);
+    EXPECT_EQ(asker.unexpected(), 0);
+}
+
+TEST_F(LogPages, ClearLogCannotDelete)
+{
+    if (geteuid() == 0)
+        GTEST_SKIP() << "permissions do not hold for root";
+    const QString folder = dir.filePath(QStringLiteral("locked"));
+    ASSERT_TRUE(QDir().mkpath(folder));
+    const QString locked = folder + QStringLiteral("/censuslog.txt");
+    writefile(locked, "entry\r\n");
+    QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::ExeOwner);
+    scriptedprompts asker;
+    asker.expect(answer::yes, QStringLiteral("Are you sure"));
+    asker.expect(answer::ok, QStringLiteral("There was an error deleting the file."));
+    EXPECT_FALSE(clearlog(asker, locked));
+    QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
+    EXPECT_EQ(readfile(locked), "entry\r\n");
+    EXPECT_EQ(asker.texts().back(), QStringLiteral("There was an error deleting the file. The file may currently be "
+                                                   "open or you may not have permission to delete it"));
+    EXPECT_EQ(asker.unexpected(), 0);
+}

@@ -1,0 +1,303 @@
+// The Find Individual dialog: on its own over a small index (what it shows of
+// an individual and its relatives), and from the main window's Find button
+// (searches, browsing, OK and the immediate family, large files).
+#include "tools/findfrm.h"
+
+#include "model/loadgedcom.h"
+#include "support/mainfrmfixture.h"
+#include "tools/findindividual.h"
+
+#include <QCheckBox>
+#include <QListWidget>
+#include <QPushButton>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+template <class T>
+T* child(QWidget* w, const char* name)
+{
+    return w->findChild<T*>(QString::fromLatin1(name));
+}
+
+QString text(QWidget* d, const char* name)
+{
+    return child<QLineEdit>(d, name)->text();
+}
+
+QStringList items(QWidget* d, const char* name)
+{
+    QStringList out;
+    auto* l = child<QListWidget>(d, name);
+    for (int i = 0; i < l->count(); ++i)
+        out << l->item(i)->text();
+    return out;
+}
+
+void clickitem(QListWidget* l, int row)
+{
+    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(l->item(row)).center());
+}
+
+QStringList familytexts(mainfrm& w)
+{
+    QStringList out;
+    auto* m = static_cast<peoplelistmodel*>(familylist(w)->model());
+    for (int r = 0; r < m->rowCount(); ++r)
+        out << m->textat(r);
+    return out;
+}
+
+QString familycaption(mainfrm& w)
+{
+    return w.findChild<QLabel*>(QStringLiteral("immediatefamilylab"))->text();
+}
+
+QPushButton* findbut(mainfrm& w)
+{
+    return w.findChild<QPushButton*>(QStringLiteral("findbut"));
+}
+
+} // namespace
+
+class findfrm_test : public QObject {
+    Q_OBJECT
+
+private:
+    windowfiles files_;
+
+private slots:
+    void initTestCase() { QVERIFY(files_.valid()); }
+
+    // The panel of the individual shown: birth, census lines with their age
+    // and date forms, and a relative who is both parent and spouse.
+    void showsindividual()
+    {
+        const auto x = loadgedcombytes(
+            "0 HEAD\r\n1 CHAR UTF-8\r\n"
+            "0 @I1@ INDI\r\n1 NAME Ann /Lee/\r\n1 BIRT\r\n2 DATE ABT 1850\r\n2 PLAC Leeds\r\n"
+            "1 CENS\r\n2 DATE (1851)\r\n2 PLAC Leeds\r\n2 AGE 1m\r\n"
+            "1 CENS\r\n2 DATE 3 APR 1881\r\n2 PLAC York\r\n2 ADDR 4 High St\r\n2 AGE 30y\r\n"
+            "1 CENS\r\n2 DATE JUN\r\n2 PLAC Hull\r\n2 AGE 3D\r\n1 CENS\r\n2 DATE 1891\r\n2 PLAC Hull\r\n"
+            "1 FAMC @F1@\r\n1 FAMS @F1@\r\n"
+            "0 @I2@ INDI\r\n1 NAME Bob /Lee/\r\n1 FAMS @F1@\r\n"
+            "0 @I3@ INDI\r\n1 NAME Cy /Lee/\r\n1 FAMC @F1@\r\n0 TRLR\r\n",
+            flagtable{});
+        QVERIFY(x);
+        scriptedprompts asker;
+        findfrm d(*x, findlist(*x, false, {}), -1, asker);
+        d.show();
+        QCOMPARE(d.windowTitle(), QStringLiteral("Find Individual"));
+        QCOMPARE(child<QLabel>(&d, "countlab")->text(), QStringLiteral("3 individuals."));
+        QVERIFY(!child<QPushButton>(&d, "okbut")->isEnabled());
+        QVERIFY(!child<QPushButton>(&d, "IDfindbut")->isEnabled());
+        QVERIFY(!child<QCheckBox>(&d, "refocuschk")->isChecked());
+        QVERIFY(child<QLineEdit>(&d, "nametxt")->isReadOnly());
+
+        QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("lee, a"));
+        QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Ann"));
+        QCOMPARE(text(&d, "idtxt"), QStringLiteral("1"));
+        QCOMPARE(text(&d, "dobtxt"), QStringLiteral("ABT 1850"));
+        QCOMPARE(text(&d, "placetxt"), QStringLiteral("Leeds"));
+        QCOMPARE(items(&d, "censuslst"),
+                 (QStringList{"1851: aged 1 month at Leeds", "1881: aged 30 at York (4 High St)", "JUN: aged 3 days at Hull",
+                              "1891: aged ? at Hull"}));
+        // Bob is parent and spouse, never a child; Cy is a child (and a sibling).
+        QCOMPARE(items(&d, "parentlst"), QStringList{"Lee, Bob"});
+        QCOMPARE(items(&d, "spouselst"), QStringList{"Lee, Bob"});
+        QCOMPARE(items(&d, "childrenlst"), QStringList{"Lee, Cy"});
+        QVERIFY(child<QPushButton>(&d, "okbut")->isEnabled());
+
+        // Browsing to Bob; a search text that matches nothing leaves him shown.
+        clickitem(child<QListWidget>(&d, "spouselst"), 0);
+        QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
+        QCOMPARE(items(&d, "censuslst"), QStringList{"(Does not have any census events recorded)"});
+        QCOMPARE(text(&d, "dobtxt"), QString());
+        QCOMPARE(items(&d, "spouselst"), QStringList{"Lee, Ann"});
+        QCOMPARE(items(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
+        QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("x"));
+        QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
+
+        // Help, and Cancel gives nothing back.
+        QTest::mouseClick(child<QPushButton>(&d, "helpbut"), Qt::LeftButton);
+        QCOMPARE(asker.helpshown, QStringList{QStringLiteral("14")});
+        QTest::mouseClick(child<QPushButton>(&d, "Cancelbut"), Qt::LeftButton);
+        QCOMPARE(d.result(), -1);
+        QCOMPARE(asker.unexpected(), 0);
+    }
+
+    // Name search from the main window with no row yet: OK adds the individual
+    // and the family list is built around it.
+    void findbyname()
+    {
+        auto run = files_.opened(files_.sample());
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("findfrm"), [](QDialog* d) {
+            QCOMPARE(child<QLabel>(d, "countlab")->text(), QStringLiteral("40 individuals."));
+            QVERIFY(!child<QPushButton>(d, "okbut")->isEnabled());
+            QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("ASHWORTH, JOHN (3"));
+            QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
+            QCOMPARE(items(d, "censuslst").first(), QStringLiteral("1841: aged 10 at Heptonstall, Yorkshire, England (Slack)"));
+            QCOMPARE(items(d, "parentlst"), (QStringList{"Ashworth, William", "Greenwood, Hannah"}));
+            QCOMPARE(items(d, "spouselst"), QStringList{"Kershaw, Ellen"});
+            QCOMPARE(items(d, "childrenlst").size(), 6);
+            QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("x"));
+            QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
+            QTest::mouseClick(child<QPushButton>(d, "okbut"), Qt::LeftButton);
+        });
+        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QCOMPARE(dialogs.seen, QStringList{QStringLiteral("findfrm")});
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(shownnames(w), QStringList{QStringLiteral("Ashworth, John")});
+        QCOMPARE(w.household().selection.at(0).id, 3);
+        QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, John:"));
+        QVERIFY(w.watching());
+        QCOMPARE(run->prompts.unexpected(), 0);
+    }
+
+    // Opening on the last row's individual keeps OK off until the user shows
+    // one; browsing to a parent and OK with "Refocus Immediate Family" rebuilds
+    // the family list around the parent.
+    void browseandrefocus()
+    {
+        auto run = files_.opened(files_.sample());
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        clickid(w, peoplelist(w), 3);
+        typerow(w, 0, QStringLiteral("20"));
+        const QStringList johns = familytexts(w);
+
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("findfrm"), [](QDialog* d) {
+            auto* ok = child<QPushButton>(d, "okbut");
+            QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
+            QVERIFY(!ok->isEnabled());
+            auto* parents = child<QListWidget>(d, "parentlst");
+            QCOMPARE(parents->item(0)->text(), QStringLiteral("Ashworth, William"));
+            clickitem(parents, 0);
+            QCOMPARE(text(d, "idtxt"), QStringLiteral("1"));
+            QVERIFY(ok->isEnabled());
+            QCOMPARE(child<QListView>(d, "peoplelst")->currentIndex().data().toString(),
+                     QStringLiteral("Ashworth, William (ABT 1808)"));
+            child<QCheckBox>(d, "refocuschk")->setChecked(true);
+            QTest::mouseClick(ok, Qt::LeftButton);
+        });
+        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(shownnames(w), (QStringList{"Ashworth, John", "Ashworth, William"}));
+        QCOMPARE(w.household().selectioncount, 2);
+        QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, William:"));
+        QVERIFY(familytexts(w).contains(QStringLiteral("CHI Ashworth, John (3 JAN 1831)")));
+        QVERIFY(familytexts(w).contains(QStringLiteral("WED Greenwood, Hannah (BEF 1812)")));
+        QVERIFY(familytexts(w) != johns);
+
+        // Without the tick the family list stays William's; a click on the
+        // pre-selected entry itself is the user's own choice.
+        typerow(w, 1, QStringLiteral("53"));
+        dialogs.expect(QStringLiteral("findfrm"), [](QDialog* d) {
+            auto* list = child<QListView>(d, "peoplelst");
+            QCOMPARE(text(d, "idtxt"), QStringLiteral("1"));
+            QVERIFY(!child<QPushButton>(d, "okbut")->isEnabled());
+            clickrow(list, list->currentIndex().row());
+            QCOMPARE(text(d, "idtxt"), QStringLiteral("1"));
+            QVERIFY(child<QPushButton>(d, "okbut")->isEnabled());
+            auto* search = child<QLineEdit>(d, "searchnametxt");
+            QTest::keyClicks(search, QStringLiteral("greenwood"));
+            QTest::keyClick(search, Qt::Key_Return);
+        });
+        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(shownnames(w).last(), QStringLiteral("Greenwood, Hannah"));
+        QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, William:"));
+        QCOMPARE(run->prompts.unexpected(), 0);
+    }
+
+    // Record numbers: digits only; not found -> message and the button off
+    // until the number changes; found -> shown and the box emptied. Cancel
+    // adds nothing.
+    void findbyrecordnumber()
+    {
+        auto run = files_.opened(files_.sample());
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        run->prompts.expect(answer::ok, QStringLiteral("No individuals have this ID"));
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("findfrm"), [&](QDialog* d) {
+            auto* box = child<QLineEdit>(d, "IDfindtxt");
+            auto* but = child<QPushButton>(d, "IDfindbut");
+            QTest::keyClicks(box, QStringLiteral("9x9-"));
+            QCOMPARE(box->text(), QStringLiteral("99"));
+            QVERIFY(but->isEnabled());
+            QTest::mouseClick(but, Qt::LeftButton);
+            QCOMPARE(run->prompts.texts().last(), QStringLiteral("No individuals have this ID"));
+            QVERIFY(!but->isEnabled());
+            QCOMPARE(text(d, "idtxt"), QString());
+            box->clear();
+            QTest::keyClicks(box, QStringLiteral("2"));
+            QVERIFY(but->isEnabled());
+            QTest::mouseClick(but, Qt::LeftButton);
+            QCOMPARE(text(d, "nametxt"), QStringLiteral("Greenwood, Hannah"));
+            QCOMPARE(box->text(), QString());
+            QVERIFY(!but->isEnabled());
+            QTest::keyClicks(box, QStringLiteral("40"));
+            QTest::keyClick(box, Qt::Key_Return); // finds, does not press OK
+            QVERIFY(d->isVisible());
+            QCOMPARE(text(d, "nametxt"), QStringLiteral("Ashworth, Zoë"));
+            QTest::mouseClick(child<QPushButton>(d, "Cancelbut"), Qt::LeftButton);
+        });
+        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(w.household().selectioncount, 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+    }
+
+    // Above 32,000 individuals the Find list is the main window's list of
+    // those who could be alive; an individual outside it is not found by ID.
+    void largefile()
+    {
+        const QString file = files_.generated(32001);
+        if (file.isEmpty())
+            QSKIP("the family file generator did not run");
+        auto run = files_.opened(file);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        QVERIFY(!findbut(w)->isEnabled());
+        chooseyear(w, QStringLiteral("1841"));
+        QVERIFY(findbut(w)->isEnabled());
+        auto* main = static_cast<peoplelistmodel*>(peoplelist(w)->model());
+        QVERIFY(main->rowCount() > 0 && main->rowCount() < 32001);
+        std::vector<bool> listed(w.index()->people.size());
+        for (int r = 0; r < main->rowCount(); ++r)
+            listed[static_cast<size_t>(main->personat(r))] = true;
+        int32_t outside = -1;
+        for (size_t k = 0; k < listed.size() && outside < 0; ++k)
+            if (!listed[k])
+                outside = w.index()->people[k].id;
+        QVERIFY(outside > 0);
+
+        run->prompts.expect(answer::ok, QStringLiteral("No individuals have this ID"));
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("findfrm"), [&](QDialog* d) {
+            auto* list = static_cast<peoplelistmodel*>(child<QListView>(d, "peoplelst")->model());
+            QCOMPARE(list->rowCount(), main->rowCount());
+            bool same = true;
+            for (int r = 0; r < list->rowCount() && same; ++r)
+                same = list->textat(r) == main->textat(r) && list->personat(r) == main->personat(r);
+            QVERIFY(same);
+            QCOMPARE(child<QLabel>(d, "countlab")->text(), QString::number(main->rowCount()) + QStringLiteral(" individuals."));
+            QTest::keyClicks(child<QLineEdit>(d, "IDfindtxt"), QString::number(outside));
+            QTest::mouseClick(child<QPushButton>(d, "IDfindbut"), Qt::LeftButton);
+            QTest::mouseClick(child<QPushButton>(d, "Cancelbut"), Qt::LeftButton);
+        });
+        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+    }
+};
+
+QTEST_MAIN(findfrm_test)
+#include "findfrm_test.moc"
