@@ -67,6 +67,8 @@ flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts&
     countrylab_ = field("countrylab", QStringLiteral("Country"), allocate);
     flaglab_ = field("flaglab", QStringLiteral("Flag name"), allocate);
     auto* flagbut = button("flagbut", QStringLiteral("..."), QStringLiteral("Choose flag name"), allocate);
+    for (QPushButton* b : {Datebut, flagbut})
+        b->setMaximumWidth(b->fontMetrics().horizontalAdvance(QStringLiteral("....")) * 3);
     auto* censuscaption = new QLabel(QStringLiteral("&Census:"), allocate);
     censuscaption->setBuddy(Datebut);
     auto* namecaption = new QLabel(QStringLiteral("Flag &Name:"), allocate);

@@ -11,6 +11,7 @@
 
 #include <QAction>
 #include <QCheckBox>
+#include <QDir>
 #include <QFontInfo>
 #include <QListWidget>
 #include <QPushButton>
@@ -376,6 +377,54 @@ private slots:
         QCOMPARE(run->store->read(group, QStringLiteral("Date")), QStringLiteral("4 APR 1881"));
         QCOMPARE(run->store->read(group, QStringLiteral("Country")), QStringLiteral("Canada"));
         QVERIFY(!run->store->groupexists(QStringLiteral("Flags/2")));
+    }
+
+    // A flag check that rewrites the file closes Census Flags; the main window
+    // reads the file again, with the new definition from the store.
+    void flagcheckrewrites()
+    {
+        settings s = defaultsettings();
+        QDir().mkpath(files_.filepath(QStringLiteral("backups")));
+        s.backupfolder = files_.filepath(QStringLiteral("backups"));
+        s.logpath = files_.filepath(QStringLiteral("censuslog.txt"));
+        const QString file = files_.sample();
+        auto run = files_.opened(file, &s);
+        QVERIFY(run);
+        bool closed = false;
+        dialoganswers answers;
+        answers.expect(QStringLiteral("flagfrm"), [&](QDialog* d) {
+            QTimer::singleShot(0, d, [&, d] {
+                auto* f = qobject_cast<flagfrm*>(d);
+                f->setflagname(QStringLiteral("Census 1871"));
+                f->setcensus(QStringLiteral("UK"), QStringLiteral("2 APR 1871"));
+                QTest::mouseClick(child(d, "flagcheckbut"), Qt::LeftButton);
+                closed = !d->isVisible() && f->reloadneeded();
+            });
+        });
+        answers.expect(QStringLiteral("flagcheckfrm"), [](QDialog* d) {
+            QVERIFY(child<QListWidget>(d, "addlst")->count() > 0);
+            QTest::mouseClick(child(d, "Changebut"), Qt::LeftButton);
+        });
+        run->prompts.expect(answer::no, flaguseprompt());
+        run->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to set/unset flags as suggested?"));
+        run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
+        QCOMPARE(answers.unexpected, 0);
+        QCOMPARE(answers.pending(), 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QVERIFY(closed);
+        QVERIFY(run->w->watching());
+
+        QFile f(file);
+        QVERIFY(f.open(QIODevice::ReadOnly));
+        const int given = static_cast<int>(f.readAll().count("\r\n2 __CENSUS_1871 Census 1871\r\n"));
+        QVERIFY(given > 0);
+        const gedcomindex* ix = run->w->index();
+        const auto held = std::find_if(ix->flags.begin(), ix->flags.end(),
+                                       [](const flagrec& r) { return r.code == "__CENSUS_1871"; });
+        QVERIFY(held != ix->flags.end());
+        QCOMPARE(held->date, "2 APR 1871");
+        QCOMPARE(held->country, "UK");
+        QCOMPARE(held->count, given);
     }
 };
 
