@@ -1,11 +1,36 @@
 #include "app/mainfrm.h"
+#include "images/attachimagesfrm.h"
+#include "images/imagesfrm.h"
 
 namespace qm {
 
-// "Attach Images to Existing Sources...".
+// "Attach Images to Existing Sources...": the index is brought up to date
+// after each attach; the file is read again once the dialog closes.
 void mainfrm::attachimages()
 {
-    comingsoon();
+    if (!index_)
+        return;
+    bool fatal = false;
+    runtool([this, &fatal] {
+        const auto chooser = [this](const QString& title, const QString& date, QWidget* parent) {
+            imagerequest r;
+            r.context = 2;
+            r.sourcetitle = title;
+            r.imagedate = date;
+            r.sourcebase = title.trimmed();
+            r.fullentry = settings_.fullentry;
+            std::vector<imagechoice> chosen;
+            imagesfrm::choose(r, *index_, settings_, store_, prompts_, chosen, parent);
+            return chosen;
+        };
+        Attachimagesfrm d(*index_, settings_, prompts_, chooser, this);
+        d.exec();
+        fatal = d.fatal();
+        // Images attached, or the file changed outside: read it again.
+        reloadneeded_ = !fatal && (d.imagesattached() || d.filechanged());
+    });
+    if (fatal)
+        endprogram();
 }
 
 } // namespace qm
