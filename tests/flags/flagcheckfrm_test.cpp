@@ -9,6 +9,7 @@
 #include "flags/flagtable.h"
 #include "model/loadgedcom.h"
 #include "support/mainfrmfixture.h"
+#include "writer/saveroad.h"
 
 #include <QCheckBox>
 #include <QListWidget>
@@ -328,6 +329,35 @@ private slots:
         QCOMPARE(prompts.unexpected(), 0);
         QVERIFY(d.isVisible());
         QCOMPARE(d.outcome(), flagcheckend::unchanged);
+        QCOMPARE(bytesof(file), john);
+    }
+
+    // A rewrite that fails: the message, the family file as it was, and the
+    // dialog tells its caller to end the program.
+    void failedrewriteisfatal()
+    {
+        const QString file = files.filepath(QStringLiteral("fatal.ged"));
+        const QByteArray john = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 1881\r\n0 TRLR\r\n";
+        QFile f(file);
+        QVERIFY(f.open(QIODevice::WriteOnly));
+        f.write(john);
+        f.close();
+        loadresult loaded = loadgedcom(file, definitions());
+        QVERIFY(loaded.index);
+        auto store = settingsstore::onfile(files.ini());
+        scriptedprompts prompts;
+        settings s = checking();
+        flagcheckfrm d(*loaded.index, s, *store, prompts, nullptr);
+        d.show();
+        prompts.expect(answer::yes, QStringLiteral("set/unset"));
+        prompts.expect(answer::ok, QStringLiteral("program will close"));
+        setinputfaultfortests(true);
+        d.findChild<QPushButton*>(QStringLiteral("Changebut"))->click();
+        setinputfaultfortests(false);
+        QCOMPARE(prompts.unexpected(), 0);
+        QCOMPARE(prompts.history().back().m.kind, icon::critical);
+        QCOMPARE(d.outcome(), flagcheckend::fatal);
+        QVERIFY(!d.isVisible());
         QCOMPARE(bytesof(file), john);
     }
 };
