@@ -7,6 +7,7 @@
 #include "census/censustable.h"
 #include "census/validateentry.h"
 #include "flags/flagtable.h"
+#include "images/imagechoices.h"
 #include "model/dates.h"
 #include "model/loadgedcom.h"
 #include "writer/maketitle.h"
@@ -20,6 +21,7 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 
+#include <algorithm>
 #include <cstdio>
 #include <future>
 #include <optional>
@@ -37,6 +39,14 @@ struct entryperson {
     std::optional<QString> birthplace;
 };
 
+// One image of the entry file: a new image file with its title, or an
+// existing multimedia record.
+struct entryimage {
+    QString file;
+    QString title;
+    std::optional<int32_t> object;
+};
+
 // The entry file's object, read but not yet checked against the family file.
 struct entryfile {
     std::optional<int> year;
@@ -45,6 +55,7 @@ struct entryfile {
     std::optional<QString> title;
     std::optional<int32_t> source;
     std::vector<entryperson> people;
+    std::vector<entryimage> images;
 };
 
 // Line breaks as the form's text boxes give them.
@@ -161,7 +172,71 @@ bool readentry(const QByteArray& bytes, entryfile& e, QString& error)
         }
         e.people.push_back(std::move(person));
     }
+
+    const QJsonValue images = o.value(QLatin1String("images"));
+    if (!images.isUndefined() && !images.isNull() && !images.isArray()) {
+        error = QStringLiteral("\"images\" must be a list");
+        return false;
+    }
+    k = 0;
+    for (const QJsonValue& v : images.toArray()) {
+        ++k;
+        if (!v.isObject()) {
+            error = QStringLiteral("image %1 of the list must be an object").arg(k);
+            return false;
+        }
+        const QJsonObject i = v.toObject();
+        entryimage image;
+        if (i.contains(QLatin1String("object"))) {
+            if (i.contains(QLatin1String("file")) || i.contains(QLatin1String("title"))) {
+                error = QStringLiteral("image %1 of the list must have either \"object\" or \"file\"").arg(k);
+                return false;
+            }
+            if (!readnumber(i.value(QLatin1String("object")), QStringLiteral("\"object\" of image %1").arg(k), n, error))
+                return false;
+            image.object = static_cast<int32_t>(n);
+        } else {
+            if (!readtext(i, "file", image.file, error) || !readtext(i, "title", image.title, error))
+                return false;
+            if (image.file.trimmed().isEmpty()) {
+                error = QStringLiteral("image %1 of the list must have \"file\" or \"object\"").arg(k);
+                return false;
+            }
+        }
+        e.images.push_back(std::move(image));
+    }
     return true;
+}
+
+// The entry's images as the Census Images dialog would give them: new images
+// numbered by title and given the next free O numbers, existing records
+// linked. "" or why one is refused.
+QString chooseimages(const std::vector<entryimage>& images, const gedcomindex& ix, const QString& date,
+                     std::vector<imagechoice>& chosen)
+{
+    int32_t nextobjectid = firstobjectbase(ix);
+    for (const entryimage& image : images) {
+        if (image.object) {
+            const auto found = std::find_if(ix.objects.begin(), ix.objects.end(),
+                                            [&](const objectrec& o) { return o.id == *image.object; });
+            if (found == ix.objects.end())
+                return QStringLiteral("there is no multimedia record @O%1@ in the family file").arg(*image.object);
+            if (const QString refused = refuseexistingimage(found->id, chosen); !refused.isEmpty())
+                return refused;
+            addexistingimage(chosen, *found);
+            continue;
+        }
+        // A record may hold the path as given or in full: both are compared.
+        const QString path = QFileInfo(image.file.trimmed()).absoluteFilePath();
+        for (const QString& p : {image.file.trimmed(), path})
+            if (const QString refused = refusenewimage(p, chosen, ix); !refused.isEmpty())
+                return refused;
+        if (!QFileInfo(path).isFile())
+            return QStringLiteral("%1: no such image file").arg(QDir::toNativeSeparators(path));
+        const QString title = image.title.trimmed().isEmpty() ? titlefromfilename(path) : image.title.trimmed();
+        addnewimage(chosen, nextobjectid, QDir::toNativeSeparators(path), title, nexttitlenumber(chosen, title), date);
+    }
+    return QString();
 }
 
 // Removes a backup made ahead when the entry is refused before it was used.
@@ -311,6 +386,9 @@ int cliaddentry(QStringList args)
     }
 
     censusentry entry = entryfromform(form, check.entrydate);
+    error = chooseimages(e.images, ix, check.entrydate, entry.chosenimages);
+    if (!error.isEmpty())
+        return clifail(error);
     // Birth details as the birth details dialog gives them: only to individuals
     // with neither birth date nor birth place in the file.
     for (size_t k = 0; k < e.people.size(); ++k) {
@@ -335,6 +413,7 @@ int cliaddentry(QStringList args)
     result.insert(QStringLiteral("source"), entry.sourceid.toInt());
     result.insert(QStringLiteral("individuals"), static_cast<int>(entry.selection.size()));
     result.insert(QStringLiteral("log"), out.logwritten);
+    result.insert(QStringLiteral("images"), static_cast<int>(entry.chosenimages.size()));
     const QByteArray text = QJsonDocument(result).toJson(QJsonDocument::Compact) + '\n';
     std::fwrite(text.constData(), 1, static_cast<size_t>(text.size()), stdout);
     std::fflush(stdout);

@@ -1,0 +1,116 @@
+// quillmark-cli add-entry with images: new image files and existing
+// multimedia records linked to the entry's new source, and the refusals.
+#include "platform/settingsstore.h"
+#include "settings/settings.h"
+#include "support/testfiles.h"
+
+#include <QDir>
+#include <QFile>
+#include <QJsonDocument>
+#include <QJsonObject>
+#include <QProcess>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using qmtest::readfile;
+using qmtest::writefile;
+
+namespace {
+
+class CliImages : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        QDir(dir.path()).mkdir(QStringLiteral("backups"));
+        QDir(dir.path()).mkdir(QStringLiteral("scans"));
+        file = dir.filePath(QStringLiteral("sample.ged"));
+        ASSERT_TRUE(QFile::copy(qmtest::samplefile(), file));
+        QFile(file).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+        before = readfile(file);
+        ini = dir.filePath(QStringLiteral("settings.ini"));
+        qm::settings s = qm::defaultsettings();
+        s.backupfolder = dir.filePath(QStringLiteral("backups"));
+        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        qm::savesettings(*qm::settingsstore::onfile(ini), s);
+        for (const char* name : {"a.png", "b.jpg", "setup.exe"})
+            writefile(scan(name), "not really an image");
+    }
+
+    QString scan(const char* name) const { return dir.filePath(QStringLiteral("scans/") + QString::fromLatin1(name)); }
+    static std::string quoted(const QString& path) { return QJsonDocument::fromVariant(QVariantList{path}).toJson(QJsonDocument::Compact).mid(1).chopped(1).toStdString(); }
+
+    struct result {
+        int status = -1;
+        std::string out, err;
+    };
+    result addentry(const std::string& images)
+    {
+        const QString entry = dir.filePath(QStringLiteral("entry.json"));
+        writefile(entry, R"({"year": 1881, "place": "Hebden Bridge", "reference": "RG11/4426/52",
+                             "individuals": [{"id": 11, "age": "28"}], "images": )" + images + "}");
+        QProcess p;
+        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+        env.insert(QStringLiteral("XDG_DATA_HOME"), dir.path());
+        p.setProcessEnvironment(env);
+        p.start(QStringLiteral(QM_CLI_PATH), {QStringLiteral("add-entry"), file, QStringLiteral("--entry"), entry,
+                                              QStringLiteral("--settings"), ini});
+        p.waitForFinished(60000);
+        return {p.exitCode(), p.readAllStandardOutput().toStdString(), p.readAllStandardError().toStdString()};
+    }
+
+    void expectrefused(const std::string& images, const std::string& message)
+    {
+        const result r = addentry(images);
+        EXPECT_EQ(r.status, 2) << images;
+        EXPECT_EQ(r.err, "quillmark-cli: " + message + "\n") << images;
+        EXPECT_EQ(readfile(file), before);
+    }
+
+    QTemporaryDir dir;
+    QString file, ini;
+    std::string before;
+};
+
+TEST_F(CliImages, NewImagesAreNumberedAndRecordedExistingOnesLinked)
+{
+    const result r = addentry(R"([{"file": )" + quoted(scan("a.png")) + R"(, "title": "Ashworth 1881"},
+                                  {"object": 2},
+                                  {"file": )" + quoted(scan("b.jpg")) + R"(, "title": " Ashworth 1881 "}])");
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(QJsonDocument::fromJson(QByteArray::fromStdString(r.out)).object().value(QStringLiteral("images")).toInt(), 3);
+    const std::string text = readfile(file);
+    // The new source links the three in order, the new ones with their _ASID.
+    EXPECT_NE(text.find("1 OBJE @O3@\r\n2 _ASID 1\r\n1 OBJE @O2@\r\n1 OBJE @O4@\r\n2 _ASID 1\r\n"), std::string::npos);
+    const std::string native = QDir::toNativeSeparators(scan("a.png")).toStdString();
+    EXPECT_NE(text.find("0 @O3@ OBJE\r\n1 FORM png\r\n1 TITL Ashworth 1881\r\n1 _FILE " + native
+                        + "\r\n1 _DATE 3 APR 1881\r\n"),
+              std::string::npos);
+    EXPECT_NE(text.find("0 @O4@ OBJE\r\n1 FORM jpeg\r\n1 TITL Ashworth 1881\r\n"), std::string::npos);
+    // The existing record gets no second OBJE record.
+    EXPECT_EQ(text.find("0 @O2@ OBJE"), text.rfind("0 @O2@ OBJE"));
+    const std::string log = readfile(dir.filePath(QStringLiteral("censuslog.txt")));
+    EXPECT_NE(log.find("Existing image record linked to the census source: Census 1881 Hebden Bridge"), std::string::npos);
+}
+
+TEST_F(CliImages, RefusedImagesWriteNothing)
+{
+    expectrefused(R"([{"object": 9}])", "there is no multimedia record @O9@ in the family file");
+    expectrefused(R"([{"object": 1}, {"object": "1"}])",
+                  "This image has already been selected to be linked to the new census source being created and "
+                  "therefore can not be selected again.");
+    expectrefused(R"([{"file": )" + quoted(scan("setup.exe")) + "}]",
+                  "You have selected an application program rather than an image file.");
+    expectrefused(R"([{"file": "Media\\Census 1891 Hebden Bridge RG12-3622-103.JPG"}])",
+                  "This image is already loaded into Family Historian and has the title Census 1891 Hebden Bridge. Go "
+                  "back to the previous screen and select the 'Link current image' button");
+    expectrefused(R"([{"file": )" + quoted(scan("a.png")) + R"(}, {"file": )" + quoted(scan("a.png")) + "}]",
+                  "This image has already been selected to be part of this census entry");
+    expectrefused(R"([{"file": )" + quoted(scan("gone.png")) + "}]",
+                  QDir::toNativeSeparators(scan("gone.png")).toStdString() + ": no such image file");
+    expectrefused(R"([{"object": 1, "file": "x.png"}])", "image 1 of the list must have either \"object\" or \"file\"");
+    expectrefused(R"({"object": 1})", "\"images\" must be a list");
+}
+
+} // namespace
