@@ -5,6 +5,7 @@
 #include "platform/encoding.h"
 #include "settings/settings.h"
 
+#include <QCollator>
 #include <QDir>
 
 #include <algorithm>
@@ -98,17 +99,20 @@ QString countrywords(const QString& country)
     }
 }
 
-// Alphabetical order ignoring letter case; the case-folded texts are made
-// once, since a date may have hundreds of thousands of events.
+// Alphabetical order as the user's language has it, ignoring letter case
+// ("Ó Súilleabháin" among the O's); the sort keys are made once, since a date
+// may have hundreds of thousands of events.
 void sortdetails(std::vector<detailentry>& list)
 {
-    std::vector<std::pair<QString, size_t>> keys;
+    QCollator collator;
+    collator.setCaseSensitivity(Qt::CaseInsensitive);
+    std::vector<std::pair<QCollatorSortKey, size_t>> keys;
     keys.reserve(list.size());
     for (size_t k = 0; k < list.size(); ++k)
-        keys.emplace_back(list[k].text.toCaseFolded(), k);
+        keys.emplace_back(collator.sortKey(list[k].text), k);
     std::sort(keys.begin(), keys.end(), [&list](const auto& a, const auto& b) {
-        if (a.first != b.first)
-            return a.first < b.first;
+        if (const int c = a.first.compare(b.first))
+            return c < 0;
         if (list[a.second].text != list[b.second].text)
             return list[a.second].text < list[b.second].text;
         return a.second < b.second;

@@ -199,7 +199,7 @@ void Datecheckfrm::build()
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(columns, 1);
     layout->addLayout(bottom);
-    resize(1000, 640);
+    resize(1180, 660);
 
     setTabOrder(countryopt_[0], changelst_);
     setTabOrder(changelst_, currentlst_);
