@@ -1,0 +1,94 @@
+// Attach Images to Existing Sources on generated family files (folder
+// QM_BENCH_DIR, else /work/gen): the census dates of the sources, read from the
+// file each time the dialog opens, and the details of the source cited most
+// (the longest list of individuals the dialog fills).
+#include "images/sourcedates.h"
+#include "model/loadgedcom.h"
+
+#include <QFileInfo>
+
+#include <benchmark/benchmark.h>
+
+#include <cstdlib>
+#include <map>
+#include <memory>
+
+namespace {
+
+QString benchfile(const char* name)
+{
+    const char* dir = std::getenv("QM_BENCH_DIR");
+    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
+}
+
+qm::gedcomindex* indexof(const char* name)
+{
+    static std::map<std::string, std::unique_ptr<qm::gedcomindex>> loaded;
+    auto& slot = loaded[name];
+    if (!slot) {
+        const QString path = benchfile(name);
+        if (!QFileInfo(path).isFile())
+            return nullptr;
+        slot = qm::loadgedcom(path, {}).index;
+    }
+    return slot.get();
+}
+
+void censusdates(benchmark::State& state, const char* name)
+{
+    qm::gedcomindex* ix = indexof(name);
+    if (!ix) {
+        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+        return;
+    }
+    size_t known = 0;
+    for (auto _ : state) {
+        // Each opening after a load starts from sources with nothing settled.
+        state.PauseTiming();
+        for (qm::sourcerec& s : ix->sources) {
+            s.censusdate.clear();
+            s.censusdatesought = false;
+        }
+        state.ResumeTiming();
+        const QString error = qm::findcensusdates(*ix);
+        benchmark::DoNotOptimize(error);
+    }
+    for (const qm::sourcerec& s : ix->sources)
+        known += !s.censusdate.empty() && !s.censusdatesought;
+    state.SetBytesProcessed(static_cast<int64_t>(state.iterations()) * QFileInfo(benchfile(name)).size());
+    state.counters["sources"] = static_cast<double>(ix->sources.size());
+    state.counters["dated"] = static_cast<double>(known);
+}
+
+void selectsource(benchmark::State& state, const char* name)
+{
+    const qm::gedcomindex* ix = indexof(name);
+    if (!ix || ix->sources.empty()) {
+        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+        return;
+    }
+    // The census source cited first in the file stands for a busy one.
+    const int32_t id = ix->censussources.empty() ? ix->sources.front().id
+                                                 : ix->sources[static_cast<size_t>(ix->censussources.front())].id;
+    size_t rows = 0;
+    for (auto _ : state) {
+        const std::vector<int32_t> listed = qm::filtersources(*ix, qm::sourcefilter::census, {}, true);
+        const std::vector<int32_t> people = qm::citingpeople(*ix, id);
+        QStringList labels;
+        for (const int32_t k : people)
+            labels << qm::personlabel(ix->people[static_cast<size_t>(k)], false);
+        rows = listed.size() + static_cast<size_t>(labels.size());
+        benchmark::DoNotOptimize(rows);
+    }
+    state.counters["rows"] = static_cast<double>(rows);
+}
+
+} // namespace
+
+BENCHMARK_CAPTURE(censusdates, fam10000, "fam10000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(censusdates, fam100000, "fam100000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(censusdates, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(2);
+BENCHMARK_CAPTURE(selectsource, fam100000, "fam100000.ged")->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(selectsource, fam1000000, "fam1000000.ged")->Unit(benchmark::kMillisecond)->Iterations(3);
+
+BENCHMARK_MAIN();
