@@ -160,6 +160,9 @@ void findfrm::build()
     left->addWidget(peoplelst_, 1);
     left->addWidget(countlab_);
     auto* idrow = new QHBoxLayout;
+    auto* idlab = new QLabel(QStringLiteral("Record n&umber:"), this);
+    idlab->setBuddy(IDfindtxt_);
+    idrow->addWidget(idlab);
     idrow->addWidget(IDfindtxt_);
     idrow->addWidget(IDfindbut_);
     idrow->addStretch(1);
@@ -265,7 +268,11 @@ void findfrm::showperson(int32_t k)
     nametxt_->setCursorPosition(0);
     placetxt_->setCursorPosition(0);
     censuslst_->clear();
-    censuslst_->addItems(censuslines(p));
+    for (const QString& line : censuslines(p)) {
+        // Long lines are cut by the list's width: the tooltip shows them whole.
+        auto* item = new QListWidgetItem(line, censuslst_);
+        item->setToolTip(line);
+    }
 
     const relatives r = findrelatives(index_, k);
     const auto fill = [this](QListWidget* l, const std::vector<int32_t>& who) {

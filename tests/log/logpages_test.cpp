@@ -155,5 +155,12 @@ TEST_F(LogPages, ClearLogCannotDelete)
     EXPECT_EQ(readfile(locked), "entry\r\n");
     EXPECT_EQ(asker.texts().back(), QStringLiteral("There was an error deleting the file. The file may currently be "
                                                    "open or you may not have permission to delete it"));
+
+    // A read-only log in a writable folder is not forced either.
+    QFile::setPermissions(locked, QFileDevice::ReadOwner);
+    asker.expect(answer::yes, QStringLiteral("Are you sure"));
+    asker.expect(answer::ok, QStringLiteral("There was an error deleting the file."));
+    EXPECT_FALSE(clearlog(asker, locked));
+    EXPECT_EQ(readfile(locked), "entry\r\n");
     EXPECT_EQ(asker.unexpected(), 0);
 }
