@@ -120,6 +120,14 @@ private slots:
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("x"));
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
 
+        // By keyboard: Enter on a relative browses to it and does not close.
+        auto* children = child<QListWidget>(&d, "childrenlst");
+        children->setFocus();
+        children->setCurrentRow(0);
+        QTest::keyClick(children, Qt::Key_Return);
+        QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Cy"));
+        QVERIFY(d.isVisible());
+
         // Help, and Cancel gives nothing back.
         QTest::mouseClick(child<QPushButton>(&d, "helpbut"), Qt::LeftButton);
         QCOMPARE(asker.helpshown, QStringList{QStringLiteral("14")});
