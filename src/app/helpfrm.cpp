@@ -9,6 +9,7 @@
 #include <QListWidget>
 #include <QPushButton>
 #include <QScreen>
+#include <QShortcut>
 #include <QSplitter>
 #include <QTextBrowser>
 #include <QTextDocument>
@@ -130,6 +131,12 @@ helpfrm::helpfrm(QWidget* home) : QWidget(home, Qt::Window), home_(home), owner_
     connect(gobut, &QPushButton::clicked, this, [this] { search(searchtxt_->text()); });
     connect(resultlst_, &QListWidget::itemActivated, this, &helpfrm::resultchosen);
     connect(resultlst_, &QListWidget::itemClicked, this, &helpfrm::resultchosen);
+
+    // Alt+Left and Alt+Right (the platform's Back and Forward keys) anywhere in
+    // the window; Escape closes it.
+    connect(new QShortcut(QKeySequence::Back, this), &QShortcut::activated, helptxt_, &QTextBrowser::backward);
+    connect(new QShortcut(QKeySequence::Forward, this), &QShortcut::activated, helptxt_, &QTextBrowser::forward);
+    connect(new QShortcut(QKeySequence(Qt::Key_Escape), this), &QShortcut::activated, this, &QWidget::close);
 
     const QSize screen = QApplication::primaryScreen() ? QApplication::primaryScreen()->availableSize() : QSize(1024, 768);
     resize(std::min(screen.width() * 2 / 3, 1000), std::min(screen.height() * 3 / 4, 760));

@@ -99,6 +99,15 @@ private slots:
         QCOMPARE(h.currentpage(), QStringLiteral("index.html"));
         button(&h, "homebut")->click();
         QCOMPARE(h.currentpage(), QStringLiteral("main-window.html"));
+        h.show();
+        h.activateWindow();
+        QTRY_VERIFY(h.isActiveWindow());
+        QTest::keyClick(&h, Qt::Key_Left, Qt::AltModifier);
+        QCOMPARE(h.currentpage(), QStringLiteral("index.html"));
+        QTest::keyClick(&h, Qt::Key_Right, Qt::AltModifier);
+        QCOMPARE(h.currentpage(), QStringLiteral("main-window.html"));
+        QTest::keyClick(&h, Qt::Key_Escape);
+        QVERIFY(!h.isVisible());
         // A link followed inside the page.
         auto* browser = h.findChild<QTextBrowser*>(QStringLiteral("helptxt"));
         browser->setSource(QUrl(QStringLiteral("options.html#titletemplate")));
