@@ -40,8 +40,9 @@ int candidateof(const flagtable& flags, const std::vector<size_t>& candidates, s
 
 class checker {
 public:
-    checker(gedcomindex& index, bool interactive, const QString& country, const countryasker& ask)
-        : x_(index), interactive_(interactive), country_(country), ask_(ask)
+    // `learn` is the index whose places learn countries; null in silent mode.
+    checker(const gedcomindex& index, gedcomindex* learn, const QString& country, const countryasker& ask)
+        : x_(index), learn_(learn), interactive_(learn != nullptr), country_(country), ask_(ask)
     {
     }
 
@@ -153,14 +154,15 @@ private:
         if (a.chosen < 0 || a.chosen >= static_cast<int>(candidates.size()))
             return -1;
         if (a.always && at >= 0)
-            x_.places[static_cast<size_t>(at)].country = x_.flags[candidates[static_cast<size_t>(a.chosen)]].country;
+            learn_->places[static_cast<size_t>(at)].country = x_.flags[candidates[static_cast<size_t>(a.chosen)]].country;
         return a.chosen;
     }
 
-    gedcomindex& x_;
+    const gedcomindex& x_;
+    gedcomindex* learn_;
     bool interactive_;
     QString country_;
-    const countryasker& ask_;
+    countryasker ask_;
     flagcheckresult r_;
 };
 
@@ -191,13 +193,12 @@ QStringList flagcheckresult::removelist() const
 
 flagcheckresult checkflags(gedcomindex& index, bool interactive, const QString& country, const countryasker& ask)
 {
-    return checker(index, interactive, country, ask).run();
+    return checker(index, interactive ? &index : nullptr, country, ask).run();
 }
 
 bool flagsoutofstep(const gedcomindex& index)
 {
-    // Silent mode asks nothing and changes nothing.
-    return checkflags(const_cast<gedcomindex&>(index), false, QString()).outofstep;
+    return checker(index, nullptr, QString(), {}).run().outofstep;
 }
 
 QString flagcheckcancelledmessage()
