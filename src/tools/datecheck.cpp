@@ -104,7 +104,9 @@ QString countrywords(const QString& country)
 // may have hundreds of thousands of events.
 void sortdetails(std::vector<detailentry>& list)
 {
-    QCollator collator;
+    // The C locale compares code points, letter case included: English order instead.
+    const QLocale locale = QLocale().language() == QLocale::C ? QLocale(QLocale::English) : QLocale();
+    QCollator collator(locale);
     collator.setCaseSensitivity(Qt::CaseInsensitive);
     std::vector<std::pair<QCollatorSortKey, size_t>> keys;
     keys.reserve(list.size());

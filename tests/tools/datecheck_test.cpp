@@ -237,30 +237,34 @@ TEST(DateCheck, EditsAndTheirUndoingByChoosingTheCountryAgain)
 
 TEST(DateCheck, Details)
 {
-    const std::string file = "0 HEAD\r\n"
+    const std::string file = "0 HEAD\r\n1 CHAR UTF-8\r\n"
                              "0 @I1@ INDI\r\n1 NAME Zoe /Adams/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n2 AGE 3\r\n"
                              "0 @I2@ INDI\r\n1 NAME Al /Brown/\r\n1 CENS\r\n2 DATE 1851\r\n2 AGE 40\r\n"
                              "1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n"
                              "1 CENS\r\n2 DATE 1861\r\n2 PLAC Hull\r\n"
                              "0 @I3@ INDI\r\n1 NAME Cy /Adams/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC bath\r\n2 AGE 7\r\n"
+                             "0 @I4@ INDI\r\n1 NAME Ed /\xC3\x93 Neill/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC \xC3\x93mey\r\n"
                              "0 TRLR\r\n";
     auto ix = load(file);
     datecheckstate s(*ix, dateorder::dmy);
     s.choosecountry(QStringLiteral("UK"));
     const auto people = s.details(0, false);
-    ASSERT_EQ(people.size(), 4u);
+    ASSERT_EQ(people.size(), 5u);
     const QString name1 = qs(ix->people[0].name), name2 = qs(ix->people[1].name), name3 = qs(ix->people[2].name);
     EXPECT_EQ(people[0].text, name3 + QStringLiteral(" 7 bath"));
     EXPECT_EQ(people[0].person, 2);
     EXPECT_EQ(people[1].text, name1 + QStringLiteral(" 3 York"));
     EXPECT_EQ(people[2].text, name2 + QStringLiteral("  York")); // no age
     EXPECT_EQ(people[3].text, name2 + QStringLiteral(" 40 <no place recorded>"));
+    EXPECT_EQ(people[4].person, 3);
 
     const auto places = s.details(0, true);
-    ASSERT_EQ(places.size(), 3u);
+    ASSERT_EQ(places.size(), 4u);
     EXPECT_EQ(places[0].text, QStringLiteral("<no place recorded> (in 1 census events)"));
     EXPECT_EQ(places[1].text, QStringLiteral("bath (in 1 census events)"));
-    EXPECT_EQ(places[2].text, QStringLiteral("York (in 2 census events)"));
+    // Letters with accents among their plain letters, not after Z.
+    EXPECT_EQ(places[2].text, QString::fromUtf8("\xC3\x93mey (in 1 census events)"));
+    EXPECT_EQ(places[3].text, QStringLiteral("York (in 2 census events)"));
     EXPECT_TRUE(s.details(9, true).empty());
 }
 
