@@ -151,6 +151,8 @@ int cliattachimages(QStringList args)
                 return clifail(QStringLiteral("there is no multimedia record @O%1@ in %2")
                                    .arg(w.objectid)
                                    .arg(QDir::toNativeSeparators(path)));
+            if (std::find(source.objectids.begin(), source.objectids.end(), w.objectid) != source.objectids.end())
+                return clifail(QStringLiteral("@O%1@ is already attached to the source @S%2@").arg(w.objectid).arg(sourceid));
             error = refuseexistingimage(w.objectid, chosen);
             if (!error.isEmpty())
                 return clifail(QStringLiteral("@O%1@: %2").arg(w.objectid).arg(error));

@@ -67,7 +67,7 @@ void Attachimagesfrm::build()
     sourcelst_ = named(new QListWidget(sourcesframe), "sourcelst", QStringLiteral("Sources"));
     sourcelst_->setMinimumWidth(320);
     const std::array<QString, 3> captions = {QStringLiteral("Show &all"), QStringLiteral("Show &census sources"),
-                                             QStringLiteral("Show sources that contain &text: ")};
+                                             QStringLiteral("Show sources that contain te&xt: ")};
     for (size_t i = 0; i < captions.size(); ++i) {
         auto* o = new QRadioButton(captions[i], sourcesframe);
         o->setObjectName(QStringLiteral("sourceopt%1").arg(i));
@@ -125,7 +125,7 @@ void Attachimagesfrm::build()
         ++row;
     };
     add(QStringLiteral("Source &Title:"), titletxt_);
-    add(QStringLiteral("&Date:"), Datetxt_);
+    add(QStringLiteral("Dat&e:"), Datetxt_);
     add(QStringLiteral("Source I&D:"), indextxt_);
     auto* imagecaption = new QLabel(QStringLiteral("Attached I&mages:"), selectedframe);
     imagecaption->setBuddy(imagelst_);
@@ -146,8 +146,8 @@ void Attachimagesfrm::build()
     helpbut->setAutoDefault(false);
 
     auto* frames = new QHBoxLayout;
-    frames->addWidget(sourcesframe, 1);
-    frames->addWidget(selectedframe, 1);
+    frames->addWidget(sourcesframe, 3);
+    frames->addWidget(selectedframe, 2);
     auto* buttons = new QHBoxLayout;
     buttons->addStretch(1);
     buttons->addWidget(okbut);
@@ -155,7 +155,7 @@ void Attachimagesfrm::build()
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(frames, 1);
     layout->addLayout(buttons);
-    resize(860, 540);
+    resize(980, 560);
 
     setTabOrder(sourcelst_, sourceopt_[0]);
     setTabOrder(sourceopt_[0], sourceopt_[1]);
@@ -277,8 +277,11 @@ void Attachimagesfrm::attach()
         closeonchange();
         return;
     }
-    const std::vector<imagechoice> chosen = chooser_ ? chooser_(titletxt_->text(), Datetxt_->text(), this)
-                                                     : std::vector<imagechoice>();
+    std::vector<imagechoice> chosen = chooser_ ? chooser_(titletxt_->text(), Datetxt_->text(), this)
+                                               : std::vector<imagechoice>();
+    const std::vector<imagechoice> dropped = dropalreadylinked(index_.sources[static_cast<size_t>(source_)], chosen);
+    if (!dropped.empty())
+        prompts_.tell(alreadylinkedmessage(dropped), icon::information);
     if (chosen.empty())
         return;
     // The user may have spent some time choosing: look again.

@@ -201,6 +201,32 @@ std::vector<int32_t> citingpeople(const gedcomindex& index, int32_t sourceid)
     return out;
 }
 
+std::vector<imagechoice> dropalreadylinked(const sourcerec& source, std::vector<imagechoice>& chosen)
+{
+    std::vector<imagechoice> dropped;
+    std::erase_if(chosen, [&](const imagechoice& c) {
+        const bool linked =
+            !c.isnew && std::find(source.objectids.begin(), source.objectids.end(), c.objectid) != source.objectids.end();
+        if (linked)
+            dropped.push_back(c);
+        return linked;
+    });
+    return dropped;
+}
+
+QString alreadylinkedmessage(const std::vector<imagechoice>& dropped)
+{
+    QStringList names;
+    for (const imagechoice& c : dropped)
+        names << QStringLiteral("'%1' (ID: %2)").arg(c.title).arg(c.objectid);
+    if (names.isEmpty())
+        return QString();
+    return (names.size() == 1 ? QStringLiteral("The image ") + names.front()
+                                    + QStringLiteral(" is already attached to this source, so it is not attached again.")
+                              : QStringLiteral("The images ") + names.join(QStringLiteral(", "))
+                                    + QStringLiteral(" are already attached to this source, so they are not attached again."));
+}
+
 void recordattached(gedcomindex& index, int32_t sourcepos, const std::vector<imagechoice>& chosen,
                     const filestamp& newstamp)
 {

@@ -52,6 +52,12 @@ QStringList attachedimagetitles(const gedcomindex& index, const sourcerec& sourc
 // number, each once, in people order.
 std::vector<int32_t> citingpeople(const gedcomindex& index, int32_t sourceid);
 
+// Takes out of `chosen` the existing images already linked to the source (a
+// second link would only show the image twice) and returns them.
+std::vector<imagechoice> dropalreadylinked(const sourcerec& source, std::vector<imagechoice>& chosen);
+// "The image ... is already attached to this source ..." for those images.
+QString alreadylinkedmessage(const std::vector<imagechoice>& dropped);
+
 // After images were attached to sources[sourcepos] and the file rewritten:
 // the new multimedia records are added to `objects`, every image chosen is
 // linked to the source, the highest object number is raised past the new

@@ -145,6 +145,8 @@ TEST_F(CliAttachImages, RefusalsWriteNothing)
                   "You have selected an application program rather than an image file.");
     expectrefused({src, QStringLiteral("1"), img, file},
                   "You have selected a GEDCOM family history file rather than an image file.");
+    expectrefused({src, QStringLiteral("2"), QStringLiteral("--object"), QStringLiteral("5")},
+                  "@O5@ is already attached to the source @S2@");
     expectrefused({src, QStringLiteral("1")}, "attach-images needs");
     expectrefused({src, QStringLiteral("X1"), img, page1}, "--source needs");
     expectrefused({src, QStringLiteral("1"), img}, "--image needs a value");

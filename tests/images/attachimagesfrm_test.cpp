@@ -263,6 +263,35 @@ private slots:
         QVERIFY(x.index->sources[0].objectids == (std::vector<int32_t>{4, 2}));
     }
 
+    // An existing image already linked to the source is left out with a word
+    // to the user; with nothing else chosen nothing is written.
+    void alreadylinked()
+    {
+        loaded x = sample();
+        const settings s = testsettings();
+        scriptedprompts p;
+        int calls = 0;
+        const auto onlyo2 = [&](const QString&, const QString&, QWidget*) {
+            ++calls;
+            std::vector<imagechoice> chosen;
+            addexistingimage(chosen, x.index->objects[1]);
+            return chosen;
+        };
+        Attachimagesfrm d(*x.index, s, p, onlyo2);
+        d.show();
+        QVERIFY(pick(child<QListWidget>(d, "sourcelst"), QStringLiteral("Census 1881 Hebden Bridge")));
+        const std::string before = readfile(x.file);
+        p.expect(answer::ok, QStringLiteral("The image 'Census 1881 Hebden Bridge' (ID: 2) is already attached to this "
+                                            "source, so it is not attached again."));
+        child<QPushButton>(d, "attachbut")->click();
+        QCOMPARE(calls, 1);
+        QCOMPARE(p.unexpected(), 0);
+        QVERIFY(d.isVisible());
+        QVERIFY(!d.imagesattached());
+        QCOMPARE(readfile(x.file), before);
+        QVERIFY(backups(s).isEmpty());
+    }
+
     // Changed by another program before the images are chosen, or while they
     // are: nothing is written and the dialog closes.
     void outsidechange()

@@ -176,6 +176,26 @@ TEST(SourceDates, AttachingBringsTheIndexUpToDate)
     EXPECT_EQ(filtersources(ix, sourcefilter::census, {}, true), (std::vector<int32_t>{}));
 }
 
+TEST(SourceDates, ImagesAlreadyLinkedAreLeftOut)
+{
+    const indexed x = withdates(person(1, event("CENS", "3 APR 1881", 2)));
+    const sourcerec& york = x.source(2); // linked to O1
+    imagechoice fresh{1, QStringLiteral("png"), QStringLiteral("New"), QStringLiteral("new.png"), {}, true, 1};
+    imagechoice page{1, QStringLiteral("jpg"), QStringLiteral("York page"), QStringLiteral("york.jpg"), {}, false, 0};
+    std::vector<imagechoice> chosen{fresh, page};
+    const std::vector<imagechoice> dropped = dropalreadylinked(york, chosen);
+    ASSERT_EQ(chosen.size(), 1u);
+    EXPECT_TRUE(chosen[0].isnew);
+    ASSERT_EQ(dropped.size(), 1u);
+    EXPECT_EQ(alreadylinkedmessage(dropped),
+              "The image 'York page' (ID: 1) is already attached to this source, so it is not attached again.");
+    EXPECT_EQ(alreadylinkedmessage({}), "");
+    // Another source takes it.
+    std::vector<imagechoice> other{page};
+    EXPECT_TRUE(dropalreadylinked(x.source(1), other).empty());
+    EXPECT_EQ(other.size(), 1u);
+}
+
 TEST(SourceDates, ChangedFileMessage)
 {
     EXPECT_EQ(attachchangedmessage(QStringLiteral("family.ged")),
