@@ -6,6 +6,7 @@
 #include "tools/datecheckfrm.h"
 
 #include "platform/clock.h"
+#include "writer/saveroad.h"
 #include "support/mainfrmfixture.h"
 
 #include <QAction>
@@ -289,6 +290,80 @@ private slots:
         QVERIFY(f.open(QIODevice::ReadOnly));
         QCOMPARE(f.readAll(), changed);
         QCOMPARE(qs(w.index()->people[0].census[0].date), QStringLiteral("ABT 1842"));
+    }
+
+    // No backup: the message, and the dialog stays with its edits; with the
+    // folder back, the changes are made.
+    void backupfailedstays()
+    {
+        const QString file = family();
+        QVERIFY(!file.isEmpty());
+        settings s = testsettings();
+        s.backupfolder = files.filepath(QStringLiteral("backups-gone"));
+        QVERIFY(QDir().mkpath(s.backupfolder));
+        auto run = files.opened(file, &s);
+        QVERIFY(run);
+
+        dialoganswers dialogs;
+        bool done = false;
+        dialogs.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
+            done = true;
+            clickentry(d, "changelst", 0);
+            click(d, QStringLiteral("suggestopt1"));
+            click(d, QStringLiteral("OKbut"));
+            QVERIFY(QDir(s.backupfolder).removeRecursively());
+            run->prompts.expect(answer::yes, QStringLiteral("Are you sure"));
+            run->prompts.expect(answer::ok, QStringLiteral("There was an error when attempting to back up"));
+            control<QPushButton>(d, QStringLiteral("changebut"))->click();
+            QCOMPARE(run->prompts.unexpected(), 0);
+            QVERIFY(d->isVisible());
+            QVERIFY(rows(d, "changelst")[0].endsWith(QStringLiteral("[User has requested Quillmark not to replace this date]")));
+
+            QVERIFY(QDir().mkpath(s.backupfolder));
+            run->prompts.expect(answer::yes, QStringLiteral("Are you sure"));
+            control<QPushButton>(d, QStringLiteral("changebut"))->click();
+        });
+        opendatecheck(*run->w);
+        QTRY_VERIFY(done);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        const QStringList lines = filelines(file);
+        QCOMPARE(lines[22], QStringLiteral("2 DATE ABT 1841"));
+        QCOMPARE(lines[36], QStringLiteral("2 DATE 7 APR 1861"));
+        QCOMPARE(QDir(s.backupfolder).entryList(QDir::Files).size(), 1);
+    }
+
+    // A rewrite that fails: its message, the file as it was, and the program ends.
+    void rewritefailedends()
+    {
+        const QString file = family();
+        QVERIFY(!file.isEmpty());
+        const settings s = testsettings();
+        auto run = files.opened(file, &s);
+        QVERIFY(run);
+        QFile f(file);
+        QVERIFY(f.open(QIODevice::ReadOnly));
+        const QByteArray before = f.readAll();
+        f.close();
+
+        dialoganswers dialogs;
+        bool done = false;
+        dialogs.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
+            done = true;
+            setinputfaultfortests(true);
+            run->prompts.expect(answer::yes, QStringLiteral("Are you sure"));
+            run->prompts.expect(answer::ok, QStringLiteral("An error occurred"));
+            control<QPushButton>(d, QStringLiteral("changebut"))->click();
+        });
+        opendatecheck(*run->w);
+        setinputfaultfortests(false);
+        QTRY_VERIFY(done);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QCOMPARE(run->prompts.history().back().m.kind, icon::critical);
+        QVERIFY(!run->w->isVisible());
+        QVERIFY(f.open(QIODevice::ReadOnly));
+        QCOMPARE(f.readAll(), before);
     }
 };
 
