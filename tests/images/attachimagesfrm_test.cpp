@@ -9,6 +9,7 @@
 #include "model/loadgedcom.h"
 #include "platform/scriptedprompts.h"
 #include "settings/settings.h"
+#include "writer/saveroad.h"
 #include "support/mainfrmfixture.h"
 #include "support/testfiles.h"
 
@@ -261,6 +262,31 @@ private slots:
         QVERIFY(now.find("1 OBJE @O4@\r\n2 _ASID 1\r\n1 OBJE @O2@\r\n") != std::string::npos);
         QCOMPARE(backups(s).size(), 2);
         QVERIFY(x.index->sources[0].objectids == (std::vector<int32_t>{4, 2}));
+    }
+
+    // A rewrite that fails: its message, the file as it was, and the dialog
+    // closes for the program to end.
+    void rewritefails()
+    {
+        loaded x = sample();
+        const settings s = testsettings();
+        scriptedprompts p;
+        int calls = 0;
+        Attachimagesfrm d(*x.index, s, p, fakechooser(*x.index, png("page.png"), &calls));
+        d.show();
+        QVERIFY(pick(child<QListWidget>(d, "sourcelst"), s5));
+        const std::string before = readfile(x.file);
+        p.expect(answer::ok, QStringLiteral("An error occurred"));
+        setinputfaultfortests(true);
+        child<QPushButton>(d, "attachbut")->click();
+        setinputfaultfortests(false);
+        QCOMPARE(p.unexpected(), 0);
+        QCOMPARE(p.history().back().m.kind, icon::critical);
+        QVERIFY(d.fatal());
+        QVERIFY(!d.isVisible());
+        QVERIFY(!d.imagesattached());
+        QCOMPARE(readfile(x.file), before);
+        QVERIFY(x.index->sources[4].objectids.empty());
     }
 
     // An existing image already linked to the source is left out with a word
