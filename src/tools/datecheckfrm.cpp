@@ -155,7 +155,7 @@ void Datecheckfrm::build()
     auto* details = new QVBoxLayout(detailsframe_);
     auto* peoplegroup = new QButtonGroup(this);
     const std::array<QString, 2> peopletexts = {
-        QStringLiteral("Show all &Individuals with census events for the selected date"),
+        QStringLiteral("Show all Indi&viduals with census events for the selected date"),
         QStringLiteral("Show all &places mentioned in census events with the selected date")};
     for (int i = 0; i < 2; ++i) {
         auto* o = named(new QRadioButton(peopletexts[static_cast<size_t>(i)], detailsframe_),
