@@ -8,7 +8,8 @@ namespace qm {
 // after each attach; the file is read again once the dialog closes.
 void mainfrm::attachimages()
 {
-    if (!index_)
+    // Nothing to attach to while no family file could be read.
+    if (!index_ || index_->gedcomfile.isEmpty())
         return;
     bool fatal = false;
     runtool([this, &fatal] {
