@@ -52,6 +52,16 @@ const std::vector<QDate>& rowdays()
     return days;
 }
 
+// The date of a census event as the rewrite reads it: without the spaces and
+// tabs that may end its line, so that every date listed can be replaced.
+std::string_view eventdate(const censusrec& c)
+{
+    std::string_view d = c.date;
+    while (!d.empty() && (d.back() == ' ' || d.back() == '\t'))
+        d.remove_suffix(1);
+    return d;
+}
+
 // The row after `row`, round from the last to the first.
 int nextrow(int row)
 {
@@ -174,17 +184,18 @@ std::vector<datechange> analysecensusdates(const gedcomindex& index, const QStri
     std::unordered_map<std::string_view, size_t> seen;
     for (const personrec& p : index.people) {
         for (const censusrec& c : p.census) {
-            if (c.date.empty())
+            const std::string_view date = eventdate(c);
+            if (date.empty())
                 continue;
-            const auto [it, added] = seen.try_emplace(c.date, out.size());
+            const auto [it, added] = seen.try_emplace(date, out.size());
             if (!added) {
                 ++out[it->second].count;
                 continue;
             }
             datechange d;
-            d.founddate = qs(c.date);
+            d.founddate = qs(date);
             d.count = 1;
-            d.censusrow = officialrow(c.date, range.first);
+            d.censusrow = officialrow(date, range.first);
             d.datekind = d.censusrow == noproposal ? 0 : range.contains(d.censusrow) ? 1 : 2;
             out.push_back(std::move(d));
         }
@@ -295,7 +306,7 @@ std::vector<detailentry> datedetails(const gedcomindex& index, const QString& fo
         for (size_t k = 0; k < index.people.size(); ++k) {
             const personrec& p = index.people[k];
             for (const censusrec& c : p.census)
-                if (c.date == date)
+                if (eventdate(c) == date)
                     out.push_back({qs(p.name) + QLatin1Char(' ') + qs(c.age) + QLatin1Char(' ')
                                        + (c.place.empty() ? noplace : qs(c.place)),
                                    static_cast<int32_t>(k)});
@@ -305,7 +316,7 @@ std::vector<detailentry> datedetails(const gedcomindex& index, const QString& fo
         std::unordered_map<std::string_view, size_t> at;
         for (const personrec& p : index.people)
             for (const censusrec& c : p.census)
-                if (c.date == date) {
+                if (eventdate(c) == date) {
                     const auto [it, added] = at.try_emplace(c.place, counted.size());
                     if (added)
                         counted.emplace_back(c.place, 0);

@@ -52,7 +52,8 @@ QString othercountrycaption(const QString& country);
 
 // Every distinct census event date with its count and the census whose
 // official day it is (searched from the country's first row, wrapping round),
-// before any proposal. Events without a date are left out.
+// before any proposal. A date is read without the spaces that may end its
+// line (the rewrite reads it so); events without a date are left out.
 std::vector<datechange> analysecensusdates(const gedcomindex& index, const QString& country);
 
 // The day a proposal is measured from: the date itself when it is a calendar

@@ -128,12 +128,17 @@ TEST(DateCheck, SortsDatesIntoKindsAndCountsThem)
     EXPECT_EQ(entry(usa, "30 MAR 1851")->datekind, 2);
 }
 
-TEST(DateCheck, EventsWithoutADateAreLeftOut)
+TEST(DateCheck, EventsWithoutADateAreLeftOutAndLineEndSpacesIgnored)
 {
-    auto ix = load("0 HEAD\r\n0 @I1@ INDI\r\n1 CENS\r\n2 PLAC Leeds\r\n1 CENS\r\n2 DATE 1881\r\n0 TRLR\r\n");
+    auto ix = load("0 HEAD\r\n0 @I1@ INDI\r\n1 CENS\r\n2 PLAC Leeds\r\n1 CENS\r\n2 DATE 1881\r\n"
+                   "1 CENS\r\n2 DATE 1881 \t\r\n1 CENS\r\n2 DATE 3 APR 1881 \r\n1 CENS\r\n2 DATE  \r\n0 TRLR\r\n");
     const auto changes = analysecensusdates(*ix, QStringLiteral("UK"));
-    ASSERT_EQ(changes.size(), 1u);
+    ASSERT_EQ(changes.size(), 2u);
     EXPECT_EQ(changes[0].founddate, QStringLiteral("1881"));
+    EXPECT_EQ(changes[0].count, 2);
+    EXPECT_EQ(changes[1].founddate, QStringLiteral("3 APR 1881"));
+    EXPECT_EQ(changes[1].datekind, 1);
+    EXPECT_EQ(datedetails(*ix, QStringLiteral("1881"), false).size(), 2u);
 }
 
 TEST(DateCheck, ProposesTheNearestCensus)
@@ -284,6 +289,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
                       "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
                       "1 CENS\r\n2 DATE ABT 1650\r\n"
                       "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
+                      "0 @I3@ INDI\r\n1 CENS\r\n2 DATE ABT 1851 \r\n"
                       "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
     loadresult r = loadgedcom(path, flagtable{});
     ASSERT_TRUE(r.index);
@@ -300,7 +306,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
     const saveoutcome out = makedatechanges(*r.index, s, st.changes());
     setclockfortests(QDateTime());
     ASSERT_TRUE(out.saved()) << out.message.toStdString();
-    EXPECT_EQ(out.rewrite.censusdateschanged, 1);
+    EXPECT_EQ(out.rewrite.censusdateschanged, 2); // one line ended with a space
     EXPECT_EQ(out.rewrite.occdateschanged, 1);
     EXPECT_TRUE(QFile::exists(out.backuppath));
     EXPECT_EQ(qmtest::readfile(path),
@@ -313,9 +319,11 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
               "1 CENS\r\n2 DATE ABT 1650\r\n"
               "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
               "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
+              "0 @I3@ INDI\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
+              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
               "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
     const std::string log = qmtest::readfile(s.logpath);
-    EXPECT_NE(log.find("Changed 1 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
+    EXPECT_NE(log.find("Changed 2 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
     EXPECT_EQ(log.find("1881"), std::string::npos) << log;
 
     // A file changed since it was read is left alone, with the check's own message.
