@@ -91,7 +91,10 @@ aboutfrm::aboutfrm(prompts& asker, QWidget* parent, systemlookup machine, starte
     layout->addWidget(disclaimer);
     layout->addStretch(1);
     layout->addWidget(buttons);
-    setMinimumWidth(fontMetrics().averageCharWidth() * 70);
+    const int width = fontMetrics().averageCharWidth() * 70;
+    setMinimumWidth(width);
+    // Wrapped labels: the height that the text needs at that width, no more.
+    resize(width, layout->heightForWidth(width));
     ok->setFocus();
 }
 
