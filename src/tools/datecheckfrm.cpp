@@ -283,6 +283,8 @@ void Datecheckfrm::listselected(QListWidget* list)
 
 void Datecheckfrm::showdetails()
 {
+    // A common date of a big file has hundreds of thousands of events.
+    busycursor busy(prompts_);
     details_ = state_.details(selected_, peopleopt_[1]->isChecked());
     QStringList texts;
     texts.reserve(static_cast<qsizetype>(details_.size()));
