@@ -66,6 +66,8 @@ void Attachimagesfrm::build()
     auto* sourcesframe = named(new QGroupBox(QStringLiteral("Sources"), this), "sourcesframe", QStringLiteral("Sources"));
     sourcelst_ = named(new QListWidget(sourcesframe), "sourcelst", QStringLiteral("Sources"));
     sourcelst_->setMinimumWidth(320);
+    // Big files have tens of thousands of sources: rows of one height fill fast.
+    sourcelst_->setUniformItemSizes(true);
     const std::array<QString, 3> captions = {QStringLiteral("Show &all"), QStringLiteral("Show &census sources"),
                                              QStringLiteral("Show sources that contain te&xt: ")};
     for (size_t i = 0; i < captions.size(); ++i) {
@@ -110,6 +112,7 @@ void Attachimagesfrm::build()
     imagelst_ = named(new QListWidget(selectedframe), "imagelst", QStringLiteral("Attached Images"));
     individualslst_ = named(new QListWidget(selectedframe), "individualslst",
                             QStringLiteral("Individuals linked to this source"));
+    individualslst_->setUniformItemSizes(true);
     attachbut_ = named(new QPushButton(QStringLiteral("Attach &images to this source"), selectedframe), "attachbut",
                        QStringLiteral("Attach images to this source"));
     attachbut_->setAutoDefault(false);
@@ -204,14 +207,16 @@ void Attachimagesfrm::fill()
         filter = sourcefilter::all;
     else if (sourceopt_[2]->isChecked())
         filter = sourcefilter::text;
-    const std::vector<int32_t> listed = filtersources(index_, filter, searchtxt_->text(), imagecountchk_->isChecked());
+    listed_ = filtersources(index_, filter, searchtxt_->text(), imagecountchk_->isChecked());
+    // All rows in one go: a list of a big file's sources fills in a moment.
+    QStringList titles;
+    titles.reserve(static_cast<qsizetype>(listed_.size()));
+    for (const int32_t k : listed_)
+        titles << qs(index_.sources[static_cast<size_t>(k)].title);
     const QSignalBlocker block(sourcelst_);
     sourcelst_->clear();
-    for (const int32_t k : listed) {
-        auto* item = new QListWidgetItem(qs(index_.sources[static_cast<size_t>(k)].title), sourcelst_);
-        item->setData(Qt::UserRole, k);
-    }
-    countlab_->setText(sourcecounttext(listed.size()));
+    sourcelst_->addItems(titles);
+    countlab_->setText(sourcecounttext(listed_.size()));
 }
 
 void Attachimagesfrm::optionchosen(int option)
@@ -235,9 +240,10 @@ void Attachimagesfrm::searchedited(const QString& text)
 void Attachimagesfrm::sourcechosen()
 {
     const QList<QListWidgetItem*> items = sourcelst_->selectedItems();
-    if (items.isEmpty())
+    const int row = items.isEmpty() ? -1 : sourcelst_->row(items.front());
+    if (row < 0 || static_cast<size_t>(row) >= listed_.size())
         return;
-    source_ = items.front()->data(Qt::UserRole).toInt();
+    source_ = listed_[static_cast<size_t>(row)];
     const sourcerec& s = index_.sources[static_cast<size_t>(source_)];
     titletxt_->setText(qs(s.title));
     titletxt_->setCursorPosition(0);
@@ -245,9 +251,11 @@ void Attachimagesfrm::sourcechosen()
     Datetxt_->setText(sourcedatetext(s));
     imagelst_->clear();
     imagelst_->addItems(attachedimagetitles(index_, s));
-    individualslst_->clear();
+    QStringList people;
     for (const int32_t k : citingpeople(index_, s.id))
-        individualslst_->addItem(personlabel(index_.people[static_cast<size_t>(k)], settings_.idonly));
+        people << personlabel(index_.people[static_cast<size_t>(k)], settings_.idonly);
+    individualslst_->clear();
+    individualslst_->addItems(people);
     attachbut_->setEnabled(true);
 }
 

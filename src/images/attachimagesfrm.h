@@ -63,7 +63,8 @@ private:
     const settings& settings_;
     prompts& prompts_;
     imagechooser chooser_;
-    int32_t source_ = -1; // position in sources of the source shown
+    std::vector<int32_t> listed_; // positions in sources of the rows of sourcelst
+    int32_t source_ = -1;          // position in sources of the source shown
     bool attached_ = false;
     bool changed_ = false;
     bool fatal_ = false;
