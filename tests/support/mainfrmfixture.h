@@ -36,7 +36,16 @@ struct session {
     std::unique_ptr<qm::settingsstore> store;
     std::unique_ptr<qm::mainfrm> w;
 
-    explicit session(const QString& ini) : store(qm::settingsstore::onfile(ini)) {}
+    // With `complete`, a store without settings gets the defaults of every
+    // setting, so that the program starts without the first-start options
+    // dialog; without it the store is left as it is.
+    explicit session(const QString& ini, bool complete = true) : store(qm::settingsstore::onfile(ini))
+    {
+        if (complete && !store->read(QStringLiteral("No Source Text Warning"))) {
+            qm::savesettings(*store, qm::defaultsettings());
+            qm::saveflagsettings(*store, qm::defaultsettings());
+        }
+    }
 
     void make() { w = std::make_unique<qm::mainfrm>(prompts, *store); }
     QString read(const char* name) const { return store->read(QString::fromLatin1(name)).value_or(QString()); }

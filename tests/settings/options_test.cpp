@@ -1,0 +1,328 @@
+#include "settings/options.h"
+
+#include "platform/scriptedprompts.h"
+#include "platform/settingsstore.h"
+
+#include <QDir>
+#include <QFile>
+#include <QFileInfo>
+#include <QStandardPaths>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
+
+using namespace qm;
+
+TEST(OptionsLogName, GedcomNamesAreRefusedWhateverTheirCase)
+{
+    for (const char* name : {"/tmp/family.GED", "/tmp/family.ged", "/tmp/family.Ged", "/tmp/logged"}) {
+        const logname n = chooselogname(QString::fromLatin1(name));
+        EXPECT_EQ(n.error, gedcomlogmessage()) << name;
+        EXPECT_TRUE(n.path.isEmpty()) << name;
+    }
+    EXPECT_EQ(gedcomlogmessage(), "You should not (and can not) use a gedcom file to log these changes!");
+}
+
+TEST(OptionsLogName, EmptyNameIsRefusedAndTxtIsAppendedWhenMissing)
+{
+    EXPECT_EQ(chooselogname(QString()).error, "You must select a path and file name for the log file");
+    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/census")).path, QDir::toNativeSeparators("/tmp/census.txt"));
+    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/census.log")).path,
+              QDir::toNativeSeparators("/tmp/census.log.txt"));
+    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/census.txt")).path, QDir::toNativeSeparators("/tmp/census.txt"));
+    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/CENSUS.TXT")).path, QDir::toNativeSeparators("/tmp/CENSUS.TXT"));
+    EXPECT_TRUE(chooselogname(QStringLiteral("/tmp/census")).error.isEmpty());
+}
+
+TEST(OptionsBackupFolder, OneTrailingSeparatorIsDropped)
+{
+    EXPECT_EQ(trimbackupfolder("  C:\\Backups\\ "), "C:\\Backups");
+    EXPECT_EQ(trimbackupfolder("C:\\Backups"), "C:\\Backups");
+    EXPECT_EQ(trimbackupfolder("\\"), "\\"); // one character: kept
+#ifndef Q_OS_WIN
+    EXPECT_EQ(trimbackupfolder("/home/me/backups/"), "/home/me/backups");
+    EXPECT_EQ(trimbackupfolder("/"), "/");
+#endif
+}
+
+TEST(OptionsCertainty, AssessmentButtonsRecordPrimaryToUnreliable)
+{
+    EXPECT_EQ(certaintyofchoice(-1), -1);
+    EXPECT_EQ(certaintyofchoice(0), 3); // primary
+    EXPECT_EQ(certaintyofchoice(1), 2); // secondary
+    EXPECT_EQ(certaintyofchoice(2), 1); // questionable
+    EXPECT_EQ(certaintyofchoice(3), 0); // unreliable
+    for (int c = -1; c <= 3; ++c)
+        EXPECT_EQ(certaintyofchoice(choiceofcertainty(c)), c);
+    EXPECT_EQ(choiceofcertainty(7), -1);
+}
+
+TEST(OptionsEnabling, DependentControlsFollowTheirBoxes)
+{
+    settings s = defaultsettings();
+    s.keeplog = false;
+    s.opt1entrydate = false;
+    s.requestimages2 = false;
+    s.alternateseparator = false;
+    s.country = "USA";
+    optionsenabling e = enablingof(s);
+    EXPECT_FALSE(e.logpath);
+    EXPECT_FALSE(e.entrydatetoday); // method 1 without the entry date
+    EXPECT_TRUE(e.image2event);
+    EXPECT_FALSE(e.separator);
+    EXPECT_FALSE(e.autoreference); // UK only
+
+    s.fullentry = false; // method 2
+    e = enablingof(s);
+    EXPECT_TRUE(e.entrydatetoday);
+    EXPECT_FALSE(e.image2event);
+    s.requestimages2 = true;
+    s.keeplog = true;
+    s.alternateseparator = true;
+    s.country = "UK";
+    e = enablingof(s);
+    EXPECT_TRUE(e.image2event && e.logpath && e.separator && e.autoreference);
+}
+
+TEST(OptionsDefaults, DefaultSettingsButtonKeepsWhatItDoesNotSet)
+{
+    settings form;
+    form.fullentry = false;
+    form.country = "Canada";
+    form.certainty = 2;
+    form.keeplog = false;
+    form.logpath = "/elsewhere/log.txt";
+    form.backupfolder = "/elsewhere";
+    form.alternateseparator = true;
+    form.alternateseparatorcharacter = "|";
+    form.requestimage = false;
+    form.occplace = false;
+    form.title = "{YEAR}";
+    form.marriagecondition = true;
+    form.flaguse = true;
+    form.flagcheck = true;
+    form.birthsecondaryevidence = true;
+    form.count = 12;
+    const settings d = dialogdefaults(form);
+    EXPECT_TRUE(d.fullentry);
+    EXPECT_EQ(d.country, "UK");
+    EXPECT_EQ(d.certainty, -1);
+    EXPECT_TRUE(d.keeplog);
+    EXPECT_EQ(d.logpath, defaultlogpath());
+    EXPECT_EQ(d.backupfolder, programfolder());
+    EXPECT_FALSE(d.alternateseparator);
+    EXPECT_EQ(d.alternateseparatorcharacter, "-");
+    EXPECT_TRUE(d.requestimage);
+    EXPECT_TRUE(d.occplace);
+    EXPECT_EQ(d.title, defaulttitletemplate());
+    // Not set by the button, or not on the dialog at all.
+    EXPECT_TRUE(d.marriagecondition);
+    EXPECT_TRUE(d.flaguse && d.flagcheck && d.birthsecondaryevidence);
+    EXPECT_EQ(d.count, 12);
+}
+
+TEST(OptionsTitle, ExampleUsesTheSecondCensusAndFixedValues)
+{
+    EXPECT_EQ(titleexample(defaulttitletemplate()), "Census 1851 Warrington, Lancashire HO107/2204/151 (John Smith)");
+    EXPECT_EQ(titleexample("{DATE} {ADDR} {COUNTRY}"), "30 MAR 1851 43 Knutsford Road UK");
+    EXPECT_EQ(titleexample(""), "{No Title}");
+    EXPECT_EQ(titleplaceholders(), (QStringList{"{YEAR}", "{DATE}", "{PLACE}", "{ADDR}", "{OTHER}", "{REF}", "{COUNTRY}"}));
+}
+
+class OptionsSave : public ::testing::Test {
+protected:
+    static void SetUpTestSuite() { QStandardPaths::setTestModeEnabled(true); }
+
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        store = settingsstore::onfile(dir.filePath("settings.ini"));
+        current = defaultsettings();
+        current.logpath = dir.filePath("censuslog.txt");
+        current.backupfolder = QDir::toNativeSeparators(dir.path());
+        form = current;
+    }
+
+    optionssave save() { return saveoptions(prompts, *store, current, form, optionsopening::of(current)); }
+    bool written() const { return store->read("No Source Text Warning").has_value(); }
+
+    QTemporaryDir dir;
+    std::unique_ptr<settingsstore> store;
+    scriptedprompts prompts;
+    settings current;
+    settings form;
+};
+
+TEST_F(OptionsSave, UnchangedFormSavesWithoutQuestionsAndClearsFirstStart)
+{
+    current.firststart = true;
+    form.sourcetype = "  Census Return ";
+    form.title = " {YEAR} {PLACE} ";
+    form.logpath = "  " + current.logpath + " ";
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_FALSE(r.reloadneeded);
+    EXPECT_FALSE(r.values.firststart);
+    EXPECT_EQ(r.values.sourcetype, "Census Return");
+    EXPECT_EQ(r.values.title, "{YEAR} {PLACE}");
+    EXPECT_EQ(r.values.logpath, current.logpath);
+    EXPECT_TRUE(QFileInfo::exists(current.logpath)); // created
+    EXPECT_TRUE(prompts.history().empty());
+    EXPECT_EQ(store->read("Source Type"), "Census Return");
+    EXPECT_EQ(store->read("Log Path"), current.logpath);
+    EXPECT_TRUE(written());
+}
+
+TEST_F(OptionsSave, LogFileThatCannotBeCreatedStopsBeforeAnyQuestion)
+{
+    form.logpath = dir.filePath("no such folder/log.txt");
+    form.fullentry = false;
+    prompts.expect(answer::ok, "Error creating the log file specified, please check the file name and path and that "
+                               "you have access to it and that the disk is not full.");
+    EXPECT_EQ(save().stop, optionsstop::logfile);
+    EXPECT_EQ(prompts.history().size(), 1u);
+    EXPECT_EQ(prompts.unexpected(), 0);
+    EXPECT_FALSE(written());
+
+    // A path typed by hand naming a GEDCOM file is refused as the chooser refuses it.
+    form.logpath = dir.filePath("family.GED");
+    prompts.expect(answer::ok, gedcomlogmessage());
+    EXPECT_EQ(save().stop, optionsstop::logfile);
+    EXPECT_FALSE(QFileInfo::exists(form.logpath));
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(OptionsSave, WithoutKeepLogTheLogFileIsNeitherCreatedNorChecked)
+{
+    form.keeplog = false;
+    form.logpath = dir.filePath("no such folder/log.txt");
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_FALSE(r.values.keeplog);
+    EXPECT_FALSE(QFileInfo::exists(dir.filePath("no such folder")));
+    EXPECT_EQ(store->read("Keep Log"), "0");
+}
+
+TEST_F(OptionsSave, MethodChangeIsAskedAndNoStops)
+{
+    form.fullentry = false;
+    prompts.expect(answer::no, methodchangequestion());
+    EXPECT_EQ(save().stop, optionsstop::declined);
+    EXPECT_FALSE(written());
+    const message& m = prompts.history().back().m;
+    EXPECT_EQ(m.title, "Save Options");
+    EXPECT_EQ(m.choice, buttons::yesno);
+    EXPECT_EQ(m.kind, icon::exclamation);
+    EXPECT_EQ(m.defaultanswer, answer::no);
+
+    prompts.expect(answer::yes, methodchangequestion());
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_TRUE(r.reloadneeded);
+    EXPECT_FALSE(r.values.fullentry);
+    EXPECT_EQ(store->read("Full Entry"), "0");
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(OptionsSave, MethodCountryAndIdOnlyChangedAskOnlyTheMethodQuestion)
+{
+    form.fullentry = false;
+    form.country = "Ireland";
+    form.idonly = true;
+    prompts.expect(answer::yes, methodchangequestion());
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_TRUE(r.reloadneeded);
+    EXPECT_EQ(prompts.history().size(), 1u);
+    EXPECT_EQ(r.values.country, "Ireland");
+    EXPECT_TRUE(r.values.idonly);
+}
+
+TEST_F(OptionsSave, CountryChangeIsAsked)
+{
+    form.country = "USA";
+    prompts.expect(answer::no, countrychangequestion());
+    EXPECT_EQ(save().stop, optionsstop::declined);
+    prompts.expect(answer::yes, countrychangequestion());
+    const optionssave r = save();
+    EXPECT_TRUE(r.saved() && r.reloadneeded);
+    EXPECT_EQ(store->read("Country"), "USA");
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(OptionsSave, IdOnlyChangeIsAskedWhenNothingElseWas)
+{
+    form.idonly = true;
+    prompts.expect(answer::no, idonlychangequestion());
+    EXPECT_EQ(save().stop, optionsstop::declined);
+    EXPECT_FALSE(written());
+    EXPECT_EQ(prompts.history().back().m.title, "Save Options");
+    prompts.expect(answer::yes, idonlychangequestion());
+    const optionssave r = save();
+    EXPECT_TRUE(r.saved() && r.reloadneeded && r.values.idonly);
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(OptionsSave, EmptySeparatorStopsAfterTheQuestions)
+{
+    form.alternateseparator = true;
+    form.alternateseparatorcharacter.clear();
+    form.country = "Canada";
+    prompts.expect(answer::yes, countrychangequestion());
+    EXPECT_EQ(save().stop, optionsstop::noseparator);
+    EXPECT_FALSE(written());
+    EXPECT_EQ(prompts.unexpected(), 0);
+
+    // Unticked, an empty character is kept as it is.
+    form.alternateseparator = false;
+    form.country = current.country;
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_EQ(store->read("Alternate Separator Character"), "");
+}
+
+TEST_F(OptionsSave, BackupFolderIsStoredWithoutItsTrailingSeparator)
+{
+    form.backupfolder = "  " + QDir::toNativeSeparators(dir.path() + "/") + " ";
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_EQ(r.values.backupfolder, QDir::toNativeSeparators(dir.path()));
+    EXPECT_EQ(store->read("Backup Folder"), QDir::toNativeSeparators(dir.path()));
+}
+
+TEST_F(OptionsSave, FailedPathCheckLeavesTheStoreAndTheSettingsAlone)
+{
+    current.firststart = true;
+    form.backupfolder = dir.filePath("gone");
+    form.occage = true;
+    prompts.expect(answer::ok, "does not exist.");
+    const optionssave r = save();
+    EXPECT_EQ(r.stop, optionsstop::paths);
+    EXPECT_FALSE(written());
+    EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+TEST_F(OptionsSave, EverySettingOfTheFormIsStored)
+{
+    form.sourceinnote = form.residence = form.opt1entrydate = form.opt1whereinsource = form.opt1publicationinfo = true;
+    form.requestimages2 = form.image2event = form.entrydatetoday = form.occage = form.sharednote = true;
+    form.sourcenote = form.marriagecondition = form.autoreference = true;
+    form.birthdate = form.requestimage = form.occplace = form.asid = form.fileopendefault = false;
+    form.occscholar = form.nosourcetextwarning = false;
+    form.certainty = 1;
+    form.alternateseparator = true;
+    form.alternateseparatorcharacter = "|";
+    form.flaguse = true; // not the dialog's: stays as in use
+    const optionssave r = save();
+    ASSERT_TRUE(r.saved());
+    EXPECT_FALSE(r.values.flaguse);
+    for (const char* on : {"Source in Note", "Residence", "Opt1 Entry Date", "Opt1 Where in Source",
+                           "Opt1 Publication Info", "Request Images 2", "Image 2 Event", "Entry Date Today", "Occ Age",
+                           "Shared Note", "Source Note", "Marriage Condition", "Auto Reference", "Alternate Separator"})
+        EXPECT_EQ(store->read(QString::fromLatin1(on)), "1") << on;
+    for (const char* off : {"Birthdate", "Request Image", "Occ Place", "ASID", "File Open Default", "Occ Scholar",
+                            "No Source Text Warning"})
+        EXPECT_EQ(store->read(QString::fromLatin1(off)), "0") << off;
+    EXPECT_EQ(store->read("Certainty"), "1");
+    EXPECT_EQ(store->read("Alternate Separator Character"), "|");
+}

@@ -1,0 +1,540 @@
+// End-to-end tests of the options dialog on the offscreen platform: opened at
+// first start and when the paths fail their checks, and from "Options..." of
+// the main window, answered through its own controls.
+#include "settings/optionsfrm.h"
+
+#include "app/mainfrm.h"
+#include "census/censustable.h"
+#include "census/entrypanel_ui.h"
+#include "support/mainfrmfixture.h"
+
+#include <QAction>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QDir>
+#include <QGroupBox>
+#include <QLabel>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QStandardPaths>
+#include <QTabWidget>
+#include <QTest>
+#include <QToolButton>
+
+using namespace qm;
+using namespace qmtest;
+
+namespace {
+
+QString native(const QString& path)
+{
+    return QDir::toNativeSeparators(path);
+}
+
+int questions(const scriptedprompts& p)
+{
+    int n = 0;
+    for (const auto& shown : p.history())
+        n += shown.m.title == QLatin1String("Save Options");
+    return n;
+}
+
+} // namespace
+
+class optionsfrm_test : public QObject {
+    Q_OBJECT
+
+private:
+    windowfiles files_;
+
+    // A start of the program on a copy of the sample: with `s` written to the
+    // store first, or with an empty store. `script` queues the prompts after
+    // the default-file question; `dialog` is run in the options dialog when
+    // it opens at start (it is cancelled afterwards if left open).
+    std::unique_ptr<session> begin(const settings* s, const std::function<void(scriptedprompts&)>& script,
+                                   const std::function<void(optionsfrm&, scriptedprompts&)>& dialog, bool& shown)
+    {
+        auto r = std::make_unique<session>(files_.ini(), false);
+        if (s) {
+            savesettings(*r->store, *s);
+            saveflagsettings(*r->store, *s);
+        }
+        r->make();
+        r->prompts.expect(answer::no, QStringLiteral("by default"));
+        script(r->prompts);
+        dialoganswers answers;
+        shown = false;
+        answers.expect(QStringLiteral("optionsfrm"), [&](QDialog* d) {
+            shown = true;
+            dialog(*static_cast<optionsfrm*>(d), r->prompts);
+            if (d->isVisible())
+                d->reject();
+        });
+        if (!r->w->start({QLatin1Char('"') + files_.sample() + QLatin1Char('"')}))
+            return nullptr;
+        return r;
+    }
+
+    // Opens "Options..." and runs `body` in the dialog; a dialog left open is
+    // cancelled. False when the dialog did not open.
+    static bool inoptions(mainfrm& w, const std::function<void(optionsfrm&)>& body)
+    {
+        dialoganswers answers;
+        bool shown = false;
+        answers.expect(QStringLiteral("optionsfrm"), [&](QDialog* d) {
+            shown = true;
+            body(*static_cast<optionsfrm*>(d));
+            if (d->isVisible())
+                d->reject();
+        });
+        w.findChild<QAction*>(QStringLiteral("optionsmen"))->trigger();
+        return shown && answers.unexpected == 0;
+    }
+
+    static settings withpaths(const QString& folder)
+    {
+        settings s = defaultsettings();
+        s.logpath = native(folder + QStringLiteral("/censuslog.txt"));
+        s.backupfolder = native(folder);
+        return s;
+    }
+
+private slots:
+    void initTestCase()
+    {
+        QStandardPaths::setTestModeEnabled(true);
+        QVERIFY(files_.valid());
+    }
+
+    // Incomplete settings: the dialog opens before the file is loaded and
+    // cannot be left without saving; Save writes the store.
+    void firststart()
+    {
+        bool shown = false;
+        auto s = begin(nullptr, [](scriptedprompts&) {}, [&](optionsfrm& f, scriptedprompts& p) {
+            QCOMPARE(f.windowTitle(), QStringLiteral("Quillmark Options"));
+            QVERIFY(!f.Cancelbut->isEnabled());
+            QCOMPARE(f.SSTab1->currentIndex(), 0);
+            QTest::keyClick(&f, Qt::Key_Escape);
+            QVERIFY(f.isVisible());
+            f.close();
+            QVERIFY(f.isVisible());
+            QVERIFY(!static_cast<mainfrm*>(f.parentWidget())->index()); // the file is not read yet
+            f.occagechk->click();
+            f.methodopt[1]->click();
+            p.expect(answer::no, methodchangequestion());
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            f.methodopt[0]->click();
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }, shown);
+        QVERIFY(s);
+        QVERIFY(shown);
+        QCOMPARE(s->prompts.unexpected(), 0);
+        mainfrm& w = *s->w;
+        QVERIFY(!w.firststart());
+        QVERIFY(w.currentsettings().occage);
+        QCOMPARE(s->read("Occ Age"), QStringLiteral("1"));
+        QCOMPARE(s->read("No Source Text Warning"), QStringLiteral("1"));
+        QCOMPARE(s->read("Flag Use"), QStringLiteral("0"));
+        QCOMPARE(w.index()->people.size(), size_t(40));
+        QCOMPARE(questions(s->prompts), 1);
+        QCOMPARE(s->prompts.history().back().m.defaultanswer, answer::no);
+    }
+
+    // A backup folder that is gone: the message at start, then the dialog,
+    // which stays open until the folder is put right; nothing is written before.
+    void pathsfailatstart()
+    {
+        settings bad = withpaths(files_.path());
+        bad.backupfolder = files_.filepath(QStringLiteral("gone"));
+        bool shown = false;
+        auto s = begin(&bad, [&](scriptedprompts& p) { p.expect(answer::ok, QStringLiteral("does not exist. ")); },
+                       [&](optionsfrm& f, scriptedprompts& prompts) {
+                           QVERIFY(!f.Cancelbut->isEnabled());
+                           f.occagechk->click();
+                           prompts.expect(answer::ok, QStringLiteral("does not exist. "));
+                           f.savebut->click();
+                           QVERIFY(f.isVisible());
+                           prompts.expectfile(files_.path() + QLatin1Char('/'));
+                           f.folderpathbut->click();
+                           QCOMPARE(f.folderpathtxt->text(), native(files_.path() + QLatin1Char('/')));
+                           f.savebut->click();
+                           QVERIFY(!f.isVisible());
+                       },
+                       shown);
+        QVERIFY(s);
+        QVERIFY(shown);
+        QCOMPARE(s->prompts.unexpected(), 0);
+        QVERIFY(!s->w->firststart());
+        QCOMPARE(s->read("Backup Folder"), native(files_.path()));
+        QCOMPARE(s->w->currentsettings().backupfolder, native(files_.path()));
+        QCOMPARE(s->read("Occ Age"), QStringLiteral("1"));
+
+        // The failed Save wrote nothing: cancelled here, the store keeps the old values.
+        bool again = false;
+        auto t = begin(&bad, [&](scriptedprompts& p) { p.expect(answer::ok, QStringLiteral("does not exist. ")); },
+                       [&](optionsfrm& f, scriptedprompts& prompts) {
+                           f.occagechk->click();
+                           prompts.expect(answer::ok, QStringLiteral("does not exist. "));
+                           f.savebut->click();
+                           QVERIFY(f.isVisible());
+                       },
+                       again);
+        QVERIFY(t && again);
+        QCOMPARE(t->read("Occ Age"), QStringLiteral("0"));
+        QCOMPARE(t->read("Backup Folder"), bad.backupfolder);
+        QVERIFY(!t->w->currentsettings().occage);
+        QVERIFY(t->w->firststart());
+    }
+
+    void methodchange()
+    {
+        const settings paths = withpaths(files_.path());
+        auto s = files_.opened(files_.sample(), &paths);
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        chooseyear(w, QStringLiteral("1881"));
+        clickid(w, peoplelist(w), 11);
+        QCOMPARE(w.household().selectioncount, 1);
+
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            f.SSTab1->setCurrentIndex(1);
+            f.methodopt[1]->click();
+            QVERIFY(f.entrydatetodaychk->isEnabled());
+            QVERIFY(!f.image2eventchk->isEnabled());
+            f.images2chk->click();
+            QVERIFY(f.image2eventchk->isEnabled());
+            s->prompts.expect(answer::no, methodchangequestion());
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            f.Cancelbut->click();
+        }));
+        QVERIFY(w.currentsettings().fullentry);
+        QCOMPARE(w.household().selectioncount, 1);
+        QCOMPARE(s->read("Full Entry"), QStringLiteral("1"));
+        QCOMPARE(questions(s->prompts), 1);
+
+        // Method and country changed: only the method question.
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            QVERIFY(f.methodopt[0]->isChecked());
+            f.methodopt[1]->click();
+            f.usaopt->click();
+            QVERIFY(!f.autorefchk->isEnabled());
+            s->prompts.expect(answer::yes, methodchangequestion());
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(questions(s->prompts), 2);
+        QCOMPARE(s->prompts.unexpected(), 0);
+        QVERIFY(!w.currentsettings().fullentry);
+        QCOMPARE(w.currentsettings().country, QStringLiteral("USA"));
+        QCOMPARE(w.household().selectioncount, 0);
+        QCOMPARE(w.panel()->mode, 1);
+        QVERIFY(!w.findChild<QAction*>(QStringLiteral("attachbut"))->isEnabled());
+        QStringList years;
+        for (int i = 0; i < w.panel()->yearcom->count(); ++i)
+            years << w.panel()->yearcom->itemText(i);
+        QCOMPARE(years, fillyears(QStringLiteral("USA")));
+        QCOMPARE(s->read("Full Entry"), QStringLiteral("0"));
+        QCOMPARE(s->read("Country"), QStringLiteral("USA"));
+        QCOMPARE(w.index()->people.size(), size_t(40));
+    }
+
+    void countryandidonly()
+    {
+        const settings paths = withpaths(files_.path());
+        auto s = files_.opened(files_.sample(), &paths);
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        chooseyear(w, QStringLiteral("1881"));
+        clickid(w, peoplelist(w), 11);
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            QVERIFY(f.ukopt->isChecked());
+            QVERIFY(f.autorefchk->isEnabled());
+            f.IrelandOpt->click();
+            QVERIFY(!f.autorefchk->isEnabled());
+            f.ukopt->click();
+            QVERIFY(f.autorefchk->isEnabled());
+            f.CanadaOpt->click();
+            s->prompts.expect(answer::no, countrychangequestion());
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            s->prompts.expect(answer::yes, countrychangequestion());
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(w.currentsettings().country, QStringLiteral("Canada"));
+        QCOMPARE(w.household().selectioncount, 0);
+        QCOMPARE(w.panel()->yearcom->itemText(0), fillyears(QStringLiteral("Canada")).front());
+
+        chooseyear(w, QStringLiteral("1881"));
+        clickid(w, peoplelist(w), 11);
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            QVERIFY(f.CanadaOpt->isChecked());
+            f.IDonlychk->click();
+            s->prompts.expect(answer::no, idonlychangequestion());
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            QCOMPARE(s->prompts.history().back().m.title, QStringLiteral("Save Options"));
+            s->prompts.expect(answer::yes, idonlychangequestion());
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QVERIFY(w.currentsettings().idonly);
+        QCOMPARE(s->read("ID Only"), QStringLiteral("1"));
+        QCOMPARE(w.household().selectioncount, 0);
+        QCOMPARE(s->prompts.unexpected(), 0);
+
+        // A change that needs no reload keeps the entry.
+        chooseyear(w, QStringLiteral("1881"));
+        clickid(w, peoplelist(w), 11);
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            f.occagechk->click();
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(w.household().selectioncount, 1);
+        QCOMPARE(w.panel()->yearcom->currentText(), QStringLiteral("1881"));
+        QVERIFY(w.currentsettings().occage);
+        s->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to clear all of the data"));
+        w.findChild<QAction*>(QStringLiteral("clearallmen"))->trigger();
+    }
+
+    void emptyseparator()
+    {
+        const settings paths = withpaths(files_.path());
+        auto s = files_.opened(files_.sample(), &paths);
+        QVERIFY(s);
+        QVERIFY(inoptions(*s->w, [&](optionsfrm& f) {
+            QVERIFY(!f.separatortxt->isEnabled());
+            f.SSTab1->setCurrentIndex(1);
+            f.separatorchk->click();
+            QVERIFY(f.separatortxt->isEnabled());
+            QCOMPARE(f.focusWidget(), f.separatortxt);
+            QCOMPARE(f.separatortxt->selectedText(), QStringLiteral("-"));
+            f.separatortxt->clear();
+            f.SSTab1->setCurrentIndex(4);
+            f.savebut->setFocus();
+            s->prompts.expect(answer::ok, QStringLiteral("You must enter a character to act as a separator"));
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            QVERIFY(f.SSTab1->currentWidget()->isAncestorOf(f.separatortxt));
+            QCOMPARE(f.focusWidget(), f.separatortxt);
+            QTest::keyClicks(f.separatortxt, QStringLiteral("|"));
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(s->prompts.unexpected(), 0);
+        QCOMPARE(s->read("Alternate Separator"), QStringLiteral("1"));
+        QCOMPARE(s->read("Alternate Separator Character"), QStringLiteral("|"));
+        QCOMPARE(s->w->currentsettings().alternateseparatorcharacter, QStringLiteral("|"));
+    }
+
+    void logfile()
+    {
+        const settings paths = withpaths(files_.path());
+        auto s = files_.opened(files_.sample(), &paths);
+        QVERIFY(s);
+        mainfrm& w = *s->w;
+        const QString nolog = native(files_.filepath(QStringLiteral("nolog.txt")));
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            QVERIFY(f.pathtxt->isEnabled() && f.pathbut->isEnabled());
+            f.keeplogchk->click();
+            QVERIFY(!f.pathtxt->isEnabled() && !f.pathbut->isEnabled());
+            f.pathtxt->setText(nolog);
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QVERIFY(!QFileInfo::exists(nolog));
+        QCOMPARE(s->read("Keep Log"), QStringLiteral("0"));
+        QVERIFY(!w.findChild<QAction*>(QStringLiteral("viewlogmen"))->isEnabled());
+
+        const QString mylog = native(files_.filepath(QStringLiteral("mylog.txt")));
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            f.keeplogchk->click();
+            QVERIFY(f.pathtxt->isEnabled() && f.pathbut->isEnabled());
+            s->prompts.expectfile(files_.filepath(QStringLiteral("family.GED")));
+            s->prompts.expect(answer::ok, gedcomlogmessage());
+            f.pathbut->click();
+            QCOMPARE(f.pathtxt->text(), nolog);
+            s->prompts.expectfile(QString());
+            s->prompts.expect(answer::ok, QStringLiteral("You must select a path and file name for the log file"));
+            f.pathbut->click();
+            s->prompts.expectfile(std::nullopt);
+            f.pathbut->click();
+            QCOMPARE(f.pathtxt->text(), nolog);
+            s->prompts.expectfile(files_.filepath(QStringLiteral("mylog")));
+            f.pathbut->click();
+            QCOMPARE(f.pathtxt->text(), mylog);
+
+            f.pathtxt->setText(native(files_.filepath(QStringLiteral("missing/log.txt"))));
+            s->prompts.expect(answer::ok, QStringLiteral("Error creating the log file specified"));
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            f.pathtxt->setText(QStringLiteral("  ") + mylog);
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(s->prompts.unexpected(), 0);
+        QVERIFY(QFileInfo::exists(mylog));
+        QCOMPARE(s->read("Log Path"), mylog);
+        QCOMPARE(s->read("Keep Log"), QStringLiteral("1"));
+        QVERIFY(w.findChild<QAction*>(QStringLiteral("viewlogmen"))->isEnabled());
+    }
+
+    void backupfolder()
+    {
+        const settings paths = withpaths(files_.path());
+        auto s = files_.opened(files_.sample(), &paths);
+        QVERIFY(s);
+        QVERIFY(inoptions(*s->w, [&](optionsfrm& f) {
+            QVERIFY(f.folderpathtxt->isReadOnly());
+            s->prompts.expectfile(files_.filepath(QStringLiteral("nothere")));
+            s->prompts.expect(answer::ok, QStringLiteral("You are not able to select that location for the backup folder."));
+            f.folderpathbut->click();
+            QCOMPARE(f.folderpathtxt->text(), native(files_.path()));
+            const QString sub = files_.filepath(QStringLiteral("backups"));
+            QVERIFY(QDir().mkpath(sub));
+            s->prompts.expectfile(sub + QLatin1Char('/'));
+            f.folderpathbut->click();
+            QCOMPARE(f.folderpathtxt->text(), native(sub + QLatin1Char('/')));
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(s->prompts.unexpected(), 0);
+        QCOMPARE(s->read("Backup Folder"), native(files_.filepath(QStringLiteral("backups"))));
+    }
+
+    // "Default Settings" puts the defaults on the form only; Cancel keeps the
+    // settings in use. The title template's example and placeholders; Help.
+    void defaultsandtitle()
+    {
+        settings custom = withpaths(files_.path());
+        custom.certainty = 2;
+        custom.occage = true;
+        custom.marriagecondition = true;
+        custom.alternateseparator = true;
+        custom.alternateseparatorcharacter = QStringLiteral("|");
+        custom.title = QStringLiteral("{YEAR}");
+        custom.sourcetype = QStringLiteral("Return");
+        custom.keeplog = false;
+        custom.opt1entrydate = false;
+        auto s = files_.opened(files_.sample(), &custom);
+        QVERIFY(s);
+        QVERIFY(inoptions(*s->w, [&](optionsfrm& f) {
+            QVERIFY(f.Cancelbut->isEnabled());
+            QVERIFY(f.assessmentopt[1]->isChecked());
+            QVERIFY(!f.entrydatetodaychk->isEnabled()); // method 1 without the entry date
+            f.opt1entrydatechk->click();
+            QVERIFY(f.entrydatetodaychk->isEnabled());
+            QCOMPARE(f.titleoutputlab->text(), QStringLiteral("1851"));
+            f.defaultbut->click();
+            QVERIFY(f.Norecordopt->isChecked());
+            QVERIFY(!f.occagechk->isChecked());
+            QVERIFY(f.marriageconditionchk->isChecked()); // not set by the button
+            QVERIFY(!f.separatorchk->isChecked());
+            QVERIFY(!f.separatortxt->isEnabled());
+            QCOMPARE(f.separatortxt->text(), QStringLiteral("-"));
+            QCOMPARE(f.sourcetypetxt->text(), QStringLiteral("Census"));
+            QVERIFY(f.keeplogchk->isChecked());
+            QCOMPARE(f.pathtxt->text(), defaultlogpath());
+            QCOMPARE(f.folderpathtxt->text(), programfolder());
+            QCOMPARE(f.titletxt->text(), defaulttitletemplate());
+            QCOMPARE(f.titleoutputlab->text(),
+                     QStringLiteral("Census 1851 Warrington, Lancashire HO107/2204/151 (John Smith)"));
+
+            // A placeholder goes in at the cursor, in place of the selection.
+            f.SSTab1->setCurrentIndex(2);
+            f.titletxt->setText(QStringLiteral("Census  at"));
+            f.titletxt->setCursorPosition(7);
+            QCOMPARE(f.titlerefcom->count(), 7);
+            QCOMPARE(f.titlerefcom->currentIndex(), -1);
+            QCOMPARE(f.titlerefcom->placeholderText(), QStringLiteral("<<Add Reference"));
+            f.titlerefcom->setFocus();
+            QTest::keyClick(f.titlerefcom, Qt::Key_Down); // {YEAR}
+            QCOMPARE(f.titletxt->text(), QStringLiteral("Census {YEAR} at"));
+            QCOMPARE(f.titlerefcom->currentIndex(), -1);
+            QCOMPARE(f.focusWidget(), f.titletxt);
+            QCOMPARE(f.titleoutputlab->text(), QStringLiteral("Census 1851 at"));
+            f.titletxt->setSelection(14, 2);
+            QTest::keyClick(f.titlerefcom, Qt::Key_Down);
+            QCOMPARE(f.titletxt->text(), QStringLiteral("Census {YEAR} {YEAR}"));
+            f.defaulttitlebut->click();
+            QCOMPARE(f.titletxt->text(), defaulttitletemplate());
+
+            f.Command1->click();
+            QCOMPARE(s->prompts.helpshown, QStringList{QStringLiteral("20")});
+            f.Cancelbut->click();
+            QVERIFY(!f.isVisible());
+        }));
+        QCOMPARE(s->read("Certainty"), QStringLiteral("2"));
+        QCOMPARE(s->w->currentsettings().certainty, 2);
+        QCOMPARE(s->w->currentsettings().title, QStringLiteral("{YEAR}"));
+        QCOMPARE(s->prompts.unexpected(), 0);
+    }
+
+    // The dialog on its own: names, captions, Donate, and a size that fits
+    // a 1366 x 768 screen.
+    void controlsandsize()
+    {
+        scriptedprompts prompts;
+        auto store = settingsstore::onfile(files_.ini());
+        int donations = 0;
+        optionsfrm f(prompts, *store, withpaths(files_.path()), [&] { ++donations; });
+        f.show();
+        QVERIFY(QTest::qWaitForWindowExposed(&f));
+        f.donatebut->click();
+        QCOMPARE(donations, 1);
+        QStringList tabs;
+        for (int i = 0; i < f.SSTab1->count(); ++i)
+            tabs << f.SSTab1->tabText(i).remove(QLatin1Char('&'));
+        QCOMPARE(tabs, (QStringList{"General", "Recording Methods", "Recording Method 1", "Recording Method 2",
+                                    "Miscellaneous"}));
+        QStringList frames;
+        for (QGroupBox* g : f.findChildren<QGroupBox*>())
+            frames << g->title();
+        for (const char* t : {"Source Text", "File Open", "Backup Folder", "Log File", "Indiividual Record ID",
+                              "Census Country", "Birth", "Census Recording Method", "Census source assessment",
+                              "Occupation", "Auto Text", "Recording Method 1 Options", "Title Template",
+                              "Image Link/Note", "Recording Method 2 Options", "Donate?"})
+            QVERIFY2(frames.contains(QString::fromLatin1(t)), t);
+        QCOMPARE(f.IDonlychk->accessibleName(),
+                 QStringLiteral("Only show Name and Record ID in All Individuals and Immediate Family lists"));
+        QCOMPARE(f.findChild<QLabel*>(QStringLiteral("IDonlychklab"))->text(), f.IDonlychk->accessibleName());
+        QCOMPARE(f.keeplogchk->text(), QStringLiteral("Keep a log of census entries created"));
+        QCOMPARE(f.assessmentopt[3]->text(), QStringLiteral("Record as unreliable"));
+        QCOMPARE(f.defaultbut->text().remove(QLatin1Char('&')), QStringLiteral("Default Settings"));
+        QCOMPARE(f.defaulttitlebut->text(), QStringLiteral("Reset to Default Title"));
+
+        // Clicking a wrapped caption clicks its box.
+        QLabel* caption = f.findChild<QLabel*>(QStringLiteral("IDonlychklab"));
+        QTest::mouseClick(caption, Qt::LeftButton);
+        QVERIFY(f.IDonlychk->isChecked());
+
+        for (QWidget* c : f.findChildren<QWidget*>()) {
+            if (!qobject_cast<QLineEdit*>(c) && !qobject_cast<QComboBox*>(c) && !qobject_cast<QAbstractButton*>(c))
+                continue;
+            bool inner = false;
+            for (QObject* o = c->parent(); o; o = o->parent())
+                inner = inner || qobject_cast<QComboBox*>(o) || o->objectName().startsWith(QLatin1String("qt_"));
+            if (inner || c->objectName().startsWith(QLatin1String("qt_")))
+                continue;
+            QVERIFY2(!c->objectName().isEmpty(), c->metaObject()->className());
+            if (!qobject_cast<QAbstractButton*>(c) || static_cast<QAbstractButton*>(c)->text().isEmpty())
+                QVERIFY2(!c->accessibleName().isEmpty(), qPrintable(c->objectName()));
+        }
+        QSize need = f.minimumSizeHint();
+        for (int i = 0; i < f.SSTab1->count(); ++i) {
+            f.SSTab1->setCurrentIndex(i);
+            need = need.expandedTo(f.minimumSizeHint());
+        }
+        QVERIFY2(need.width() <= 1366 - 16 && need.height() <= 768 - 60,
+                 qPrintable(QStringLiteral("%1 x %2").arg(need.width()).arg(need.height())));
+        f.reject();
+    }
+};
+
+QTEST_MAIN(optionsfrm_test)
+#include "optionsfrm_test.moc"
