@@ -247,8 +247,8 @@ private slots:
         QCOMPARE(QString::fromUtf8(r->w->index()->people.at(3).name), QStringLiteral("Byrne, Patrick"));
     }
 
-    // "Don't make changes" writes nothing; with the flags in step nothing is shown at all.
-    void nochangesandinstepfiles()
+    // "Don't make changes" writes nothing.
+    void dontmakechanges()
     {
         const QString file = familyfile();
         dialoganswers dialogs;
@@ -265,7 +265,11 @@ private slots:
         QCOMPARE(dialogs.unexpected, 0);
         QCOMPARE(r->prompts.unexpected(), 0);
         QCOMPARE(bytesof(file), family);
+    }
 
+    // With the flags in step nothing is shown; opening a file from the menu checks it too.
+    void instepfilesandopeningfromthemenu()
+    {
         const QString instep = files.filepath(QStringLiteral("instep.ged"));
         QFile f(instep);
         QVERIFY(f.open(QIODevice::WriteOnly));
@@ -278,6 +282,20 @@ private slots:
         QTest::qWait(30);
         QVERIFY(none.seen.isEmpty());
         QCOMPARE(quiet->prompts.unexpected(), 0);
+
+        // Opening another file from the menu checks it too.
+        none.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
+            d->findChild<QPushButton*>(QStringLiteral("cancelbut"))->click();
+        });
+        quiet->prompts.expect(answer::no, QStringLiteral("by default"));
+        quiet->prompts.expect(answer::ok, QStringLiteral("out of sync"));
+        quiet->prompts.expect(answer::ok, QStringLiteral("Flag check was cancelled."));
+        const QString file = familyfile();
+        quiet->w->openfamilyfile(file);
+        QCOMPARE(none.seen, QStringList({QStringLiteral("flagcheckcountryfrm")}));
+        QCOMPARE(quiet->prompts.unexpected(), 0);
+        QCOMPARE(quiet->w->gedcomfile(), file);
+        QVERIFY(quiet->w->watching());
     }
 
     // The dialog alone: "Flag Check" stored when ticked by the user only, the
