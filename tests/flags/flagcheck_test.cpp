@@ -190,7 +190,8 @@ TEST_F(FlagCheck, PlaceCountryIsRememberedUntilTheFileIsReadAgain)
     EXPECT_EQ(asked.asked, 2);
 
     // A fresh load knows no country.
-    EXPECT_TRUE(load(mixed)->places[static_cast<size_t>(findplace(*ix, "Dublin"))].country.empty());
+    auto fresh = load(mixed);
+    EXPECT_TRUE(fresh->places[static_cast<size_t>(findplace(*fresh, "Dublin"))].country.empty());
 }
 
 TEST_F(FlagCheck, CancelledQuestionEndsTheCheckWithNothingToChange)
