@@ -477,6 +477,43 @@ private slots:
         QVERIFY(!filechanged(*w.index())); // read again
         QVERIFY(w.index()->sources[0].objectids.empty());
     }
+
+    // A failed rewrite from the Tools menu: the message, then the program ends.
+    void failedrewriteendstheprogram()
+    {
+        const QString file = files_.sample();
+        const settings s = testsettings();
+        auto run = files_.opened(file, &s);
+        QVERIFY(run);
+        mainfrm& w = *run->w;
+        const std::string before = readfile(file);
+        dialoganswers dialogs;
+        dialogs.expect(QStringLiteral("Attachimagesfrm"), [&](QDialog* d) {
+            QTimer::singleShot(0, d, [&, d] {
+                pick(child<QListWidget>(*d, "sourcelst"), s5);
+                run->prompts.expect(answer::ok, QStringLiteral("An error occurred"));
+                setinputfaultfortests(true);
+                child<QPushButton>(*d, "attachbut")->click();
+                setinputfaultfortests(false);
+            });
+        });
+        dialogs.expect(QStringLiteral("imagesfrm"), [](QDialog* d) {
+            QTimer::singleShot(0, d, [d] {
+                child<QPushButton>(*d, "addcurrentimagebut")->click();
+                child<QPushButton>(*d, "okbut")->click();
+            });
+        });
+        dialogs.expect(QStringLiteral("currentimagesfrm"), [](QDialog* d) {
+            pick(child<QListWidget>(*d, "imageslst"), QStringLiteral("Census 1881 Hebden Bridge"));
+            child<QPushButton>(*d, "okbut")->click();
+        });
+        w.findChild<QAction*>(QStringLiteral("attachbut"))->trigger();
+        QTRY_COMPARE(dialogs.pending(), 0);
+        QCOMPARE(dialogs.unexpected, 0);
+        QCOMPARE(run->prompts.unexpected(), 0);
+        QVERIFY(!w.isVisible());
+        QCOMPARE(readfile(file), before);
+    }
 };
 
 QTEST_MAIN(attachimagesfrm_test)
