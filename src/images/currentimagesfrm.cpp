@@ -112,7 +112,9 @@ void currentimagesfrm::build()
     connect(help, &QPushButton::clicked, this, [this] { prompts_.showhelp(24); });
     connect(censuschk_, &QCheckBox::toggled, this, &currentimagesfrm::fill);
     connect(showtitlesopt_, &QRadioButton::toggled, this, &currentimagesfrm::fill);
-    connect(imageslst_, &QListWidget::currentRowChanged, this, &currentimagesfrm::rowchosen);
+    // The selection, not the current row: the list makes its first row current
+    // without selecting it when it takes the focus.
+    connect(imageslst_, &QListWidget::itemSelectionChanged, this, &currentimagesfrm::rowchosen);
     connect(imageslst_, &QListWidget::itemDoubleClicked, this, &currentimagesfrm::okclicked);
 
     setTabOrder(imageslst_, censuschk_);
@@ -158,7 +160,7 @@ int currentimagesfrm::selectedobject() const
     return k >= 0 && static_cast<size_t>(k) < index_.objects.size() ? k : -1;
 }
 
-void currentimagesfrm::rowchosen(int)
+void currentimagesfrm::rowchosen()
 {
     const int k = selectedobject();
     if (k < 0)

@@ -33,7 +33,7 @@ public:
 private:
     void build();
     void fill();
-    void rowchosen(int row);
+    void rowchosen();
     void okclicked();
     int selectedobject() const;
 

@@ -144,7 +144,8 @@ void imagesfrm::build()
     connect(addcurrentimagebut_, &QPushButton::clicked, this, &imagesfrm::linkcurrent);
     connect(Addnewbut_, &QPushButton::clicked, this, &imagesfrm::linknew);
     connect(unlinkbut_, &QPushButton::clicked, this, &imagesfrm::unlink);
-    connect(newimageslst_, &QListWidget::currentRowChanged, this, &imagesfrm::rowchosen);
+    connect(newimageslst_, &QListWidget::itemSelectionChanged, this,
+            [this] { rowchosen(newimageslst_->selectedItems().isEmpty() ? -1 : newimageslst_->currentRow()); });
 
     setTabOrder(newimageslst_, addcurrentimagebut_);
     setTabOrder(addcurrentimagebut_, Addnewbut_);
