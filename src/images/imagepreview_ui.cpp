@@ -149,6 +149,8 @@ imagepreview::outcome imagepreview::showfile(const QString& path)
         setmessage(failedtext(), false);
         return last_;
     }
+    // Large scans take a moment to decode.
+    busycursor busy(prompts_);
     QImageReader reader(path);
     reader.setAutoTransform(true);
     QImage picture;

@@ -214,7 +214,7 @@ void imagesfrm::rowchosen(int row)
 
 void imagesfrm::unlink()
 {
-    const int row = newimageslst_->currentRow();
+    const int row = newimageslst_->selectedItems().isEmpty() ? -1 : newimageslst_->currentRow();
     if (row < 0 || static_cast<size_t>(row) >= chosen_.size())
         return;
     // The O number is not given back: a later new image takes the next one.
