@@ -7,7 +7,6 @@
 #include "model/gedcomindex.h"
 #include "platform/prompts.h"
 
-#include <QDialogButtonBox>
 #include <QFormLayout>
 #include <QGridLayout>
 #include <QGroupBox>
@@ -113,25 +112,28 @@ void imagesfrm::build()
     middle->addWidget(Imagefrm_);
     layout->addLayout(middle, 1);
 
-    auto* buttons = new QDialogButtonBox(this);
-    okbut_ = buttons->addButton(QStringLiteral("OK"), QDialogButtonBox::AcceptRole);
-    okbut_->setObjectName(QStringLiteral("okbut"));
-    okbut_->setAccessibleName(QStringLiteral("OK"));
-    cancelbut_ = buttons->addButton(QStringLiteral("&Do not attach image(s)"), QDialogButtonBox::RejectRole);
-    cancelbut_->setObjectName(QStringLiteral("cancelbut"));
-    cancelbut_->setAccessibleName(QStringLiteral("Do not attach image(s)"));
-    Cancelcensusbut_ = buttons->addButton(QStringLiteral("Cancel &saving census"), QDialogButtonBox::DestructiveRole);
-    Cancelcensusbut_->setObjectName(QStringLiteral("Cancelcensusbut"));
-    Cancelcensusbut_->setAccessibleName(QStringLiteral("Cancel saving census"));
+    // A row of plain buttons: "Cancel saving census" is left out of the second context.
+    auto* buttons = new QHBoxLayout;
+    const auto addbutton = [&](const QString& caption, const char* name, const QString& accessible) {
+        auto* b = new QPushButton(caption, this);
+        b->setObjectName(QString::fromLatin1(name));
+        b->setAccessibleName(accessible);
+        b->setAutoDefault(false);
+        buttons->addWidget(b);
+        return b;
+    };
+    buttons->addStretch(1);
+    okbut_ = addbutton(QStringLiteral("OK"), "okbut", QStringLiteral("OK"));
+    cancelbut_ = addbutton(QStringLiteral("&Do not attach image(s)"), "cancelbut", QStringLiteral("Do not attach image(s)"));
+    Cancelcensusbut_ = addbutton(QStringLiteral("Cancel &saving census"), "Cancelcensusbut",
+                                 QStringLiteral("Cancel saving census"));
     Cancelcensusbut_->setVisible(request_.context == 1);
     Cancelcensusbut_->setEnabled(request_.context == 1);
-    auto* help = buttons->addButton(QStringLiteral("&Help"), QDialogButtonBox::HelpRole);
-    help->setObjectName(QStringLiteral("helpbut"));
-    help->setAccessibleName(QStringLiteral("Help"));
-    for (QPushButton* b : {okbut_, cancelbut_, Cancelcensusbut_, help, addcurrentimagebut_, Addnewbut_})
-        b->setAutoDefault(false);
+    auto* help = addbutton(QStringLiteral("&Help"), "helpbut", QStringLiteral("Help"));
+    addcurrentimagebut_->setAutoDefault(false);
+    Addnewbut_->setAutoDefault(false);
     okbut_->setDefault(true);
-    layout->addWidget(buttons);
+    layout->addLayout(buttons);
 
     connect(okbut_, &QPushButton::clicked, this, &QDialog::accept);
     // "Do not attach image(s)": no images; the Escape key and the close box do the same.

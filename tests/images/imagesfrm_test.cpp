@@ -14,6 +14,7 @@
 
 #include <QCheckBox>
 #include <QDir>
+#include <QGroupBox>
 #include <QImage>
 #include <QListWidget>
 #include <QPlainTextEdit>
@@ -326,6 +327,66 @@ private slots:
         button(&f, "Addnewbut")->click();
         QCOMPARE(answers.unexpected, 0);
         QCOMPARE(answers.pending(), 0);
+        QCOMPARE(p.unexpected(), 0);
+    }
+
+    // The title option remembered, when the reference title is unavailable;
+    // "Do not attach image(s)" gives no images and lets the save go on.
+    void titleoptionsandcontexts()
+    {
+        const auto ix = load(files_.sample());
+        QVERIFY(ix);
+        scriptedprompts p;
+        auto store = settingsstore::onfile(files_.ini());
+        store->write(QStringLiteral("Image Option"), QStringLiteral("3"));
+        const settings s = runsettings();
+        for (const int context : {1, 2}) {
+            imagerequest r;
+            r.context = context;
+            r.sourcebase = QStringLiteral("Census 1881 Leeds");
+            imagesfrm f(r, *ix, s, *store, p);
+            QCOMPARE(button(&f, "Cancelcensusbut")->isVisibleTo(&f), context == 1);
+            dialoganswers answers;
+            // Read while open, compared once it has closed.
+            bool reference = true, option = false, rename = false, ownreadonly = false, namereadonly = false;
+            QString referencetext;
+            const int expected = context == 2 ? 2 : 0;
+            answers.expect(QStringLiteral("newimagefrm"), [&](QDialog* d) {
+                const auto* frame = child<QGroupBox>(d, QStringLiteral("imageframe"));
+                reference = child<QRadioButton>(d, QStringLiteral("titleopt3"))->isEnabledTo(frame);
+                referencetext = child<QLineEdit>(d, QStringLiteral("titletxt3"))->text();
+                option = child<QRadioButton>(d, QStringLiteral("titleopt%1").arg(expected))->isChecked();
+                rename = child<QCheckBox>(d, QStringLiteral("renamechk"))->isEnabledTo(frame);
+                ownreadonly = child<QLineEdit>(d, QStringLiteral("titletxt2"))->isReadOnly();
+                namereadonly = child<QLineEdit>(d, QStringLiteral("titletxt0"))->isReadOnly();
+                button(d, "cancelbut")->click();
+            });
+            button(&f, "Addnewbut")->click();
+            QCOMPARE(answers.pending(), 0);
+            QVERIFY(!reference);
+            QCOMPARE(referencetext, QStringLiteral("No reference for this census was specified"));
+            QVERIFY(option);
+            QCOMPARE(rename, expected != 0);
+            QCOMPARE(ownreadonly, expected != 2);
+            QVERIFY(namereadonly);
+            QVERIFY(f.chosen().empty());
+        }
+
+        std::vector<imagechoice> chosen{imagechoice{}};
+        dialoganswers answers;
+        answers.expect(QStringLiteral("imagesfrm"), [&](QDialog* d) {
+            dialoganswers inner;
+            inner.expect(QStringLiteral("currentimagesfrm"), [](QDialog* c) {
+                child<QListWidget>(c, QStringLiteral("imageslst"))->setCurrentRow(1);
+                button(c, "okbut")->click();
+            });
+            button(d, "addcurrentimagebut")->click();
+            QVERIFY(button(d, "okbut")->isEnabled());
+            button(d, "cancelbut")->click();
+        });
+        QVERIFY(imagesfrm::choose(imagerequest{}, *ix, s, *store, p, chosen, nullptr));
+        QCOMPARE(answers.pending(), 0);
+        QVERIFY(chosen.empty());
         QCOMPARE(p.unexpected(), 0);
     }
 
