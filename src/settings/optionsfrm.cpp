@@ -274,6 +274,22 @@ QWidget* optionsfrm::methodstab()
     birthchk = check(birth, "birthchk",
                      QStringLiteral("Create a calculated birth event for individuals who don't have a birth recorded"));
 
+    QGroupBox* autotext = frame(QStringLiteral("Auto Text"), "autotextfra");
+    marriageconditionchk = check(autotext, "marriageconditionchk",
+                                 QStringLiteral("Add a column for the marriage condition to the Auto-text"));
+    separatorchk = new QCheckBox(QStringLiteral("Separate Auto-text columns with a"), autotext);
+    separatorchk->setObjectName(QStringLiteral("separatorchk"));
+    separatorchk->setAccessibleName(separatorchk->text());
+    separatortxt = textbox("separatortxt", QStringLiteral("Separator character"), autotext);
+    separatortxt->setMaxLength(1);
+    separatortxt->setFixedWidth(separatortxt->fontMetrics().horizontalAdvance(QStringLiteral("WW")) + 12);
+    auto* separatorrow = new QHBoxLayout;
+    separatorrow->addWidget(separatorchk);
+    separatorrow->addWidget(separatortxt);
+    separatorrow->addWidget(new QLabel(QStringLiteral("character rather than a tab."), autotext));
+    separatorrow->addStretch(1);
+    rowsof(autotext)->addLayout(separatorrow);
+
     QGroupBox* assessment = frame(QStringLiteral("Census source assessment"), "assessmentfra");
     Norecordopt = option(assessment, "Norecordopt", QStringLiteral("Do not record Assessment"));
     assessmentgroup_ = new QButtonGroup(this);
@@ -296,22 +312,6 @@ QWidget* optionsfrm::methodstab()
     occagechk = check(occupation, "occagechk",
                       QStringLiteral("Record the age as stated in the census within the age field of the occupation "
                                      "attribute."));
-
-    QGroupBox* autotext = frame(QStringLiteral("Auto Text"), "autotextfra");
-    marriageconditionchk = check(autotext, "marriageconditionchk",
-                                 QStringLiteral("Add a column for the marriage condition to the Auto-text"));
-    separatorchk = new QCheckBox(QStringLiteral("Separate Auto-text columns with a"), autotext);
-    separatorchk->setObjectName(QStringLiteral("separatorchk"));
-    separatorchk->setAccessibleName(separatorchk->text());
-    separatortxt = textbox("separatortxt", QStringLiteral("Separator character"), autotext);
-    separatortxt->setMaxLength(1);
-    separatortxt->setFixedWidth(separatortxt->fontMetrics().horizontalAdvance(QStringLiteral("WW")) + 12);
-    auto* separatorrow = new QHBoxLayout;
-    separatorrow->addWidget(separatorchk);
-    separatorrow->addWidget(separatortxt);
-    separatorrow->addWidget(new QLabel(QStringLiteral("character rather than a tab."), autotext));
-    separatorrow->addStretch(1);
-    rowsof(autotext)->addLayout(separatorrow);
 
     auto* columns = new QHBoxLayout(tab);
     columns->addWidget(column({method, birth, autotext}, tab), 3);

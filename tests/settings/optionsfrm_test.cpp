@@ -465,7 +465,8 @@ private slots:
             QCOMPARE(f.titletxt->text(), defaulttitletemplate());
 
             f.Command1->click();
-            QCOMPARE(s->prompts.helpshown, QStringList{QStringLiteral("20")});
+            QTest::keyClick(&f, Qt::Key_F1);
+            QCOMPARE(s->prompts.helpshown, (QStringList{QStringLiteral("20"), QStringLiteral("20")}));
             f.Cancelbut->click();
             QVERIFY(!f.isVisible());
         }));
