@@ -15,6 +15,7 @@
 #include <QComboBox>
 #include <QDialog>
 #include <QFile>
+#include <QFileInfo>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListView>
@@ -38,12 +39,17 @@ struct session {
 
     // With `complete`, a store without settings gets the defaults of every
     // setting, so that the program starts without the first-start options
-    // dialog; without it the store is left as it is.
+    // dialog; without it the store is left as it is. The log and the backups
+    // go beside the settings file, never into the user's own folder.
     explicit session(const QString& ini, bool complete = true) : store(qm::settingsstore::onfile(ini))
     {
         if (complete && !store->read(QStringLiteral("No Source Text Warning"))) {
-            qm::savesettings(*store, qm::defaultsettings());
-            qm::saveflagsettings(*store, qm::defaultsettings());
+            qm::settings s = qm::defaultsettings();
+            const QString folder = QFileInfo(ini).absolutePath();
+            s.logpath = folder + QStringLiteral("/censuslog.txt");
+            s.backupfolder = folder;
+            qm::savesettings(*store, s);
+            qm::saveflagsettings(*store, s);
         }
     }
 
@@ -89,8 +95,15 @@ public:
     {
         auto r = std::make_unique<session>(ini());
         if (s) {
-            qm::savesettings(*r->store, *s);
-            qm::saveflagsettings(*r->store, *s);
+            // Default log and backup paths would be the user's own: kept here instead.
+            qm::settings given = *s;
+            const qm::settings defaults = qm::defaultsettings();
+            if (given.logpath == defaults.logpath)
+                given.logpath = filepath(QStringLiteral("censuslog.txt"));
+            if (given.backupfolder == defaults.backupfolder)
+                given.backupfolder = path();
+            qm::savesettings(*r->store, given);
+            qm::saveflagsettings(*r->store, given);
         }
         r->make();
         r->prompts.expect(qm::answer::no, QStringLiteral("by default"));
