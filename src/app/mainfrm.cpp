@@ -547,11 +547,6 @@ void mainfrm::clearall()
     panel()->yearcom->setFocus();
 }
 
-void mainfrm::comingsoon()
-{
-    prompts_.tell(QStringLiteral("This part of Quillmark is not available in this version."), icon::information);
-}
-
 void mainfrm::runtool(const std::function<void()>& open)
 {
     reloadneeded_ = false;

@@ -77,7 +77,6 @@ private:
     void afterload();
     void editmenuopening();
     void clearall();
-    void comingsoon();
 
     // The menus' tools and dialogs, each defined in its feature's folder.
     // A tool that may rewrite the family file runs with the watch for outside
