@@ -1,8 +1,11 @@
 #include "app/cli.h"
 
+#include "flags/flagtable.h"
 #include "platform/settingsstore.h"
 
+#include <QDir>
 #include <QFileInfo>
+#include <QJsonDocument>
 
 #include <cmath>
 #include <cstdio>
@@ -81,6 +84,90 @@ std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error
     }
     s->values = loadsettings(*s->store).values;
     return s;
+}
+
+QString unknownoption(const QStringList& args)
+{
+    for (const QString& a : args)
+        if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-"))
+            return QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a);
+    return QString();
+}
+
+QString readapplyargs(const QStringList& args, const QString& name, const QString& missing,
+                      const std::function<QString(const QString& value)>& take, bool* apply, QStringList* files)
+{
+    for (qsizetype i = 0; i < args.size(); ++i) {
+        const QString& a = args[i];
+        QString value;
+        if (a == QLatin1String("--apply")) {
+            *apply = true;
+            continue;
+        }
+        if (a == name) {
+            if (i + 1 >= args.size())
+                return missing;
+            value = args[++i];
+        } else if (a.startsWith(name + QLatin1Char('='))) {
+            value = a.mid(name.size() + 1);
+        } else if (const QString refused = unknownoption({a}); !refused.isEmpty()) {
+            return refused;
+        } else {
+            files->push_back(a);
+            continue;
+        }
+        if (const QString refused = take(value); !refused.isEmpty())
+            return refused;
+    }
+    return QString();
+}
+
+QString checkfamilypath(const QString& path)
+{
+    const QFileInfo info(path);
+    if (!info.exists())
+        return QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path));
+    if (info.isDir())
+        return QStringLiteral("%1 is a folder, not a family file").arg(QDir::toNativeSeparators(path));
+    return QString();
+}
+
+bool clisaved(const saveoutcome& out)
+{
+    if (!out.saved()) {
+        clifail(out.message);
+        return false;
+    }
+    if (!out.logerror.isEmpty())
+        cliwarn(out.logerror);
+    return true;
+}
+
+loadresult loadfamily(const QString& path, const clisettings& s)
+{
+    flagtable flagdefs;
+    if (!loadflagdefs(*s.store, flagdefs))
+        cliwarn(flagloaderrormessage());
+    loadresult r = loadgedcom(path, flagdefs);
+    if (r.index && !r.index->hashead) {
+        r.index.reset();
+        r.error = QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
+                      .arg(QDir::toNativeSeparators(path));
+    }
+    return r;
+}
+
+void printline(const QString& text)
+{
+    const QByteArray bytes = text.toUtf8() + '\n';
+    std::fwrite(bytes.constData(), 1, static_cast<size_t>(bytes.size()), stdout);
+}
+
+void printjson(const QJsonObject& object)
+{
+    const QByteArray text = QJsonDocument(object).toJson(QJsonDocument::Compact) + '\n';
+    std::fwrite(text.constData(), 1, static_cast<size_t>(text.size()), stdout);
+    std::fflush(stdout);
 }
 
 void jsonobject::key(const char* key)

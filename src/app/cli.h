@@ -6,13 +6,17 @@
 // arguments after its name. It returns the process's exit status: 0 when done,
 // 2 when it could not be (after one line on standard error).
 
+#include "model/loadgedcom.h"
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
+#include "writer/saveroad.h"
 
+#include <QJsonObject>
 #include <QString>
 #include <QStringList>
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -56,6 +60,33 @@ struct clisettings {
     settings values;
 };
 std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error);
+
+// "unknown option A (see quillmark-cli --help)" for the first argument that
+// looks like an option ("-" alone names standard input); "" when none does.
+QString unknownoption(const QStringList& args);
+
+// Reads the arguments of a command that takes family files, the switch
+// --apply and one option NAME VALUE or NAME=VALUE, in the order given. Each
+// value goes to `take`, which returns "" or why it refuses it; `missing` is
+// the message for NAME without a value. "" or the first message.
+QString readapplyargs(const QStringList& args, const QString& name, const QString& missing,
+                      const std::function<QString(const QString& value)>& take, bool* apply, QStringList* files);
+
+// "" when path names a file, else "PATH: no such file" or "PATH is a folder ...".
+QString checkfamilypath(const QString& path);
+
+// True when the change was saved (after a warning when the census log could
+// not be written); false after the reason on standard error.
+bool clisaved(const saveoutcome& out);
+
+// Loads the family file with the census flags of the settings store (a
+// warning when those cannot be read). Without index, and with the message in
+// error, when the file cannot be loaded or has no "0 HEAD" line.
+loadresult loadfamily(const QString& path, const clisettings& s);
+
+// One line of text, or one JSON object on one line, on standard output.
+void printline(const QString& text);
+void printjson(const QJsonObject& object);
 
 // A JSON object written field by field on one line.
 class jsonobject {

@@ -6,7 +6,6 @@
 #include "census/birthdate.h"
 #include "census/censustable.h"
 #include "census/validateentry.h"
-#include "flags/flagtable.h"
 #include "images/imagechoices.h"
 #include "model/dates.h"
 #include "model/loadgedcom.h"
@@ -22,7 +21,6 @@
 #include <QJsonObject>
 
 #include <algorithm>
-#include <cstdio>
 #include <future>
 #include <optional>
 
@@ -285,9 +283,9 @@ int cliaddentry(QStringList args)
             break;
         }
     }
-    for (const QString& a : args)
-        if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-"))
-            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
+    error = unknownoption(args);
+    if (!error.isEmpty())
+        return clifail(error);
     if (args.size() != 1 || entrypath.isEmpty())
         return clifail(QStringLiteral("add-entry needs a family file and an entry: "
                                       "quillmark-cli add-entry FILE --entry ENTRY.json [--settings S.ini]"));
@@ -306,24 +304,18 @@ int cliaddentry(QStringList args)
     if (!cs)
         return clifail(error);
     const settings& s = cs->values;
-    flagtable flagdefs;
-    if (!loadflagdefs(*cs->store, flagdefs))
-        cliwarn(flagloaderrormessage());
 
     // The backup copy is made while the file loads: the copy is mostly the
     // kernel's and the disk's work, the load the processor's. The save road
     // takes it only if the file is still as loaded.
     std::future<backupresult> early =
         std::async(std::launch::async, [&path, folder = s.backupfolder] { return makebackup(path, folder); });
-    loadresult loaded = loadgedcom(path, flagdefs);
+    loadresult loaded = loadfamily(path, *cs);
     const backupresult made = early.get();
     backupguard guard{made.path};
     if (!loaded.index)
         return clifail(loaded.error);
     const gedcomindex& ix = *loaded.index;
-    if (!ix.hashead)
-        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
-                           .arg(QDir::toNativeSeparators(path)));
 
     // The household, looked up in one pass over the individuals.
     QHash<int32_t, int32_t> wanted;
@@ -403,10 +395,8 @@ int cliaddentry(QStringList args)
 
     guard.path.clear(); // the save road uses the backup or removes it
     const saveoutcome out = saveentry(ix, s, entry, &made);
-    if (!out.saved())
-        return clifail(out.message);
-    if (!out.logerror.isEmpty())
-        cliwarn(out.logerror);
+    if (!clisaved(out))
+        return clifailure;
 
     QJsonObject result;
     result.insert(QStringLiteral("backup"), QDir::toNativeSeparators(out.backuppath));
@@ -414,9 +404,7 @@ int cliaddentry(QStringList args)
     result.insert(QStringLiteral("individuals"), static_cast<int>(entry.selection.size()));
     result.insert(QStringLiteral("log"), out.logwritten);
     result.insert(QStringLiteral("images"), static_cast<int>(entry.chosenimages.size()));
-    const QByteArray text = QJsonDocument(result).toJson(QJsonDocument::Compact) + '\n';
-    std::fwrite(text.constData(), 1, static_cast<size_t>(text.size()), stdout);
-    std::fflush(stdout);
+    printjson(result);
     // The process ends here: taking a large index apart would only cost time.
     (void)loaded.index.release();
     return 0;

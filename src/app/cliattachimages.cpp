@@ -4,7 +4,6 @@
 // Existing Sources.
 #include "app/cli.h"
 
-#include "flags/flagtable.h"
 #include "images/imagechoices.h"
 #include "images/sourcedates.h"
 #include "model/loadgedcom.h"
@@ -13,11 +12,9 @@
 #include <QDir>
 #include <QFileInfo>
 #include <QJsonArray>
-#include <QJsonDocument>
 #include <QJsonObject>
 
 #include <algorithm>
-#include <cstdio>
 
 namespace qm {
 
@@ -99,9 +96,9 @@ int cliattachimages(QStringList args)
         if (!error.isEmpty())
             return clifail(error);
     }
-    for (const QString& a : args)
-        if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-"))
-            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
+    error = unknownoption(args);
+    if (!error.isEmpty())
+        return clifail(error);
     if (args.size() != 1 || sourcetext.isEmpty() || asked.empty())
         return clifail(QStringLiteral("attach-images needs a family file, a source and at least one image: quillmark-cli "
                                       "attach-images FILE --source S_NUMBER --image PATH[=TITLE]... --object O_NUMBER..."));
@@ -116,16 +113,10 @@ int cliattachimages(QStringList args)
     if (!cs)
         return clifail(error);
     const settings& s = cs->values;
-    flagtable flagdefs;
-    if (!loadflagdefs(*cs->store, flagdefs))
-        cliwarn(flagloaderrormessage());
-    loadresult loaded = loadgedcom(path, flagdefs);
+    loadresult loaded = loadfamily(path, *cs);
     if (!loaded.index)
         return clifail(loaded.error);
     gedcomindex& ix = *loaded.index;
-    if (!ix.hashead)
-        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
-                           .arg(QDir::toNativeSeparators(path)));
 
     int32_t sourcepos = -1;
     for (size_t i = 0; i < ix.sources.size() && sourcepos < 0; ++i)
@@ -179,10 +170,8 @@ int cliattachimages(QStringList args)
     rq.entry.title = title;
     rq.entry.chosenimages = chosen;
     const saveoutcome out = savechange(ix, s, rq);
-    if (!out.saved())
-        return clifail(out.message);
-    if (!out.logerror.isEmpty())
-        cliwarn(out.logerror);
+    if (!clisaved(out))
+        return clifailure;
 
     QJsonArray objects, added;
     for (const imagechoice& c : chosen)
@@ -193,9 +182,7 @@ int cliattachimages(QStringList args)
     result.insert(QStringLiteral("new_objects"), added);
     result.insert(QStringLiteral("linked_objects"), objects);
     result.insert(QStringLiteral("log"), out.logwritten);
-    const QByteArray text = QJsonDocument(result).toJson(QJsonDocument::Compact) + '\n';
-    std::fwrite(text.constData(), 1, static_cast<size_t>(text.size()), stdout);
-    std::fflush(stdout);
+    printjson(result);
     (void)loaded.index.release();
     return 0;
 }

@@ -3,13 +3,11 @@
 #include "app/cli.h"
 
 #include "flags/flagcheck.h"
-#include "flags/flagtable.h"
 #include "model/loadgedcom.h"
 #include "platform/encoding.h"
 #include "writer/saveroad.h"
 
 #include <QDir>
-#include <QFileInfo>
 
 #include <cstdio>
 #include <map>
@@ -18,12 +16,6 @@
 namespace qm {
 
 namespace {
-
-void printline(const QString& text)
-{
-    const QByteArray bytes = text.toUtf8() + '\n';
-    std::fwrite(bytes.constData(), 1, static_cast<size_t>(bytes.size()), stdout);
-}
 
 // "UK", "USA", "Ireland" or "Canada" in any letter case, in its own spelling; "" otherwise.
 QString censuscountry(const QString& text)
@@ -50,57 +42,35 @@ int cliflagcheck(QStringList args)
     bool apply = false;
     std::map<std::string, QString> countryfor; // place key -> country
     QStringList files;
-    static const QString countryoption = QStringLiteral("--country-for");
-    for (qsizetype i = 0; i < args.size(); ++i) {
-        const QString& a = args[i];
-        QString answer;
-        if (a == QLatin1String("--apply")) {
-            apply = true;
-            continue;
-        }
-        if (a == countryoption) {
-            if (i + 1 >= args.size())
-                return clifail(QStringLiteral("--country-for needs PLACE=COUNTRY"));
-            answer = args[++i];
-        } else if (a.startsWith(countryoption + QLatin1Char('='))) {
-            answer = a.mid(countryoption.size() + 1);
-        } else if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-")) {
-            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
-        } else {
-            files.push_back(a);
-            continue;
-        }
+    const auto takeanswer = [&countryfor](const QString& answer) {
         // The country follows the last "=": place names may hold one, countries never do.
         const qsizetype eq = answer.lastIndexOf(QLatin1Char('='));
         const QString country = eq < 0 ? QString() : censuscountry(answer.mid(eq + 1).trimmed());
         if (country.isEmpty())
-            return clifail(QStringLiteral("--country-for %1: give PLACE=COUNTRY with COUNTRY one of UK, USA, "
-                                          "Ireland, Canada")
-                               .arg(answer));
+            return QStringLiteral("--country-for %1: give PLACE=COUNTRY with COUNTRY one of UK, USA, "
+                                  "Ireland, Canada")
+                .arg(answer);
         countryfor[placekey(u8(answer.left(eq)))] = country;
-    }
+        return QString();
+    };
+    error = readapplyargs(args, QStringLiteral("--country-for"), QStringLiteral("--country-for needs PLACE=COUNTRY"),
+                          takeanswer, &apply, &files);
+    if (!error.isEmpty())
+        return clifail(error);
     if (files.size() != 1)
         return clifail(usage());
     const QString path = files.front();
-    const QFileInfo info(path);
-    if (!info.exists())
-        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
-    if (info.isDir())
-        return clifail(QStringLiteral("%1 is a folder, not a family file").arg(QDir::toNativeSeparators(path)));
+    error = checkfamilypath(path);
+    if (!error.isEmpty())
+        return clifail(error);
 
     const auto s = opensettings(inipath, &error);
     if (!s)
         return clifail(error);
-    flagtable flagdefs;
-    if (!loadflagdefs(*s->store, flagdefs))
-        cliwarn(flagloaderrormessage());
-    loadresult r = loadgedcom(path, flagdefs);
+    loadresult r = loadfamily(path, *s);
     if (!r.index)
         return clifail(r.error);
     gedcomindex& ix = *r.index;
-    if (!ix.hashead)
-        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
-                           .arg(QDir::toNativeSeparators(path)));
 
     // The country question is answered from --country-for, or the check fails naming the event.
     QString unanswered;
@@ -142,10 +112,8 @@ int cliflagcheck(QStringList args)
     request.mode = rewritemode::flagchanges;
     request.flagchanges = check.changes;
     const saveoutcome out = savechange(ix, s->values, request);
-    if (!out.saved())
-        return clifail(out.message);
-    if (!out.logerror.isEmpty())
-        cliwarn(out.logerror);
+    if (!clisaved(out))
+        return clifailure;
     printline(QStringLiteral("Backup: ") + QDir::toNativeSeparators(out.backuppath));
     std::fflush(stdout);
     return 0;

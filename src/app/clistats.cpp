@@ -1,11 +1,8 @@
 // quillmark-cli stats: loads a family file and prints what the index holds.
 #include "app/cli.h"
 
-#include "flags/flagtable.h"
 #include "model/loadgedcom.h"
 
-#include <QDir>
-#include <QFileInfo>
 
 #include <cstdio>
 
@@ -16,32 +13,23 @@ int clistats(QStringList args)
     QString inipath, error;
     if (!takesettingsoption(args, &inipath, &error))
         return clifail(error);
-    for (const QString& a : args)
-        if (a.startsWith(QLatin1Char('-')) && a != QLatin1String("-"))
-            return clifail(QStringLiteral("unknown option %1 (see quillmark-cli --help)").arg(a));
+    error = unknownoption(args);
+    if (!error.isEmpty())
+        return clifail(error);
     if (args.size() != 1)
         return clifail(QStringLiteral("stats needs one family file: quillmark-cli stats FILE [--settings S.ini]"));
     const QString path = args.front();
-    const QFileInfo info(path);
-    if (!info.exists())
-        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
-    if (info.isDir())
-        return clifail(QStringLiteral("%1 is a folder, not a family file").arg(QDir::toNativeSeparators(path)));
+    error = checkfamilypath(path);
+    if (!error.isEmpty())
+        return clifail(error);
 
     const auto s = opensettings(inipath, &error);
     if (!s)
         return clifail(error);
-    flagtable flagdefs;
-    if (!loadflagdefs(*s->store, flagdefs))
-        cliwarn(flagloaderrormessage());
-
-    loadresult r = loadgedcom(path, flagdefs);
+    loadresult r = loadfamily(path, *s);
     if (!r.index)
         return clifail(r.error);
     const gedcomindex& ix = *r.index;
-    if (!ix.hashead)
-        return clifail(QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
-                           .arg(QDir::toNativeSeparators(path)));
 
     jsonobject j;
     j.add("individuals", static_cast<int64_t>(ix.people.size()));
