@@ -3,44 +3,22 @@
 // file each time the dialog opens, and the details of the source cited most
 // (the longest list of individuals the dialog fills).
 #include "images/sourcedates.h"
-#include "model/loadgedcom.h"
+
+#include "benchfiles.h"
 
 #include <QFileInfo>
 
-#include <benchmark/benchmark.h>
-
-#include <cstdlib>
-#include <map>
-#include <memory>
-
 namespace {
 
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
-}
-
-qm::gedcomindex* indexof(const char* name)
-{
-    static std::map<std::string, std::unique_ptr<qm::gedcomindex>> loaded;
-    auto& slot = loaded[name];
-    if (!slot) {
-        const QString path = benchfile(name);
-        if (!QFileInfo(path).isFile())
-            return nullptr;
-        slot = qm::loadgedcom(path, {}).index;
-    }
-    return slot.get();
-}
+using qmbench::benchfile;
+using qmbench::benchfilefound;
+using qmbench::benchindex;
 
 void censusdates(benchmark::State& state, const char* name)
 {
-    qm::gedcomindex* ix = indexof(name);
-    if (!ix) {
-        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+    qm::gedcomindex* ix = benchindex(name);
+    if (!benchfilefound(state, ix != nullptr, name))
         return;
-    }
     size_t known = 0;
     for (auto _ : state) {
         // Each opening after a load starts from sources with nothing settled.
@@ -62,7 +40,7 @@ void censusdates(benchmark::State& state, const char* name)
 
 void selectsource(benchmark::State& state, const char* name)
 {
-    const qm::gedcomindex* ix = indexof(name);
+    const qm::gedcomindex* ix = benchindex(name);
     if (!ix || ix->sources.empty()) {
         state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
         return;

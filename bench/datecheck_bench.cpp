@@ -2,46 +2,20 @@
 // folder is QM_BENCH_DIR, else /work/gen): the analysis with its proposals,
 // run when the dialog opens and at each country chosen, and the details of the
 // most frequent date (the individuals of the longest list the dialog fills).
-#include "model/loadgedcom.h"
 #include "tools/datecheck.h"
 
-#include <QFileInfo>
-
-#include <benchmark/benchmark.h>
-
-#include <cstdlib>
-#include <map>
-#include <memory>
+#include "benchfiles.h"
 
 namespace {
 
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
-}
-
-// Each file is loaded once for all the benchmarks that use it.
-const qm::gedcomindex* indexof(const char* name)
-{
-    static std::map<std::string, std::unique_ptr<qm::gedcomindex>> loaded;
-    auto& slot = loaded[name];
-    if (!slot) {
-        const QString path = benchfile(name);
-        if (!QFileInfo(path).isFile())
-            return nullptr;
-        slot = qm::loadgedcom(path, {}).index;
-    }
-    return slot.get();
-}
+using qmbench::benchfilefound;
+using qmbench::benchindex;
 
 void analysis(benchmark::State& state, const char* name)
 {
-    const qm::gedcomindex* ix = indexof(name);
-    if (!ix) {
-        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+    const qm::gedcomindex* ix = benchindex(name);
+    if (!benchfilefound(state, ix != nullptr, name))
         return;
-    }
     size_t dates = 0;
     for (auto _ : state) {
         qm::datecheckstate check(*ix, qm::dateorder::dmy);
@@ -57,11 +31,9 @@ void analysis(benchmark::State& state, const char* name)
 
 void details(benchmark::State& state, const char* name)
 {
-    const qm::gedcomindex* ix = indexof(name);
-    if (!ix) {
-        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+    const qm::gedcomindex* ix = benchindex(name);
+    if (!benchfilefound(state, ix != nullptr, name))
         return;
-    }
     qm::datecheckstate check(*ix, qm::dateorder::dmy);
     check.choosecountry(QStringLiteral("UK"));
     int most = 0;

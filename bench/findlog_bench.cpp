@@ -3,52 +3,28 @@
 // individual for its relatives), the dialog's list of a file just under the
 // people-list limit, a name search that misses, and paging through a large log.
 #include "log/logpages.h"
-#include "model/loadgedcom.h"
 #include "tools/findindividual.h"
+
+#include "benchfiles.h"
 
 #include <QFile>
 #include <QFileInfo>
 #include <QTemporaryDir>
 
-#include <benchmark/benchmark.h>
-
-#include <cstdlib>
-#include <map>
-#include <memory>
-
 namespace {
 
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
-}
-
-qm::gedcomindex* indexof(const char* name)
-{
-    static std::map<std::string, std::unique_ptr<qm::gedcomindex>> loaded;
-    auto& slot = loaded[name];
-    if (!slot) {
-        const QString path = benchfile(name);
-        if (!QFileInfo(path).isFile())
-            return nullptr;
-        slot = qm::loadgedcom(path, {}).index;
-    }
-    return slot.get();
-}
+using qmbench::benchfilefound;
+using qmbench::benchindex;
 
 bool absent(benchmark::State& state, const qm::gedcomindex* ix, const char* name)
 {
-    if (ix && !ix->people.empty())
-        return false;
-    state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
-    return true;
+    return !benchfilefound(state, ix && !ix->people.empty(), name);
 }
 
 // Showing the individual in the middle of the file: census lines and relatives.
 void showperson(benchmark::State& state, const char* name)
 {
-    const qm::gedcomindex* ix = indexof(name);
+    const qm::gedcomindex* ix = benchindex(name);
     if (absent(state, ix, name))
         return;
     const auto k = static_cast<int32_t>(ix->people.size() / 2);
@@ -65,7 +41,7 @@ void showperson(benchmark::State& state, const char* name)
 // The dialog's list at opening, and a name search that looks at every entry.
 void openlist(benchmark::State& state, const char* name)
 {
-    const qm::gedcomindex* ix = indexof(name);
+    const qm::gedcomindex* ix = benchindex(name);
     if (absent(state, ix, name))
         return;
     size_t rows = 0;

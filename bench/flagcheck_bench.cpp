@@ -4,23 +4,16 @@
 // every individual, as the silent check after a load does when the flags are
 // in step (the silent check builds no rows, so this bounds it).
 #include "flags/flagcheck.h"
-#include "model/loadgedcom.h"
 
-#include <QFileInfo>
+#include "benchfiles.h"
 
-#include <benchmark/benchmark.h>
+#include <string>
 
-#include <cstdlib>
-#include <map>
-#include <memory>
 
 namespace {
 
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
-}
+using qmbench::benchfilefound;
+using qmbench::benchindex;
 
 qm::flagtable yearflags()
 {
@@ -36,26 +29,11 @@ qm::flagtable yearflags()
     return t;
 }
 
-qm::gedcomindex* indexof(const char* name)
-{
-    static std::map<std::string, std::unique_ptr<qm::gedcomindex>> loaded;
-    auto& slot = loaded[name];
-    if (!slot) {
-        const QString path = benchfile(name);
-        if (!QFileInfo(path).isFile())
-            return nullptr;
-        slot = qm::loadgedcom(path, yearflags()).index;
-    }
-    return slot.get();
-}
-
 void interactive(benchmark::State& state, const char* name)
 {
-    qm::gedcomindex* ix = indexof(name);
-    if (!ix) {
-        state.SkipWithError((benchfile(name).toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+    qm::gedcomindex* ix = benchindex(name, yearflags());
+    if (!benchfilefound(state, ix != nullptr, name))
         return;
-    }
     size_t changes = 0;
     for (auto _ : state) {
         const qm::flagcheckresult r = qm::checkflags(*ix, true, QStringLiteral("UK"));
