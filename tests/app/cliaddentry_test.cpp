@@ -1,6 +1,7 @@
 // quillmark-cli add-entry, run as a process on copies of family files.
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
+#include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QDir>
@@ -8,7 +9,6 @@
 #include <QFileInfo>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QProcess>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
@@ -40,16 +40,12 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir.isValid());
-        QDir(dir.path()).mkdir(QStringLiteral("backups"));
         file = dir.filePath(QStringLiteral("family.ged"));
         writefile(file, family);
         ini = dir.filePath(QStringLiteral("settings.ini"));
         // A complete store: an absent value would send its group and all later
         // ones back to their defaults.
-        qm::settings s = qm::defaultsettings();
-        s.backupfolder = dir.filePath(QStringLiteral("backups"));
-        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
-        qm::savesettings(*qm::settingsstore::onfile(ini), s);
+        qm::savesettings(*qm::settingsstore::onfile(ini), qmtest::clitestsettings(dir.path()));
     }
 
     void setting(const QString& name, const QString& value)
@@ -59,27 +55,14 @@ protected:
         store->sync();
     }
 
-    // The program's own folder lies inside the test's folder, should anything
-    // fall back to it.
-    static void start(QProcess& p, const QStringList& args, const QString& home)
-    {
-        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
-        env.insert(QStringLiteral("XDG_DATA_HOME"), home);
-        p.setProcessEnvironment(env);
-        p.start(QStringLiteral(QM_CLI_PATH), args);
-        p.waitForFinished(60000);
-    }
-
     run addentry(const std::string& json, const QString& target = QString())
     {
         const QString entry = dir.filePath(QStringLiteral("entry.json"));
         writefile(entry, json);
-        QProcess p;
-        start(p,
-              {QStringLiteral("add-entry"), target.isEmpty() ? file : target, QStringLiteral("--entry"), entry,
-               QStringLiteral("--settings"), ini},
-              dir.path());
-        return {p.exitCode(), p.readAllStandardOutput().toStdString(), p.readAllStandardError().toStdString()};
+        const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), target.isEmpty() ? file : target,
+                                                 QStringLiteral("--entry"), entry, QStringLiteral("--settings"), ini},
+                                                dir.path());
+        return {r.status, r.out.toStdString(), r.err.toStdString()};
     }
 
     // A refused entry: status 2, the message on standard error, nothing written.
@@ -188,10 +171,9 @@ TEST_F(CliAddEntry, RefusesBadFilesAndArguments)
     EXPECT_EQ(addentry("{}", dir.filePath(QStringLiteral("none.ged"))).status, 2);
     EXPECT_EQ(readfile(file), family);
 
-    QProcess p;
-    start(p, {QStringLiteral("add-entry"), file}, dir.path());
-    EXPECT_EQ(p.exitCode(), 2);
-    EXPECT_NE(p.readAllStandardError().indexOf("--entry ENTRY.json"), -1);
+    const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), file}, dir.path());
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.indexOf("--entry ENTRY.json"), -1);
 }
 
 TEST_F(CliAddEntry, ExampleEntryWorksOnSample)

@@ -1,6 +1,7 @@
 // quillmark-cli attach-images, run as a process on copies of family files.
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
+#include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QDir>
@@ -8,7 +9,6 @@
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QProcess>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
@@ -38,13 +38,10 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir.isValid());
-        QDir(dir.path()).mkdir(QStringLiteral("backups"));
         file = dir.filePath(QStringLiteral("family.ged"));
         writefile(file, family);
         ini = dir.filePath(QStringLiteral("settings.ini"));
-        qm::settings s = qm::defaultsettings();
-        s.backupfolder = dir.filePath(QStringLiteral("backups"));
-        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+        qm::settings s = qmtest::clitestsettings(dir.path());
         s.asid = false;
         const auto store = qm::settingsstore::onfile(ini);
         qm::savesettings(*store, s);
@@ -62,15 +59,10 @@ protected:
 
     run attach(const QStringList& args)
     {
-        QProcess p;
-        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
-        env.insert(QStringLiteral("XDG_DATA_HOME"), dir.path());
-        p.setProcessEnvironment(env);
-        p.start(QStringLiteral(QM_CLI_PATH),
-                QStringList{QStringLiteral("attach-images"), file} + args
-                    + QStringList{QStringLiteral("--settings"), ini});
-        p.waitForFinished(60000);
-        return {p.exitCode(), p.readAllStandardOutput().toStdString(), p.readAllStandardError().toStdString()};
+        const qmtest::clirun r = qmtest::runcli(QStringList{QStringLiteral("attach-images"), file} + args
+                                                    + QStringList{QStringLiteral("--settings"), ini},
+                                                dir.path());
+        return {r.status, r.out.toStdString(), r.err.toStdString()};
     }
 
     // Refused: status 2, the message on standard error, nothing written.

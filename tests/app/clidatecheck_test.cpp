@@ -4,11 +4,11 @@
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
 
+#include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QDir>
 #include <QFile>
-#include <QProcess>
 #include <QRegularExpression>
 #include <QTemporaryDir>
 
@@ -29,31 +29,15 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir.isValid());
-        QDir(dir.path()).mkdir(QStringLiteral("backups"));
         ini = dir.filePath(QStringLiteral("settings.ini"));
-        qm::settings s = qm::defaultsettings();
-        s.backupfolder = dir.filePath(QStringLiteral("backups"));
-        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
-        qm::savesettings(*qm::settingsstore::onfile(ini), s);
+        qm::savesettings(*qm::settingsstore::onfile(ini), qmtest::clitestsettings(dir.path()));
     }
 
     run datecheck(const QStringList& args) const
     {
-        QProcess p;
-        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
-        env.insert(QStringLiteral("HOME"), dir.path());
-        env.insert(QStringLiteral("XDG_DATA_HOME"), dir.filePath(QStringLiteral("data")));
-        env.insert(QStringLiteral("XDG_CONFIG_HOME"), dir.filePath(QStringLiteral("config")));
-        p.setProcessEnvironment(env);
-        p.start(QStringLiteral(QM_CLI_PATH),
-                QStringList{QStringLiteral("date-check")} + args + QStringList{QStringLiteral("--settings"), ini});
-        run r;
-        if (!p.waitForFinished(120000) || p.exitStatus() != QProcess::NormalExit)
-            return r;
-        r.status = p.exitCode();
-        r.out = QString::fromUtf8(p.readAllStandardOutput());
-        r.err = p.readAllStandardError();
-        return r;
+        const qmtest::clirun r = qmtest::runcli(
+            QStringList{QStringLiteral("date-check")} + args + QStringList{QStringLiteral("--settings"), ini}, dir.path());
+        return {r.status, QString::fromUtf8(r.out), r.err};
     }
 
     // A copy of the sample with some census dates changed.

@@ -2,11 +2,11 @@
 #include "flags/flagtable.h"
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
+#include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QDir>
 #include <QFileInfo>
-#include <QProcess>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
@@ -47,15 +47,11 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir.isValid());
-        QDir(dir.path()).mkdir(QStringLiteral("backups"));
         file = dir.filePath(QStringLiteral("family.ged"));
         writefile(file, family);
         ini = dir.filePath(QStringLiteral("settings.ini"));
-        qm::settings s = qm::defaultsettings();
-        s.backupfolder = dir.filePath(QStringLiteral("backups"));
-        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
         auto store = qm::settingsstore::onfile(ini);
-        qm::savesettings(*store, s);
+        qm::savesettings(*store, qmtest::clitestsettings(dir.path()));
         qm::saveflagdefs(*store, {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
                                   flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
                                   flag("__CENSUS_1881", "Census 1881", "1881", "UK")});
@@ -64,19 +60,16 @@ protected:
 
     run cli(QStringList args) const
     {
-        QProcess p;
         args.prepend(QStringLiteral("flag-check"));
         args << QStringLiteral("--settings") << ini;
-        p.start(QStringLiteral(QM_CLI_PATH), args);
+        const qmtest::clirun c = qmtest::runcli(args);
         run r;
-        if (!p.waitForFinished(60000))
-            return r;
-        r.status = p.exitCode();
-        QString out = QString::fromUtf8(p.readAllStandardOutput());
+        r.status = c.status;
+        QString out = QString::fromUtf8(c.out);
         if (out.endsWith(QLatin1Char('\n')))
             out.chop(1);
         r.out = out.split(QLatin1Char('\n'));
-        r.err = p.readAllStandardError().toStdString();
+        r.err = c.err.toStdString();
         return r;
     }
 

@@ -2,40 +2,25 @@
 #include "flags/flagtable.h"
 #include "platform/settingsstore.h"
 
+#include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QProcess>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
 
 namespace {
 
-struct run {
-    int status = -1;
-    QByteArray out, err;
-};
-
-run cli(const QStringList& args)
-{
-    QProcess p;
-    p.start(QStringLiteral(QM_CLI_PATH), args);
-    run r;
-    if (!p.waitForFinished(60000) || p.exitStatus() != QProcess::NormalExit)
-        return r;
-    r.status = p.exitCode();
-    r.out = p.readAllStandardOutput();
-    r.err = p.readAllStandardError();
-    return r;
-}
+using run = qmtest::clirun;
+using qmtest::runcli;
 
 class CliStats : public ::testing::Test {
 protected:
     run stats(const QString& path, const QStringList& more = {}) const
     {
-        return cli(QStringList{QStringLiteral("stats"), path} + more + QStringList{QStringLiteral("--settings"), ini});
+        return runcli(QStringList{QStringLiteral("stats"), path} + more + QStringList{QStringLiteral("--settings"), ini});
     }
 
 protected:
@@ -95,7 +80,7 @@ TEST_F(CliStats, PrintsTheIndexAsJson)
 
     // The option may come first; an 8-bit file without a CHAR line is Windows-1252.
     const QString ansi = file("ansi.ged", "0 HEAD\n0 @I1@ INDI\n1 NAME Ren\xE9 /X/\n");
-    const run a = cli({QStringLiteral("stats"), QStringLiteral("--settings=") + ini, ansi});
+    const run a = runcli({QStringLiteral("stats"), QStringLiteral("--settings=") + ini, ansi});
     ASSERT_EQ(a.status, 0) << a.err.toStdString();
     const QJsonObject ao = QJsonDocument::fromJson(a.out).object();
     for (const auto& [key, value] : std::vector<std::pair<const char*, QJsonValue>>{
@@ -112,24 +97,24 @@ TEST_F(CliStats, UnusableFilesFailWithOneLine)
     expectfailure(r);
     EXPECT_TRUE(r.err.contains("0 HEAD")) << r.err.toStdString();
     expectfailure(stats(file("empty.ged", "")));
-    expectfailure(cli({QStringLiteral("stats"), nohead, QStringLiteral("--settings"),
+    expectfailure(runcli({QStringLiteral("stats"), nohead, QStringLiteral("--settings"),
                        dir.filePath(QStringLiteral("nosuch.ini"))}));
 }
 
 TEST_F(CliStats, UsageMistakesAndHelp)
 {
     const QString ged = file("f.ged", "0 HEAD\n");
-    expectfailure(cli({QStringLiteral("stats")}));
+    expectfailure(runcli({QStringLiteral("stats")}));
     expectfailure(stats(ged, {ged}));
-    expectfailure(cli({QStringLiteral("stats"), ged, QStringLiteral("--settings")}));
+    expectfailure(runcli({QStringLiteral("stats"), ged, QStringLiteral("--settings")}));
     expectfailure(stats(ged, {QStringLiteral("--verbose")}));
-    expectfailure(cli({QStringLiteral("frobnicate")}));
+    expectfailure(runcli({QStringLiteral("frobnicate")}));
 
-    const run help = cli({QStringLiteral("--help")});
+    const run help = runcli({QStringLiteral("--help")});
     EXPECT_EQ(help.status, 0);
     EXPECT_TRUE(help.out.contains("quillmark-cli stats FILE [--settings S.ini]")) << help.out.toStdString();
-    const run statshelp = cli({QStringLiteral("stats"), QStringLiteral("--help")});
+    const run statshelp = runcli({QStringLiteral("stats"), QStringLiteral("--help")});
     EXPECT_EQ(statshelp.status, 0);
     EXPECT_TRUE(statshelp.out.contains("stats FILE"));
-    EXPECT_EQ(cli({}).status, 2);
+    EXPECT_EQ(runcli({}).status, 2);
 }

@@ -2,13 +2,13 @@
 // multimedia records linked to the entry's new source, and the refusals.
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
+#include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QDir>
 #include <QFile>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QProcess>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
@@ -23,17 +23,13 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir.isValid());
-        QDir(dir.path()).mkdir(QStringLiteral("backups"));
         QDir(dir.path()).mkdir(QStringLiteral("scans"));
         file = dir.filePath(QStringLiteral("sample.ged"));
         ASSERT_TRUE(QFile::copy(qmtest::samplefile(), file));
         QFile(file).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
         before = readfile(file);
         ini = dir.filePath(QStringLiteral("settings.ini"));
-        qm::settings s = qm::defaultsettings();
-        s.backupfolder = dir.filePath(QStringLiteral("backups"));
-        s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
-        qm::savesettings(*qm::settingsstore::onfile(ini), s);
+        qm::savesettings(*qm::settingsstore::onfile(ini), qmtest::clitestsettings(dir.path()));
         for (const char* name : {"a.png", "b.jpg", "setup.exe"})
             writefile(scan(name), "not really an image");
     }
@@ -50,14 +46,10 @@ protected:
         const QString entry = dir.filePath(QStringLiteral("entry.json"));
         writefile(entry, R"({"year": 1881, "place": "Hebden Bridge", "reference": "RG11/4426/52",
                              "individuals": [{"id": 11, "age": "28"}], "images": )" + images + "}");
-        QProcess p;
-        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
-        env.insert(QStringLiteral("XDG_DATA_HOME"), dir.path());
-        p.setProcessEnvironment(env);
-        p.start(QStringLiteral(QM_CLI_PATH), {QStringLiteral("add-entry"), file, QStringLiteral("--entry"), entry,
-                                              QStringLiteral("--settings"), ini});
-        p.waitForFinished(60000);
-        return {p.exitCode(), p.readAllStandardOutput().toStdString(), p.readAllStandardError().toStdString()};
+        const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), file, QStringLiteral("--entry"), entry,
+                                                 QStringLiteral("--settings"), ini},
+                                                dir.path());
+        return {r.status, r.out.toStdString(), r.err.toStdString()};
     }
 
     void expectrefused(const std::string& images, const std::string& message)

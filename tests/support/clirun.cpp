@@ -1,0 +1,39 @@
+#include "support/clirun.h"
+
+#include <QDir>
+#include <QProcess>
+#include <QProcessEnvironment>
+
+namespace qmtest {
+
+clirun runprogram(const QString& program, const QStringList& args, const QString& home)
+{
+    QProcess p;
+    if (!home.isEmpty()) {
+        QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+        env.insert(QStringLiteral("HOME"), home);
+        env.insert(QStringLiteral("XDG_DATA_HOME"), QDir(home).filePath(QStringLiteral("data")));
+        env.insert(QStringLiteral("XDG_CONFIG_HOME"), QDir(home).filePath(QStringLiteral("config")));
+        p.setProcessEnvironment(env);
+    }
+    p.start(program, args);
+    clirun r;
+    if (!p.waitForFinished(120000) || p.exitStatus() != QProcess::NormalExit)
+        return r;
+    r.status = p.exitCode();
+    r.out = p.readAllStandardOutput();
+    r.err = p.readAllStandardError();
+    return r;
+}
+
+qm::settings clitestsettings(const QString& folder)
+{
+    const QDir dir(folder);
+    dir.mkdir(QStringLiteral("backups"));
+    qm::settings s = qm::defaultsettings();
+    s.backupfolder = dir.filePath(QStringLiteral("backups"));
+    s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+    return s;
+}
+
+} // namespace qmtest

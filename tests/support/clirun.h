@@ -1,0 +1,34 @@
+#pragma once
+// Running quillmark-cli as a user would, for the tests of its commands.
+
+#include "settings/settings.h"
+
+#include <QByteArray>
+#include <QString>
+#include <QStringList>
+
+namespace qmtest {
+
+// What one run gave: the exit status (-1 when the program did not end
+// normally within the time allowed) and its two outputs.
+struct clirun {
+    int status = -1;
+    QByteArray out, err;
+};
+
+// Runs `program` with args. With `home`, the user's folders (HOME, data and
+// configuration) lie inside it, so that nothing falls back on the real ones.
+clirun runprogram(const QString& program, const QStringList& args, const QString& home = QString());
+
+#ifdef QM_CLI_PATH
+inline clirun runcli(const QStringList& args, const QString& home = QString())
+{
+    return runprogram(QStringLiteral(QM_CLI_PATH), args, home);
+}
+#endif
+
+// Default settings that keep a test's backups in folder/backups (made here)
+// and its census log in folder/censuslog.txt.
+qm::settings clitestsettings(const QString& folder);
+
+} // namespace qmtest
