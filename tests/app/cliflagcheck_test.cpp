@@ -4,6 +4,7 @@
 #include "settings/settings.h"
 #include "support/clirun.h"
 #include "support/testfiles.h"
+#include "support/testflags.h"
 
 #include <QDir>
 #include <QFileInfo>
@@ -32,16 +33,6 @@ struct run {
     std::string err;
 };
 
-qm::flagrec flag(const char* code, const char* name, const char* date, const char* country)
-{
-    qm::flagrec f;
-    f.code = code;
-    f.name = name;
-    f.date = date;
-    f.country = country;
-    return f;
-}
-
 class CliFlagCheck : public ::testing::Test {
 protected:
     void SetUp() override
@@ -52,9 +43,7 @@ protected:
         ini = dir.filePath(QStringLiteral("settings.ini"));
         auto store = qm::settingsstore::onfile(ini);
         qm::savesettings(*store, qmtest::clitestsettings(dir.path()));
-        qm::saveflagdefs(*store, {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
-                                  flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
-                                  flag("__CENSUS_1881", "Census 1881", "1881", "UK")});
+        qm::saveflagdefs(*store, qmtest::testflagdefs());
         store->sync();
     }
 

@@ -6,6 +6,7 @@
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
 #include "settings/settings.h"
+#include "support/testflags.h"
 #include "writer/rewritefile.h"
 
 #include <gtest/gtest.h>
@@ -14,26 +15,10 @@
 #include <string>
 
 using namespace qm;
+using qmtest::testflag;
+using qmtest::testflagdefs;
 
 namespace {
-
-flagrec flag(const char* code, const char* name, const char* date, const char* country)
-{
-    flagrec f;
-    f.code = code;
-    f.name = name;
-    f.date = date;
-    f.country = country;
-    return f;
-}
-
-// UK and Ireland share the 1901 census day; the 1881 flag is a year flag.
-flagtable definitions()
-{
-    return {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
-            flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
-            flag("__CENSUS_1881", "Census 1881", "1881", "UK")};
-}
 
 std::string indi(int id, const char* name, const std::string& body)
 {
@@ -61,7 +46,7 @@ std::string family(const std::string& records)
     return "0 HEAD\r\n1 CHAR ANSI\r\n" + records + "0 TRLR\r\n";
 }
 
-std::unique_ptr<gedcomindex> load(const std::string& bytes, const flagtable& defs = definitions())
+std::unique_ptr<gedcomindex> load(const std::string& bytes, const flagtable& defs = testflagdefs())
 {
     return loadgedcombytes(bytes, defs);
 }
@@ -85,14 +70,14 @@ struct answers {
 
 TEST(FlagMatch, ExactDateOrFourCharacterYearWithin)
 {
-    const flagrec day = flag("__D", "Day", "3 APR 1881", "UK");
+    const flagrec day = testflag("__D", "Day", "3 APR 1881", "UK");
     EXPECT_TRUE(eventmatchesflag("3 APR 1881", day));
     EXPECT_FALSE(eventmatchesflag("4 APR 1881", day));
     EXPECT_FALSE(eventmatchesflag("3 apr 1881", day)); // case counts
     EXPECT_FALSE(eventmatchesflag("1881", day));
     EXPECT_FALSE(eventmatchesflag("ABT 3 APR 1881", day));
 
-    const flagrec year = flag("__Y", "Year", "1881", "Canada"); // the country plays no part
+    const flagrec year = testflag("__Y", "Year", "1881", "Canada"); // the country plays no part
     EXPECT_TRUE(eventmatchesflag("3 APR 1881", year));
     EXPECT_TRUE(eventmatchesflag("1881", year));
     EXPECT_TRUE(eventmatchesflag("ABT 1881", year));
@@ -100,9 +85,9 @@ TEST(FlagMatch, ExactDateOrFourCharacterYearWithin)
     EXPECT_FALSE(eventmatchesflag("", year));
 
     // Only a four-character date is looked for within the event's.
-    EXPECT_FALSE(eventmatchesflag("3 APR 1881", flag("__M", "Month", "APR 1881", "UK")));
-    EXPECT_FALSE(eventmatchesflag("", flag("__E", "Empty", "", "UK")));
-    EXPECT_FALSE(eventmatchesflag("1881", flag("__E", "Empty", "", "UK")));
+    EXPECT_FALSE(eventmatchesflag("3 APR 1881", testflag("__M", "Month", "APR 1881", "UK")));
+    EXPECT_FALSE(eventmatchesflag("", testflag("__E", "Empty", "", "UK")));
+    EXPECT_FALSE(eventmatchesflag("1881", testflag("__E", "Empty", "", "UK")));
 }
 
 class FlagCheck : public ::testing::Test {

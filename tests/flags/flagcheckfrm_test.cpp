@@ -9,6 +9,7 @@
 #include "flags/flagtable.h"
 #include "model/loadgedcom.h"
 #include "support/mainfrmfixture.h"
+#include "support/testflags.h"
 #include "writer/saveroad.h"
 
 #include <QCheckBox>
@@ -21,23 +22,6 @@ using namespace qm;
 using namespace qmtest;
 
 namespace {
-
-flagrec flag(const char* code, const char* name, const char* date, const char* country)
-{
-    flagrec f;
-    f.code = code;
-    f.name = name;
-    f.date = date;
-    f.country = country;
-    return f;
-}
-
-flagtable definitions()
-{
-    return {flag("__CENSUS_UK_1901", "Census UK 1901", "31 MAR 1901", "UK"),
-            flag("__CENSUS_IRELAN", "Census Ireland 1901", "31 MAR 1901", "Ireland"),
-            flag("__CENSUS_1881", "Census 1881", "1881", "UK")};
-}
 
 // John lacks the 1881 flag; Mary holds it with no census event; Ann and Pat
 // were counted on the 1901 census day in Dublin (UK or Ireland?).
@@ -90,6 +74,13 @@ class flagcheckfrmtest : public QObject {
         return path;
     }
 
+    // `bytes` written to `file` and loaded with the flag definitions.
+    static loadresult loadedfile(const QString& file, const QByteArray& bytes)
+    {
+        writefile(file, bytes.toStdString());
+        return loadgedcom(file, testflagdefs());
+    }
+
     int backupcount() const { return static_cast<int>(QDir(backups).entryList(QDir::Files).size()); }
 
     // Starts the main window on `file` with the flag definitions in its store;
@@ -100,7 +91,7 @@ class flagcheckfrmtest : public QObject {
         auto r = std::make_unique<session>(files.ini());
         savesettings(*r->store, s);
         saveflagsettings(*r->store, s);
-        saveflagdefs(*r->store, definitions());
+        saveflagdefs(*r->store, testflagdefs());
         r->store->sync();
         r->make();
         r->prompts.expect(answer::no, QStringLiteral("by default"));
@@ -305,7 +296,7 @@ private slots:
         auto store = settingsstore::onfile(files.ini());
         scriptedprompts prompts;
         settings s = checking();
-        std::unique_ptr<gedcomindex> ix = loadgedcombytes("0 HEAD\r\n0 TRLR\r\n", definitions());
+        std::unique_ptr<gedcomindex> ix = loadgedcombytes("0 HEAD\r\n0 TRLR\r\n", testflagdefs());
         {
             flagcheckfrm d(*ix, s, *store, prompts);
             QCOMPARE(d.objectName(), QStringLiteral("flagcheckfrm"));
@@ -327,11 +318,7 @@ private slots:
         // A backup that cannot be made: the message, the dialog stays, nothing written.
         const QString file = files.filepath(QStringLiteral("john.ged"));
         const QByteArray john = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 3 APR 1881\r\n0 TRLR\r\n";
-        QFile f(file);
-        QVERIFY(f.open(QIODevice::WriteOnly));
-        f.write(john);
-        f.close();
-        loadresult loaded = loadgedcom(file, definitions());
+        loadresult loaded = loadedfile(file, john);
         QVERIFY(loaded.index);
         s.backupfolder = file + QStringLiteral("/backups"); // under a file: cannot be made
         flagcheckfrm d(*loaded.index, s, *store, prompts, nullptr);
@@ -356,11 +343,7 @@ private slots:
     {
         const QString file = files.filepath(QStringLiteral("fatal.ged"));
         const QByteArray john = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 1881\r\n0 TRLR\r\n";
-        QFile f(file);
-        QVERIFY(f.open(QIODevice::WriteOnly));
-        f.write(john);
-        f.close();
-        loadresult loaded = loadgedcom(file, definitions());
+        loadresult loaded = loadedfile(file, john);
         QVERIFY(loaded.index);
         auto store = settingsstore::onfile(files.ini());
         scriptedprompts prompts;
