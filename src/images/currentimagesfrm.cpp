@@ -1,6 +1,7 @@
 #include "images/currentimagesfrm.h"
 
 #include "images/imagechoices.h"
+#include "images/imagedetails_ui.h"
 #include "images/imagepreview_ui.h"
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
@@ -8,7 +9,6 @@
 
 #include <QCheckBox>
 #include <QDialogButtonBox>
-#include <QFormLayout>
 #include <QGroupBox>
 #include <QHBoxLayout>
 #include <QLabel>
@@ -70,24 +70,8 @@ void currentimagesfrm::build()
     Imageframe_ = new QGroupBox(QStringLiteral("Image Details"), this);
     Imageframe_->setObjectName(QStringLiteral("Imageframe"));
     auto* frame = new QVBoxLayout(Imageframe_);
-    auto* fields = new QFormLayout;
-    static const char* const captions[5] = {"Title:", "Image ID:", "File Path:", "File Type:", "Image Date:"};
-    for (size_t i = 0; i < 5; ++i) {
-        auto* t = new QLineEdit(Imageframe_);
-        t->setObjectName(QStringLiteral("Imageinfotxt%1").arg(i));
-        QString name = QString::fromLatin1(captions[i]);
-        name.chop(1);
-        t->setAccessibleName(name);
-        t->setReadOnly(true);
-        t->setMinimumWidth(260);
-        Imageinfotxt_[i] = t;
-        fields->addRow(QString::fromLatin1(captions[i]), t);
-    }
-    frame->addLayout(fields);
-    frame->addWidget(new QLabel(QStringLiteral("Image preview:"), Imageframe_));
-    imagepic_ = new imagepreview(prompts_, QSize(240, 200), Imageframe_);
-    frame->addWidget(imagepic_);
-    frame->addWidget(new QLabel(QStringLiteral("(Click on image to see full-size version)"), Imageframe_));
+    imagepic_ = addimagedetails(Imageframe_, frame, {"Title:", "Image ID:", "File Path:", "File Type:", "Image Date:"},
+                                Imageinfotxt_, prompts_);
     frame->addStretch(1);
     Imageframe_->setEnabled(false);
     columns->addWidget(Imageframe_);

@@ -2,12 +2,12 @@
 
 #include "images/currentimagesfrm.h"
 #include "images/imagechoices.h"
+#include "images/imagedetails_ui.h"
 #include "images/imagepreview_ui.h"
 #include "images/newimagefrm.h"
 #include "model/gedcomindex.h"
 #include "platform/prompts.h"
 
-#include <QFormLayout>
 #include <QGridLayout>
 #include <QGroupBox>
 #include <QHBoxLayout>
@@ -85,24 +85,8 @@ void imagesfrm::build()
     Imagefrm_ = new QGroupBox(QStringLiteral("Selected Image"), this);
     Imagefrm_->setObjectName(QStringLiteral("Imagefrm"));
     auto* frame = new QVBoxLayout(Imagefrm_);
-    auto* fields = new QFormLayout;
-    static const char* const captions[5] = {"Image ID:", "Title:", "File Path:", "File Type:", "Image Date:"};
-    for (int i = 0; i < 5; ++i) {
-        auto* t = new QLineEdit(Imagefrm_);
-        t->setObjectName(QStringLiteral("Imageinfotxt%1").arg(i));
-        QString name = QString::fromLatin1(captions[i]);
-        name.chop(1);
-        t->setAccessibleName(name);
-        t->setReadOnly(true);
-        t->setMinimumWidth(260);
-        Imageinfotxt_[i] = t;
-        fields->addRow(QString::fromLatin1(captions[i]), t);
-    }
-    frame->addLayout(fields);
-    frame->addWidget(new QLabel(QStringLiteral("Image preview:"), Imagefrm_));
-    imagepic_ = new imagepreview(prompts_, QSize(240, 200), Imagefrm_);
-    frame->addWidget(imagepic_);
-    frame->addWidget(new QLabel(QStringLiteral("(Click on image to see full-size version)"), Imagefrm_));
+    imagepic_ = addimagedetails(Imagefrm_, frame, {"Image ID:", "Title:", "File Path:", "File Type:", "Image Date:"},
+                                Imageinfotxt_, prompts_);
     unlinkbut_ = new QPushButton(QStringLiteral("&Unlink this image"), Imagefrm_);
     unlinkbut_->setObjectName(QStringLiteral("unlinkbut"));
     unlinkbut_->setAccessibleName(QStringLiteral("Unlink this image"));
