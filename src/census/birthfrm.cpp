@@ -2,6 +2,7 @@
 
 #include "census/birthdate.h"
 #include "census/placecompleter_ui.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QGridLayout>
@@ -14,16 +15,6 @@
 namespace qm {
 
 namespace {
-
-QLabel* valuelabel(const QString& name, const QString& accessible, const QString& text, QWidget* parent)
-{
-    auto* l = new QLabel(text, parent);
-    l->setObjectName(name);
-    l->setAccessibleName(accessible);
-    l->setTextFormat(Qt::PlainText);
-    l->setTextInteractionFlags(Qt::TextSelectableByMouse);
-    return l;
-}
 
 QString agetext(const selectionrec& row)
 {
@@ -58,13 +49,13 @@ birthfrm::birthfrm(const selectionrec& row, const QString& entrydate, const std:
         grid->addWidget(value, line, 1);
         ++line;
     };
-    add(new QLabel(QStringLiteral("Name:"), this), valuelabel(QStringLiteral("namelab"), QStringLiteral("Name"), row.name, this));
+    add(new QLabel(QStringLiteral("Name:"), this), valuelabel(this, QStringLiteral("namelab"), QStringLiteral("Name"), row.name));
     add(new QLabel(QStringLiteral("ID:"), this),
-        valuelabel(QStringLiteral("idlab"), QStringLiteral("ID"), QString::number(row.id), this));
-    add(new QLabel(QStringLiteral("Age:"), this), valuelabel(QStringLiteral("agelab"), QStringLiteral("Age"), agetext(row), this));
+        valuelabel(this, QStringLiteral("idlab"), QStringLiteral("ID"), QString::number(row.id)));
+    add(new QLabel(QStringLiteral("Age:"), this), valuelabel(this, QStringLiteral("agelab"), QStringLiteral("Age"), agetext(row)));
     auto* occtitlelab = new QLabel(QStringLiteral("Occupation:"), this);
     occtitlelab->setObjectName(QStringLiteral("occtitlelab"));
-    auto* occlab = valuelabel(QStringLiteral("occlab"), QStringLiteral("Occupation"), row.occupation, this);
+    auto* occlab = valuelabel(this, QStringLiteral("occlab"), QStringLiteral("Occupation"), row.occupation);
     add(occtitlelab, occlab);
     const bool showocc = row.occupation.size() > 1;
     occtitlelab->setVisible(showocc);
@@ -72,7 +63,7 @@ birthfrm::birthfrm(const selectionrec& row, const QString& entrydate, const std:
 
     auto* dobcaption = new QLabel(QStringLiteral("The calculated date of birth will be recorded as:"), this);
     const QString calculated = calculatedbirthdate(entrydate, row.age, row.agetype);
-    doblab_ = valuelabel(QStringLiteral("doblab"), QStringLiteral("Calculated date of birth"), calculated, this);
+    doblab_ = valuelabel(this, QStringLiteral("doblab"), QStringLiteral("Calculated date of birth"), calculated);
     QFont bold = doblab_->font();
     bold.setBold(true);
     doblab_->setFont(bold);

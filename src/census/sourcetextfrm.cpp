@@ -1,8 +1,8 @@
 #include "census/sourcetextfrm.h"
 
 #include "census/backtab_ui.h"
+#include "platform/formparts_ui.h"
 
-#include <QFontDatabase>
 #include <QFontMetricsF>
 #include <QHBoxLayout>
 #include <QPlainTextEdit>
@@ -10,18 +10,6 @@
 #include <QVBoxLayout>
 
 namespace qm {
-
-namespace {
-
-QFont editorfont()
-{
-    QFont font = QFontDatabase::systemFont(QFontDatabase::FixedFont);
-    if (QFontDatabase::hasFamily(QStringLiteral("Courier New")))
-        font.setFamily(QStringLiteral("Courier New"));
-    return font;
-}
-
-} // namespace
 
 sourcetextfrm::sourcetextfrm(int mode, const QString& text, QWidget* parent) : QDialog(parent)
 {
@@ -36,7 +24,7 @@ sourcetextfrm::sourcetextfrm(int mode, const QString& text, QWidget* parent) : Q
     sourcetxt_ = new QPlainTextEdit(this);
     sourcetxt_->setObjectName(QStringLiteral("sourcetxt"));
     sourcetxt_->setAccessibleName(windowTitle());
-    sourcetxt_->setFont(editorfont());
+    sourcetxt_->setFont(fixedfont());
     sourcetxt_->setTabStopDistance(QFontMetricsF(sourcetxt_->font()).horizontalAdvance(QLatin1Char(' ')) * 8);
     // A transcription is a table: its lines are kept whole. A note is prose.
     sourcetxt_->setLineWrapMode(note ? QPlainTextEdit::WidgetWidth : QPlainTextEdit::NoWrap);

@@ -1,6 +1,7 @@
 #include "flags/flagcheckcountryfrm.h"
 
 #include "platform/encoding.h"
+#include "platform/formparts_ui.h"
 
 #include <QCheckBox>
 #include <QGridLayout>
@@ -11,20 +12,6 @@
 #include <QVBoxLayout>
 
 namespace qm {
-
-namespace {
-
-QLabel* valuelabel(const QString& name, const QString& accessible, const QString& text, QWidget* parent)
-{
-    auto* l = new QLabel(text, parent);
-    l->setObjectName(name);
-    l->setAccessibleName(accessible);
-    l->setTextFormat(Qt::PlainText);
-    l->setTextInteractionFlags(Qt::TextSelectableByMouse);
-    return l;
-}
-
-} // namespace
 
 flagcheckcountryfrm::flagcheckcountryfrm(const countryquestion& q, const QString& name, int32_t id, QWidget* parent)
     : QDialog(parent)
@@ -48,10 +35,10 @@ flagcheckcountryfrm::flagcheckcountryfrm(const countryquestion& q, const QString
         grid->addWidget(value, line, 1);
         ++line;
     };
-    add(QStringLiteral("Name:"), valuelabel(QStringLiteral("namelab"), QStringLiteral("Name"), name, this));
-    add(QStringLiteral("ID:"), valuelabel(QStringLiteral("idlab"), QStringLiteral("ID"), QString::number(id), this));
-    add(QStringLiteral("Date:"), valuelabel(QStringLiteral("datelab"), QStringLiteral("Date"), qs(q.date), this));
-    add(QStringLiteral("Place:"), valuelabel(QStringLiteral("placelab"), QStringLiteral("Place"), qs(q.place), this));
+    add(QStringLiteral("Name:"), valuelabel(this, QStringLiteral("namelab"), QStringLiteral("Name"), name));
+    add(QStringLiteral("ID:"), valuelabel(this, QStringLiteral("idlab"), QStringLiteral("ID"), QString::number(id)));
+    add(QStringLiteral("Date:"), valuelabel(this, QStringLiteral("datelab"), QStringLiteral("Date"), qs(q.date)));
+    add(QStringLiteral("Place:"), valuelabel(this, QStringLiteral("placelab"), QStringLiteral("Place"), qs(q.place)));
 
     // Four options, hidden until used; more only for definitions edited outside the program.
     auto* options = new QHBoxLayout;
@@ -76,25 +63,16 @@ flagcheckcountryfrm::flagcheckcountryfrm(const countryquestion& q, const QString
     alwayschk_->setObjectName(QStringLiteral("alwayschk"));
     alwayschk_->setAccessibleName(QStringLiteral("Assume all census records for this place are in the selected country"));
 
-    auto* okbut = new QPushButton(QStringLiteral("OK"), this);
-    okbut->setObjectName(QStringLiteral("okbut"));
-    okbut->setAccessibleName(QStringLiteral("OK"));
-    okbut->setDefault(true);
-    auto* cancelbut = new QPushButton(QStringLiteral("Cancel"), this);
-    cancelbut->setObjectName(QStringLiteral("cancelbut"));
-    cancelbut->setAccessibleName(QStringLiteral("Cancel"));
-    cancelbut->setAutoDefault(false);
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch(1);
-    buttons->addWidget(okbut);
-    buttons->addWidget(cancelbut);
+    const okcancel buttons = okcancelrow(this);
+    QPushButton* okbut = buttons.ok;
+    QPushButton* cancelbut = buttons.cancel;
 
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(intro);
     layout->addLayout(grid);
     layout->addLayout(options);
     layout->addWidget(alwayschk_);
-    layout->addLayout(buttons);
+    layout->addLayout(buttons.row);
     layout->setSizeConstraint(QLayout::SetFixedSize);
 
     QWidget* previous = nullptr;

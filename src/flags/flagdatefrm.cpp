@@ -1,6 +1,7 @@
 #include "flags/flagdatefrm.h"
 
 #include "flags/flagalloc.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QButtonGroup>
@@ -15,29 +16,6 @@
 #include <QVBoxLayout>
 
 namespace qm {
-
-namespace {
-
-QLineEdit* field(const char* name, const QString& accessible, QWidget* parent)
-{
-    auto* f = new QLineEdit(parent);
-    f->setObjectName(QString::fromLatin1(name));
-    f->setAccessibleName(accessible);
-    f->setReadOnly(true);
-    f->setFocusPolicy(Qt::NoFocus);
-    return f;
-}
-
-QPushButton* button(const char* name, const QString& text, const QString& accessible, QWidget* parent)
-{
-    auto* b = new QPushButton(text, parent);
-    b->setObjectName(QString::fromLatin1(name));
-    b->setAccessibleName(accessible);
-    b->setAutoDefault(false);
-    return b;
-}
-
-} // namespace
 
 flagdatefrm::flagdatefrm(const flagtable& table, const QString& country, prompts& p, QWidget* parent)
     : QDialog(parent), table_(table), prompts_(p)
@@ -67,13 +45,13 @@ flagdatefrm::flagdatefrm(const flagtable& table, const QString& country, prompts
     datelst_->setObjectName(QStringLiteral("datelst"));
     datelst_->setAccessibleName(QStringLiteral("Census Dates"));
     listcaption->setBuddy(datelst_);
-    datelab_ = field("datelab", QStringLiteral("Census date"), this);
-    yearlab_ = field("yearlab", QStringLiteral("Census Year"), this);
-    datebut_ = button("datebut", QStringLiteral("< Select Dat&e"), QStringLiteral("Select Date"), this);
-    Yearbut_ = button("Yearbut", QStringLiteral("< Select &Year"), QStringLiteral("Select Year"), this);
+    datelab_ = shownfield(this, "datelab", QStringLiteral("Census date"));
+    yearlab_ = shownfield(this, "yearlab", QStringLiteral("Census Year"));
+    datebut_ = plainbutton(this, "datebut", QStringLiteral("< Select Dat&e"), QStringLiteral("Select Date"));
+    Yearbut_ = plainbutton(this, "Yearbut", QStringLiteral("< Select &Year"), QStringLiteral("Select Year"));
     datebut_->setDefault(true);
-    auto* cancelbut = button("cancelbut", QStringLiteral("Cancel"), QStringLiteral("Cancel"), this);
-    auto* helpbut = button("helpbut", QStringLiteral("&Help"), QStringLiteral("Help"), this);
+    auto* cancelbut = plainbutton(this, "cancelbut", QStringLiteral("Cancel"), QStringLiteral("Cancel"));
+    auto* helpbut = plainbutton(this, "helpbut", QStringLiteral("&Help"), QStringLiteral("Help"));
 
     auto* chosen = new QGridLayout;
     chosen->addWidget(new QLabel(QStringLiteral("Census date:"), this), 0, 0);

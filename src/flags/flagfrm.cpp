@@ -5,11 +5,11 @@
 #include "flags/flagnamefrm.h"
 #include "flags/flagtable.h"
 #include "model/gedcomindex.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
 
 #include <QCheckBox>
-#include <QFontDatabase>
 #include <QGridLayout>
 #include <QGroupBox>
 #include <QHBoxLayout>
@@ -21,37 +21,6 @@
 
 namespace qm {
 
-namespace {
-
-QFont listfont()
-{
-    QFont font = QFontDatabase::systemFont(QFontDatabase::FixedFont);
-    if (QFontDatabase::hasFamily(QStringLiteral("Courier New")))
-        font.setFamily(QStringLiteral("Courier New"));
-    return font;
-}
-
-QLineEdit* field(const char* name, const QString& accessible, QWidget* parent)
-{
-    auto* f = new QLineEdit(parent);
-    f->setObjectName(QString::fromLatin1(name));
-    f->setAccessibleName(accessible);
-    f->setReadOnly(true);
-    f->setFocusPolicy(Qt::NoFocus);
-    return f;
-}
-
-QPushButton* button(const char* name, const QString& text, const QString& accessible, QWidget* parent)
-{
-    auto* b = new QPushButton(text, parent);
-    b->setObjectName(QString::fromLatin1(name));
-    b->setAccessibleName(accessible);
-    b->setAutoDefault(false);
-    return b;
-}
-
-} // namespace
-
 flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts& p, std::function<bool()> flagcheck,
                  QWidget* parent)
     : QDialog(parent), index_(index), settings_(s), store_(store), prompts_(p), flagcheck_(std::move(flagcheck))
@@ -62,11 +31,11 @@ flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts&
 
     // Allocate Flags
     auto* allocate = new QGroupBox(QStringLiteral("Allocate Flags"), this);
-    datelab_ = field("datelab", QStringLiteral("Census"), allocate);
-    auto* Datebut = button("Datebut", QStringLiteral("..."), QStringLiteral("Choose census"), allocate);
-    countrylab_ = field("countrylab", QStringLiteral("Country"), allocate);
-    flaglab_ = field("flaglab", QStringLiteral("Flag name"), allocate);
-    auto* flagbut = button("flagbut", QStringLiteral("..."), QStringLiteral("Choose flag name"), allocate);
+    datelab_ = shownfield(allocate, "datelab", QStringLiteral("Census"));
+    auto* Datebut = plainbutton(allocate, "Datebut", QStringLiteral("..."), QStringLiteral("Choose census"));
+    countrylab_ = shownfield(allocate, "countrylab", QStringLiteral("Country"));
+    flaglab_ = shownfield(allocate, "flaglab", QStringLiteral("Flag name"));
+    auto* flagbut = plainbutton(allocate, "flagbut", QStringLiteral("..."), QStringLiteral("Choose flag name"));
     for (QPushButton* b : {Datebut, flagbut})
         b->setMaximumWidth(b->fontMetrics().horizontalAdvance(QStringLiteral("....")) * 3);
     auto* censuscaption = new QLabel(QStringLiteral("&Census:"), allocate);
@@ -74,7 +43,7 @@ flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts&
     auto* namecaption = new QLabel(QStringLiteral("Flag &Name:"), allocate);
     namecaption->setBuddy(flagbut);
 
-    const QFont fixed = listfont();
+    const QFont fixed = fixedfont();
     auto* heading = new QLabel(flagheading(), allocate);
     heading->setObjectName(QStringLiteral("headinglab"));
     heading->setFont(fixed);
@@ -87,7 +56,7 @@ flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts&
     const int listwidth = QFontMetrics(fixed).horizontalAdvance(QString(52, QLatin1Char('M')));
     flagslst_->setMinimumSize(listwidth, QFontMetrics(fixed).height() * 10);
     heading->setBuddy(flagslst_);
-    delbut_ = button("delbut", QStringLiteral("&Delete Census Flag"), QStringLiteral("Delete Census Flag"), allocate);
+    delbut_ = plainbutton(allocate, "delbut", QStringLiteral("&Delete Census Flag"), QStringLiteral("Delete Census Flag"));
 
     auto* grid = new QGridLayout;
     grid->addWidget(censuscaption, 0, 0);
@@ -113,7 +82,7 @@ flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts&
     flagschk_ = new QCheckBox(QStringLiteral("&Automatically record flags when saving census records"), options);
     flagschk_->setObjectName(QStringLiteral("flagschk"));
     flagschk_->setAccessibleName(QStringLiteral("Automatically record flags when saving census records"));
-    flagcheckbut_ = button("flagcheckbut", QStringLiteral("Flag Chec&k"), QStringLiteral("Flag Check"), options);
+    flagcheckbut_ = plainbutton(options, "flagcheckbut", QStringLiteral("Flag Chec&k"), QStringLiteral("Flag Check"));
     auto* note = new QLabel(
         QStringLiteral("(Flag Check will list any flags that should be added or removed in your GEDCOM file to ensure "
                        "consistency with the flag allocations above. Optionally any suggested changes can be carried "
@@ -128,9 +97,9 @@ flagfrm::flagfrm(gedcomindex& index, settings& s, settingsstore& store, prompts&
     optionslayout->addWidget(flagschk_);
     optionslayout->addLayout(checkrow);
 
-    auto* okbut = button("okbut", QStringLiteral("Close"), QStringLiteral("Close"), this);
+    auto* okbut = plainbutton(this, "okbut", QStringLiteral("Close"), QStringLiteral("Close"));
     okbut->setDefault(true);
-    auto* helpbut = button("helpbut", QStringLiteral("&Help"), QStringLiteral("Help"), this);
+    auto* helpbut = plainbutton(this, "helpbut", QStringLiteral("&Help"), QStringLiteral("Help"));
     auto* buttons = new QHBoxLayout;
     buttons->addStretch(1);
     buttons->addWidget(okbut);

@@ -2,6 +2,7 @@
 
 #include "flags/flagalloc.h"
 #include "platform/encoding.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QButtonGroup>
@@ -46,25 +47,15 @@ flagnamefrm::flagnamefrm(const flagtable& table, prompts& p, QWidget* parent)
     flagnametxt_->setAccessibleName(QStringLiteral("New flag name"));
     flagnametxt_->installEventFilter(this);
 
-    okbut_ = new QPushButton(QStringLiteral("OK"), this);
-    okbut_->setObjectName(QStringLiteral("okbut"));
-    okbut_->setAccessibleName(QStringLiteral("OK"));
-    okbut_->setDefault(true);
-    auto* cancelbut = new QPushButton(QStringLiteral("Cancel"), this);
-    cancelbut->setObjectName(QStringLiteral("cancelbut"));
-    cancelbut->setAccessibleName(QStringLiteral("Cancel"));
-    cancelbut->setAutoDefault(false);
-
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch(1);
-    buttons->addWidget(okbut_);
-    buttons->addWidget(cancelbut);
+    const okcancel buttons = okcancelrow(this);
+    okbut_ = buttons.ok;
+    QPushButton* cancelbut = buttons.cancel;
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(optflag_[0]);
     layout->addWidget(flagslst_, 1);
     layout->addWidget(optflag_[1]);
     layout->addWidget(flagnametxt_);
-    layout->addLayout(buttons);
+    layout->addLayout(buttons.row);
     setMinimumWidth(flagnametxt_->fontMetrics().horizontalAdvance(QString(40, QLatin1Char('M'))));
 
     setTabOrder(optflag_[0], flagslst_);

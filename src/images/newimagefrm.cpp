@@ -3,6 +3,7 @@
 #include "app/recentfiles.h"
 #include "images/imagechoices.h"
 #include "images/imagepreview_ui.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
 
@@ -24,15 +25,6 @@ namespace qm {
 namespace {
 
 const QString owntitleprompt = QStringLiteral("Type your own title here...");
-
-QLineEdit* readonlybox(QWidget* parent, const char* name, const QString& accessible)
-{
-    auto* t = new QLineEdit(parent);
-    t->setObjectName(QString::fromLatin1(name));
-    t->setAccessibleName(accessible);
-    t->setReadOnly(true);
-    return t;
-}
 
 } // namespace
 

@@ -2,6 +2,7 @@
 
 #include "census/peoplelist_ui.h"
 #include "platform/encoding.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "tools/findindividual.h"
 
@@ -21,21 +22,6 @@
 namespace qm {
 
 namespace {
-
-template <class T>
-T* named(T* w, const char* name, const QString& accessible)
-{
-    w->setObjectName(QString::fromLatin1(name));
-    w->setAccessibleName(accessible);
-    return w;
-}
-
-QLineEdit* shownbox(QWidget* parent, const char* name, const QString& accessible)
-{
-    auto* t = named(new QLineEdit(parent), name, accessible);
-    t->setReadOnly(true);
-    return t;
-}
 
 QListWidget* relativelist(QWidget* parent, const char* name, const QString& accessible)
 {
@@ -108,28 +94,21 @@ void findfrm::build()
     IDfindbut_->setAutoDefault(false);
     IDfindbut_->setEnabled(false);
 
-    nametxt_ = shownbox(this, "nametxt", QStringLiteral("Name"));
-    idtxt_ = shownbox(this, "idtxt", QStringLiteral("Individual ID"));
-    dobtxt_ = shownbox(this, "dobtxt", QStringLiteral("Date of Birth"));
-    placetxt_ = shownbox(this, "placetxt", QStringLiteral("Place of Birth"));
+    nametxt_ = readonlybox(this, "nametxt", QStringLiteral("Name"));
+    idtxt_ = readonlybox(this, "idtxt", QStringLiteral("Individual ID"));
+    dobtxt_ = readonlybox(this, "dobtxt", QStringLiteral("Date of Birth"));
+    placetxt_ = readonlybox(this, "placetxt", QStringLiteral("Place of Birth"));
     censuslst_ = named(new QListWidget(this), "censuslst", QStringLiteral("Census Entries"));
     censuslst_->setMinimumHeight(90);
 
     auto* selected = new QGroupBox(QStringLiteral("Selected Individual"), this);
     auto* grid = new QGridLayout(selected);
     int line = 0;
-    const auto add = [&](const QString& caption, QWidget* box) {
-        auto* l = new QLabel(caption, selected);
-        l->setBuddy(box);
-        grid->addWidget(l, line, 0, Qt::AlignTop);
-        grid->addWidget(box, line, 1);
-        ++line;
-    };
-    add(QStringLiteral("Name:"), nametxt_);
-    add(QStringLiteral("Individual ID:"), idtxt_);
-    add(QStringLiteral("Date of Birth:"), dobtxt_);
-    add(QStringLiteral("Place of Birth:"), placetxt_);
-    add(QStringLiteral("Census Entries:"), censuslst_);
+    addcaptioned(grid, line, QStringLiteral("Name:"), nametxt_);
+    addcaptioned(grid, line, QStringLiteral("Individual ID:"), idtxt_);
+    addcaptioned(grid, line, QStringLiteral("Date of Birth:"), dobtxt_);
+    addcaptioned(grid, line, QStringLiteral("Place of Birth:"), placetxt_);
+    addcaptioned(grid, line, QStringLiteral("Census Entries:"), censuslst_);
     grid->setColumnStretch(1, 1);
 
     parentlst_ = relativelist(this, "parentlst", QStringLiteral("Parents"));
