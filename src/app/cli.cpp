@@ -157,6 +157,28 @@ loadresult loadfamily(const QString& path, const clisettings& s)
     return r;
 }
 
+std::unique_ptr<clifamily> openfamily(const QStringList& files, const QString& usage, const QString& inipath)
+{
+    if (files.size() != 1) {
+        clifail(usage);
+        return nullptr;
+    }
+    const QString& path = files.front();
+    auto f = std::make_unique<clifamily>();
+    QString error = checkfamilypath(path);
+    if (error.isEmpty())
+        f->settings = opensettings(inipath, &error);
+    if (f->settings) {
+        f->loaded = loadfamily(path, *f->settings);
+        error = f->loaded.error;
+    }
+    if (!f->loaded.index) {
+        clifail(error);
+        return nullptr;
+    }
+    return f;
+}
+
 void printline(const QString& text)
 {
     const QByteArray bytes = text.toUtf8() + '\n';

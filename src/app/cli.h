@@ -84,6 +84,16 @@ bool clisaved(const saveoutcome& out);
 // error, when the file cannot be loaded or has no "0 HEAD" line.
 loadresult loadfamily(const QString& path, const clisettings& s);
 
+// What a command that reads one family file works on.
+struct clifamily {
+    std::unique_ptr<clisettings> settings;
+    loadresult loaded; // its index is set
+};
+// The one family file of `files`, checked (checkfamilypath) and loaded
+// (loadfamily) with the settings of `inipath` (opensettings). Null, after one
+// line on standard error (`usage` when files are not one), when it cannot be.
+std::unique_ptr<clifamily> openfamily(const QStringList& files, const QString& usage, const QString& inipath);
+
 // One line of text, or one JSON object on one line, on standard output.
 void printline(const QString& text);
 void printjson(const QJsonObject& object);

@@ -49,21 +49,13 @@ int clidatecheck(QStringList args)
                           QStringLiteral("--country needs one of UK, USA, Ireland, Canada"), takecountry, &apply, &files);
     if (!error.isEmpty())
         return clifail(error);
-    if (files.size() != 1)
-        return clifail(usage());
-    const QString path = files.front();
-    error = checkfamilypath(path);
-    if (!error.isEmpty())
-        return clifail(error);
-
-    const auto s = opensettings(inipath, &error);
-    if (!s)
-        return clifail(error);
+    const auto f = openfamily(files, usage(), inipath);
+    if (!f)
+        return clifailure;
+    const clisettings* s = f->settings.get();
     if (country.isEmpty())
         country = s->values.country;
-    loadresult r = loadfamily(path, *s);
-    if (!r.index)
-        return clifail(r.error);
+    loadresult& r = f->loaded;
     const gedcomindex& ix = *r.index;
 
     datecheckstate check(ix);

@@ -57,20 +57,11 @@ int cliflagcheck(QStringList args)
                           takeanswer, &apply, &files);
     if (!error.isEmpty())
         return clifail(error);
-    if (files.size() != 1)
-        return clifail(usage());
-    const QString path = files.front();
-    error = checkfamilypath(path);
-    if (!error.isEmpty())
-        return clifail(error);
-
-    const auto s = opensettings(inipath, &error);
-    if (!s)
-        return clifail(error);
-    loadresult r = loadfamily(path, *s);
-    if (!r.index)
-        return clifail(r.error);
-    gedcomindex& ix = *r.index;
+    const auto f = openfamily(files, usage(), inipath);
+    if (!f)
+        return clifailure;
+    const clisettings* s = f->settings.get();
+    gedcomindex& ix = *f->loaded.index;
 
     // The country question is answered from --country-for, or the check fails naming the event.
     QString unanswered;

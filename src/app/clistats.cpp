@@ -16,19 +16,11 @@ int clistats(QStringList args)
     error = unknownoption(args);
     if (!error.isEmpty())
         return clifail(error);
-    if (args.size() != 1)
-        return clifail(QStringLiteral("stats needs one family file: quillmark-cli stats FILE [--settings S.ini]"));
-    const QString path = args.front();
-    error = checkfamilypath(path);
-    if (!error.isEmpty())
-        return clifail(error);
-
-    const auto s = opensettings(inipath, &error);
-    if (!s)
-        return clifail(error);
-    loadresult r = loadfamily(path, *s);
-    if (!r.index)
-        return clifail(r.error);
+    const auto f = openfamily(
+        args, QStringLiteral("stats needs one family file: quillmark-cli stats FILE [--settings S.ini]"), inipath);
+    if (!f)
+        return clifailure;
+    loadresult& r = f->loaded;
     const gedcomindex& ix = *r.index;
 
     jsonobject j;
