@@ -7,7 +7,6 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QJsonDocument>
 #include <QJsonObject>
 #include <QTemporaryDir>
 
@@ -29,11 +28,7 @@ const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
                            "0 @S2@ SOUR\r\n1 TITL Leeds Parish Register\r\n"
                            "0 TRLR\r\n";
 
-struct run {
-    int status = -1;
-    std::string out, err;
-    QJsonObject json() const { return QJsonDocument::fromJson(QByteArray::fromStdString(out)).object(); }
-};
+using run = qmtest::clitextrun;
 
 class CliAddEntry : public ::testing::Test {
 protected:
@@ -62,7 +57,7 @@ protected:
         const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), target.isEmpty() ? file : target,
                                                  QStringLiteral("--entry"), entry, QStringLiteral("--settings"), ini},
                                                 dir.path());
-        return {r.status, r.out.toStdString(), r.err.toStdString()};
+        return qmtest::astext(r);
     }
 
     // A refused entry: status 2, the message on standard error, nothing written.

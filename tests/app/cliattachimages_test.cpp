@@ -7,7 +7,6 @@
 #include <QDir>
 #include <QFile>
 #include <QJsonArray>
-#include <QJsonDocument>
 #include <QJsonObject>
 #include <QTemporaryDir>
 
@@ -27,11 +26,7 @@ const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
                            "0 @O5@ OBJE\r\n1 FORM jpg\r\n1 TITL Leeds 1891 page\r\n1 _FILE pages/leeds.jpg\r\n"
                            "0 TRLR\r\n";
 
-struct run {
-    int status = -1;
-    std::string out, err;
-    QJsonObject json() const { return QJsonDocument::fromJson(QByteArray::fromStdString(out)).object(); }
-};
+using run = qmtest::clitextrun;
 
 class CliAttachImages : public ::testing::Test {
 protected:
@@ -62,7 +57,7 @@ protected:
         const qmtest::clirun r = qmtest::runcli(QStringList{QStringLiteral("attach-images"), file} + args
                                                     + QStringList{QStringLiteral("--settings"), ini},
                                                 dir.path());
-        return {r.status, r.out.toStdString(), r.err.toStdString()};
+        return qmtest::astext(r);
     }
 
     // Refused: status 2, the message on standard error, nothing written.

@@ -37,10 +37,7 @@ protected:
     QString scan(const char* name) const { return dir.filePath(QStringLiteral("scans/") + QString::fromLatin1(name)); }
     static std::string quoted(const QString& path) { return QJsonDocument::fromVariant(QVariantList{path}).toJson(QJsonDocument::Compact).mid(1).chopped(1).toStdString(); }
 
-    struct result {
-        int status = -1;
-        std::string out, err;
-    };
+    using result = qmtest::clitextrun;
     result addentry(const std::string& images)
     {
         const QString entry = dir.filePath(QStringLiteral("entry.json"));
@@ -49,7 +46,7 @@ protected:
         const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), file, QStringLiteral("--entry"), entry,
                                                  QStringLiteral("--settings"), ini},
                                                 dir.path());
-        return {r.status, r.out.toStdString(), r.err.toStdString()};
+        return qmtest::astext(r);
     }
 
     void expectrefused(const std::string& images, const std::string& message)
@@ -71,7 +68,7 @@ TEST_F(CliImages, NewImagesAreNumberedAndRecordedExistingOnesLinked)
                                   {"object": 2},
                                   {"file": )" + quoted(scan("b.jpg")) + R"(, "title": " Ashworth 1881 "}])");
     ASSERT_EQ(r.status, 0) << r.err;
-    EXPECT_EQ(QJsonDocument::fromJson(QByteArray::fromStdString(r.out)).object().value(QStringLiteral("images")).toInt(), 3);
+    EXPECT_EQ(r.json().value(QStringLiteral("images")).toInt(), 3);
     const std::string text = readfile(file);
     // The new source links the three in order, the new ones with their _ASID.
     EXPECT_NE(text.find("1 OBJE @O3@\r\n2 _ASID 1\r\n1 OBJE @O2@\r\n1 OBJE @O4@\r\n2 _ASID 1\r\n"), std::string::npos);

@@ -1,6 +1,7 @@
 #include "support/clirun.h"
 
 #include <QDir>
+#include <QJsonDocument>
 #include <QProcess>
 #include <QProcessEnvironment>
 
@@ -24,6 +25,16 @@ clirun runprogram(const QString& program, const QStringList& args, const QString
     r.out = p.readAllStandardOutput();
     r.err = p.readAllStandardError();
     return r;
+}
+
+QJsonObject clitextrun::json() const
+{
+    return QJsonDocument::fromJson(QByteArray::fromStdString(out)).object();
+}
+
+clitextrun astext(const clirun& r)
+{
+    return {r.status, r.out.toStdString(), r.err.toStdString()};
 }
 
 qm::settings clitestsettings(const QString& folder)

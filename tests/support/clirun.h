@@ -4,8 +4,11 @@
 #include "settings/settings.h"
 
 #include <QByteArray>
+#include <QJsonObject>
 #include <QString>
 #include <QStringList>
+
+#include <string>
 
 namespace qmtest {
 
@@ -15,6 +18,14 @@ struct clirun {
     int status = -1;
     QByteArray out, err;
 };
+
+// The same with the outputs as text; json() reads standard output as one object.
+struct clitextrun {
+    int status = -1;
+    std::string out, err;
+    QJsonObject json() const;
+};
+clitextrun astext(const clirun& r);
 
 // Runs `program` with args. With `home`, the user's folders (HOME, data and
 // configuration) lie inside it, so that nothing falls back on the real ones.
