@@ -1,30 +1,22 @@
 // Loading generated family files of 10,000, 100,000 and 1,000,000 individuals
 // (made by gen_family_gedcom.py; the folder is QM_BENCH_DIR, else /work/gen).
-#include "model/loadgedcom.h"
 #include "platform/linereader.h"
+
+#include "benchfiles.h"
 
 #include <QFileInfo>
 
-#include <benchmark/benchmark.h>
-
-#include <cstdlib>
-
 namespace {
 
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
-}
+using qmbench::benchfile;
+using qmbench::benchfilefound;
 
 void loadfile(benchmark::State& state, const char* name)
 {
     const QString path = benchfile(name);
     const QFileInfo info(path);
-    if (!info.isFile()) {
-        state.SkipWithError((path.toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+    if (!benchfilefound(state, info.isFile(), name))
         return;
-    }
     size_t people = 0, arena = 0;
     for (auto _ : state) {
         qm::loadresult r = qm::loadgedcom(path, {});
@@ -45,10 +37,8 @@ void loadfile(benchmark::State& state, const char* name)
 void readlines(benchmark::State& state, const char* name)
 {
     const QString path = benchfile(name);
-    if (!QFileInfo(path).isFile()) {
-        state.SkipWithError((path.toStdString() + " is absent: make it with gen_family_gedcom.py").c_str());
+    if (!benchfilefound(state, QFileInfo(path).isFile(), name))
         return;
-    }
     int64_t lines = 0;
     for (auto _ : state) {
         qm::linereader reader;
