@@ -15,7 +15,7 @@
 #include "platform/encoding.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
-#include "writer/saveroad.h"
+#include "writer/saveprompts.h"
 
 #include <QApplication>
 #include <QComboBox>
@@ -288,24 +288,19 @@ void mainfrm::saveentry()
     censusentry entry = gatherentry(form, entrydate);
     entry.chosenimages = chosenimages;
     const saveoutcome out = qm::saveentry(*index_, settings_, entry);
-    switch (out.status) {
-    case savestatus::saved:
+    switch (tellsaveoutcome(prompts_, out)) {
+    case aftersave::saved:
         break;
-    case savestatus::changed:
+    case aftersave::changed:
         prompts_.tell(out.message);
         reload();
         return;
-    case savestatus::refused:
-    case savestatus::backupfailed:
-        prompts_.tell(out.message, icon::exclamation);
+    case aftersave::stay:
         return;
-    case savestatus::rewritefailed:
-        prompts_.tell(out.message, icon::critical);
+    case aftersave::fatal:
         endprogram();
         return;
     }
-    if (!out.logerror.isEmpty())
-        prompts_.tell(out.logerror, icon::exclamation);
 
     watchfile_ = false;
     loadfile();

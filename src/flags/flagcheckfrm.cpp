@@ -5,7 +5,7 @@
 #include "platform/encoding.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
-#include "writer/saveroad.h"
+#include "writer/saveprompts.h"
 
 #include <QCheckBox>
 #include <QHBoxLayout>
@@ -130,26 +130,21 @@ void flagcheckfrm::makechanges()
         busycursor busy(prompts_);
         out = savechange(index_, settings_, request);
     }
-    switch (out.status) {
-    case savestatus::saved:
+    switch (tellsaveoutcome(prompts_, out)) {
+    case aftersave::saved:
         index_.gedcomdate = out.newstamp;
-        if (!out.logerror.isEmpty())
-            prompts_.tell(out.logerror, icon::exclamation);
         end_ = flagcheckend::reload;
         accept();
         return;
-    case savestatus::changed:
+    case aftersave::changed:
         prompts_.tell(flagsfilechangedmessage(index_.gedcomfile));
         end_ = flagcheckend::reload;
         accept();
         return;
-    case savestatus::refused:
-    case savestatus::backupfailed:
+    case aftersave::stay:
         // Nothing was written: the dialog stays.
-        prompts_.tell(out.message, icon::exclamation);
         return;
-    case savestatus::rewritefailed:
-        prompts_.tell(out.message, icon::critical);
+    case aftersave::fatal:
         end_ = flagcheckend::fatal;
         accept();
         return;

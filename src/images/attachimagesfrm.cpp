@@ -4,9 +4,10 @@
 #include "model/filechanged.h"
 #include "model/loadgedcom.h"
 #include "platform/encoding.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
-#include "writer/saveroad.h"
+#include "writer/saveprompts.h"
 
 #include <QCheckBox>
 #include <QGridLayout>
@@ -21,25 +22,6 @@
 #include <QVBoxLayout>
 
 namespace qm {
-
-namespace {
-
-template <class T>
-T* named(T* w, const char* name, const QString& accessible)
-{
-    w->setObjectName(QString::fromLatin1(name));
-    w->setAccessibleName(accessible);
-    return w;
-}
-
-QLineEdit* readonlybox(const char* name, const QString& accessible, QWidget* parent)
-{
-    auto* e = named(new QLineEdit(parent), name, accessible);
-    e->setReadOnly(true);
-    return e;
-}
-
-} // namespace
 
 Attachimagesfrm::Attachimagesfrm(gedcomindex& index, const settings& s, prompts& p, imagechooser chooser,
                                  QWidget* parent)
@@ -106,9 +88,9 @@ void Attachimagesfrm::build()
 
     auto* selectedframe = named(new QGroupBox(QStringLiteral("Selected Source"), this), "selectedframe",
                                 QStringLiteral("Selected Source"));
-    titletxt_ = readonlybox("titletxt", QStringLiteral("Source Title"), selectedframe);
-    Datetxt_ = readonlybox("Datetxt", QStringLiteral("Date"), selectedframe);
-    indextxt_ = readonlybox("indextxt", QStringLiteral("Source ID"), selectedframe);
+    titletxt_ = readonlybox(selectedframe, "titletxt", QStringLiteral("Source Title"));
+    Datetxt_ = readonlybox(selectedframe, "Datetxt", QStringLiteral("Date"));
+    indextxt_ = readonlybox(selectedframe, "indextxt", QStringLiteral("Source ID"));
     imagelst_ = named(new QListWidget(selectedframe), "imagelst", QStringLiteral("Attached Images"));
     individualslst_ = named(new QListWidget(selectedframe), "individualslst",
                             QStringLiteral("Individuals linked to this source"));
@@ -120,16 +102,9 @@ void Attachimagesfrm::build()
 
     auto* grid = new QGridLayout(selectedframe);
     int row = 0;
-    const auto add = [&](const QString& caption, QWidget* w) {
-        auto* l = new QLabel(caption, selectedframe);
-        l->setBuddy(w);
-        grid->addWidget(l, row, 0, Qt::AlignTop);
-        grid->addWidget(w, row, 1);
-        ++row;
-    };
-    add(QStringLiteral("Source &Title:"), titletxt_);
-    add(QStringLiteral("Dat&e:"), Datetxt_);
-    add(QStringLiteral("Source I&D:"), indextxt_);
+    addcaptioned(grid, row, QStringLiteral("Source &Title:"), titletxt_);
+    addcaptioned(grid, row, QStringLiteral("Dat&e:"), Datetxt_);
+    addcaptioned(grid, row, QStringLiteral("Source I&D:"), indextxt_);
     auto* imagecaption = new QLabel(QStringLiteral("Attached I&mages:"), selectedframe);
     imagecaption->setBuddy(imagelst_);
     grid->addWidget(imagecaption, row++, 0, 1, 2);
@@ -308,26 +283,21 @@ void Attachimagesfrm::attach()
         busycursor busy(prompts_);
         out = savechange(index_, settings_, rq);
     }
-    switch (out.status) {
-    case savestatus::saved:
+    switch (tellsaveoutcome(prompts_, out)) {
+    case aftersave::saved:
         break;
-    case savestatus::changed:
+    case aftersave::changed:
         closeonchange();
         return;
-    case savestatus::refused:
-    case savestatus::backupfailed:
-        prompts_.tell(out.message, icon::exclamation);
+    case aftersave::stay:
         return;
-    case savestatus::rewritefailed:
-        prompts_.tell(out.message, icon::critical);
+    case aftersave::fatal:
         fatal_ = true;
         reject();
         return;
     }
     recordattached(index_, source_, chosen, out.newstamp);
     attached_ = true;
-    if (!out.logerror.isEmpty())
-        prompts_.tell(out.logerror, icon::exclamation);
     cleardetails();
     fill();
     sourcelst_->setFocus();

@@ -1,8 +1,10 @@
 #include "tools/datecheckfrm.h"
 
 #include "model/gedcomindex.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
+#include "writer/saveprompts.h"
 
 #include <QButtonGroup>
 #include <QComboBox>
@@ -20,14 +22,6 @@
 namespace qm {
 
 namespace {
-
-template <class T>
-T* named(T* w, const QString& name, const QString& accessible)
-{
-    w->setObjectName(name);
-    w->setAccessibleName(accessible);
-    return w;
-}
 
 QPushButton* button(const QString& text, const QString& name, QWidget* parent)
 {
@@ -333,24 +327,19 @@ void Datecheckfrm::makechanges()
         busycursor busy(prompts_);
         out = makedatechanges(index_, settings_, state_.changes());
     }
-    switch (out.status) {
-    case savestatus::saved:
-        if (!out.logerror.isEmpty())
-            prompts_.tell(out.logerror, icon::exclamation);
+    switch (tellsaveoutcome(prompts_, out)) {
+    case aftersave::saved:
         reloadneeded_ = true;
         accept();
         return;
-    case savestatus::changed:
+    case aftersave::changed:
         prompts_.tell(out.message, icon::exclamation);
         reloadneeded_ = true;
         reject();
         return;
-    case savestatus::refused:
-    case savestatus::backupfailed:
-        prompts_.tell(out.message, icon::exclamation);
+    case aftersave::stay:
         return;
-    case savestatus::rewritefailed:
-        prompts_.tell(out.message, icon::critical);
+    case aftersave::fatal:
         fatal_ = true;
         reject();
         return;
