@@ -130,7 +130,6 @@ private slots:
         scriptedprompts p;
         Attachimagesfrm d(*x.index, s, p, {});
         d.show();
-        QCOMPARE(d.windowTitle(), QStringLiteral("Attach Images to Existing Sources"));
         auto* list = child<QListWidget>(d, "sourcelst");
         auto* count = child<QLabel>(d, "countlab");
         auto* search = child<QLineEdit>(d, "searchtxt");
@@ -148,7 +147,6 @@ private slots:
         QCOMPARE(list->count(), 9);
         noimages->click();
         QCOMPARE(list->count(), 11);
-        QCOMPARE(list->item(8)->text(), QStringLiteral("Parish register, St Thomas, Heptonstall, baptisms 1813-1840"));
 
         // Typing chooses the text option; the list waits for Search.
         QTest::keyClicks(search, QStringLiteral("  HEBDEN bridge  "));
@@ -163,9 +161,6 @@ private slots:
         QVERIFY(d.isVisible());
         QCOMPARE(rows(list), QStringList{QStringLiteral("Birth certificate, Frederick Ashworth, 1881")});
         QCOMPARE(count->text(), QStringLiteral("1 source"));
-        search->setText(QStringLiteral("Leeds"));
-        searchbut->click();
-        QCOMPARE(count->text(), QStringLiteral("0 sources"));
 
         // Another option empties the search text.
         child<QRadioButton>(d, "sourceopt1")->click();
@@ -193,9 +188,7 @@ private slots:
         QCOMPARE(child<QLineEdit>(d, "indextxt")->text(), QStringLiteral("7"));
         QCOMPARE(child<QLineEdit>(d, "Datetxt")->text(), QStringLiteral("3 APR 1881"));
         QCOMPARE(rows(child<QListWidget>(d, "imagelst")), QStringList{QStringLiteral("Census 1881 Hebden Bridge")});
-        const QStringList people = rows(child<QListWidget>(d, "individualslst"));
-        QVERIFY2(people.size() >= 4, qPrintable(people.join(u'|')));
-        QVERIFY(people.filter(QStringLiteral("Ashworth, John")).size() == 1);
+        QCOMPARE(rows(child<QListWidget>(d, "individualslst")).filter(QStringLiteral("Ashworth, John")).size(), 1);
         QVERIFY(child<QPushButton>(d, "attachbut")->isEnabled());
 
         QVERIFY(pick(list, s5));
@@ -231,7 +224,6 @@ private slots:
         const QStringList lines = QString::fromStdString(readfile(x.file)).split(QStringLiteral("\r\n"));
         const qsizetype at = lines.indexOf(QStringLiteral("1 TITL ") + s5);
         QVERIFY(at > 0);
-        QVERIFY(lines.mid(at).indexOf(QStringLiteral("1 OBJE @O3@")) > 0);
         QCOMPARE(lines.mid(at).indexOf(QStringLiteral("1 OBJE @O3@")) + 2, lines.mid(at).indexOf(QStringLiteral("1 OBJE @O2@")));
         const qsizetype o3 = lines.indexOf(QStringLiteral("0 @O3@ OBJE"));
         QVERIFY(o3 > 0);
@@ -241,9 +233,6 @@ private slots:
         // The index: the new record, both links, the new stamp.
         const sourcerec& source = x.index->sources[4];
         QVERIFY(source.objectids == (std::vector<int32_t>{3, 2}));
-        QCOMPARE(x.index->objects.size(), size_t(3));
-        QCOMPARE(qs(x.index->objects[2].title), s5);
-        QCOMPARE(x.index->maxobjectid, 3);
         QVERIFY(!filechanged(*x.index));
 
         // The details are cleared and the source has left the list.
@@ -264,119 +253,71 @@ private slots:
         QVERIFY(x.index->sources[0].objectids == (std::vector<int32_t>{4, 2}));
     }
 
-    // A rewrite that fails: its message, the file as it was, and the dialog
-    // closes for the program to end.
-    void rewritefails()
+    // Changed by another program while the images are chosen: nothing is
+    // written and the dialog closes. (A change before choosing: frommainwindow.)
+    void outsidechange()
     {
         loaded x = sample();
         const settings s = testsettings();
         scriptedprompts p;
         int calls = 0;
-        Attachimagesfrm d(*x.index, s, p, fakechooser(*x.index, png("page.png"), &calls));
+        const Attachimagesfrm::imagechooser inner = fakechooser(*x.index, png("page.png"), &calls);
+        const QString file = x.file;
+        const auto chooser = [&](const QString& title, const QString& date, QWidget* parent) {
+            replaceinfile(file, "1 NAME Sample Family File", "1 NAME Another Family File");
+            return inner(title, date, parent);
+        };
+        Attachimagesfrm d(*x.index, s, p, chooser);
         d.show();
         QVERIFY(pick(child<QListWidget>(d, "sourcelst"), s5));
-        const std::string before = readfile(x.file);
-        p.expect(answer::ok, QStringLiteral("An error occurred"));
-        setinputfaultfortests(true);
+        p.expect(answer::ok, QDir::toNativeSeparators(file) + QStringLiteral(
+                                 " has been modified by another application. Images will not be attached to this "
+                                 "source and new images will not be added as a precaution to ensure there is no "
+                                 "data loss. This form will now close and the file will be reloaded."));
         child<QPushButton>(d, "attachbut")->click();
-        setinputfaultfortests(false);
         QCOMPARE(p.unexpected(), 0);
-        QCOMPARE(p.history().back().m.kind, icon::critical);
-        QVERIFY(d.fatal());
-        QVERIFY(!d.isVisible());
-        QVERIFY(!d.imagesattached());
-        QCOMPARE(readfile(x.file), before);
-        QVERIFY(x.index->sources[4].objectids.empty());
-    }
-
-    // An existing image already linked to the source is left out with a word
-    // to the user; with nothing else chosen nothing is written.
-    void alreadylinked()
-    {
-        loaded x = sample();
-        const settings s = testsettings();
-        scriptedprompts p;
-        int calls = 0;
-        const auto onlyo2 = [&](const QString&, const QString&, QWidget*) {
-            ++calls;
-            std::vector<imagechoice> chosen;
-            addexistingimage(chosen, x.index->objects[1]);
-            return chosen;
-        };
-        Attachimagesfrm d(*x.index, s, p, onlyo2);
-        d.show();
-        QVERIFY(pick(child<QListWidget>(d, "sourcelst"), QStringLiteral("Census 1881 Hebden Bridge")));
-        const std::string before = readfile(x.file);
-        p.expect(answer::ok, QStringLiteral("The image 'Census 1881 Hebden Bridge' (ID: 2) is already attached to this "
-                                            "source, so it is not attached again."));
-        child<QPushButton>(d, "attachbut")->click();
         QCOMPARE(calls, 1);
-        QCOMPARE(p.unexpected(), 0);
-        QVERIFY(d.isVisible());
+        QVERIFY(!d.isVisible());
+        QVERIFY(d.filechanged());
         QVERIFY(!d.imagesattached());
-        QCOMPARE(readfile(x.file), before);
+        QVERIFY(readfile(file).find("@O3@") == std::string::npos);
         QVERIFY(backups(s).isEmpty());
     }
 
-    // Changed by another program before the images are chosen, or while they
-    // are: nothing is written and the dialog closes.
-    void outsidechange()
+    // Attaches that write nothing and leave the dialog open: only an image
+    // already linked to the source was chosen (left out with a word to the
+    // user), or a backup that cannot be made.
+    void nothingwritten()
     {
-        for (const bool whilechoosing : {false, true}) {
+        for (const bool nobackup : {false, true}) {
             loaded x = sample();
-            const settings s = testsettings();
+            settings s = testsettings();
+            if (nobackup)
+                s.backupfolder = files_.filepath(QStringLiteral("no such folder"));
             scriptedprompts p;
             int calls = 0;
-            const Attachimagesfrm::imagechooser inner = fakechooser(*x.index, png("page.png"), &calls);
-            const QString file = x.file;
-            const auto chooser = [&](const QString& title, const QString& date, QWidget* parent) {
-                if (whilechoosing)
-                    replaceinfile(file, "1 NAME Sample Family File", "1 NAME Another Family File");
-                return inner(title, date, parent);
+            const auto onlyo2 = [&](const QString&, const QString&, QWidget*) {
+                ++calls;
+                std::vector<imagechoice> chosen;
+                addexistingimage(chosen, x.index->objects[1]);
+                return chosen;
             };
-            Attachimagesfrm d(*x.index, s, p, chooser);
+            Attachimagesfrm d(*x.index, s, p,
+                              nobackup ? fakechooser(*x.index, png("page.png"), &calls) : Attachimagesfrm::imagechooser(onlyo2));
             d.show();
-            QVERIFY(pick(child<QListWidget>(d, "sourcelst"), s5));
-            if (!whilechoosing)
-                QVERIFY(replaceinfile(file, "1 NAME Sample Family File", "1 NAME Another Family File"));
-            p.expect(answer::ok, QDir::toNativeSeparators(file) + QStringLiteral(
-                                     " has been modified by another application. Images will not be attached to this "
-                                     "source and new images will not be added as a precaution to ensure there is no "
-                                     "data loss. This form will now close and the file will be reloaded."));
+            QVERIFY(pick(child<QListWidget>(d, "sourcelst"), nobackup ? s5 : QStringLiteral("Census 1881 Hebden Bridge")));
+            const std::string before = readfile(x.file);
+            p.expect(answer::ok, nobackup ? QString()
+                                          : QStringLiteral("The image 'Census 1881 Hebden Bridge' (ID: 2) is already "
+                                                           "attached to this source, so it is not attached again."));
             child<QPushButton>(d, "attachbut")->click();
+            QCOMPARE(calls, 1);
             QCOMPARE(p.unexpected(), 0);
-            QCOMPARE(calls, whilechoosing ? 1 : 0);
-            QVERIFY(!d.isVisible());
-            QVERIFY(d.filechanged());
+            QVERIFY(d.isVisible());
             QVERIFY(!d.imagesattached());
-            const std::string now = readfile(file);
-            QVERIFY(now.find("1 NAME Another Family File") != std::string::npos);
-            QVERIFY(now.find("@O3@") == std::string::npos);
-            QVERIFY(backups(s).isEmpty());
+            QCOMPARE(readfile(x.file), before);
             QVERIFY(x.index->sources[4].objectids.empty());
         }
-    }
-
-    // A backup that cannot be made: the message, nothing written, the dialog stays.
-    void backupfails()
-    {
-        loaded x = sample();
-        settings s = testsettings();
-        s.backupfolder = files_.filepath(QStringLiteral("no such folder"));
-        scriptedprompts p;
-        int calls = 0;
-        Attachimagesfrm d(*x.index, s, p, fakechooser(*x.index, png("page.png"), &calls));
-        d.show();
-        QVERIFY(pick(child<QListWidget>(d, "sourcelst"), s5));
-        const std::string before = readfile(x.file);
-        p.expect(answer::ok);
-        child<QPushButton>(d, "attachbut")->click();
-        QCOMPARE(p.unexpected(), 0);
-        QVERIFY(d.isVisible());
-        QVERIFY(!d.imagesattached());
-        QCOMPARE(readfile(x.file), before);
-        QVERIFY(x.index->sources[4].objectids.empty());
-        QCOMPARE(x.index->objects.size(), size_t(2));
     }
 
     // From the Tools menu through the real Census Images dialogs: a new image
@@ -447,10 +388,7 @@ private slots:
         const QStringList record = lines.mid(at, end - at);
         QCOMPARE(record.filter(QRegularExpression(QStringLiteral("^1 OBJE"))),
                  (QStringList{QStringLiteral("1 OBJE @O2@"), QStringLiteral("1 OBJE @O3@")}));
-        const qsizetype o3 = lines.indexOf(QStringLiteral("0 @O3@ OBJE"));
-        QVERIFY(o3 > lines.indexOf(QStringLiteral("0 @O2@ OBJE")));
-        QCOMPARE(lines.mid(o3 + 1, 4), (QStringList{QStringLiteral("1 FORM png"), QStringLiteral("1 TITL ") + s5,
-                                                     QStringLiteral("1 _FILE ") + page, QStringLiteral("1 _DATE 2 APR 1871")}));
+        QVERIFY(lines.indexOf(QStringLiteral("1 _FILE ") + page) > lines.indexOf(QStringLiteral("0 @O3@ OBJE")));
         QCOMPARE(backups(s).size(), 1);
         // Read again afterwards.
         QVERIFY(w.index()->sources[4].objectids == (std::vector<int32_t>{2, 3}));
@@ -458,7 +396,6 @@ private slots:
 
         // Another program changes the file while the dialog is open: nothing
         // is written, and the file is read again.
-        const std::string saved = readfile(file);
         dialogs.expect(QStringLiteral("Attachimagesfrm"), [&](QDialog* d) {
             QTimer::singleShot(0, d, [&, d] {
                 pick(child<QListWidget>(*d, "sourcelst"), QStringLiteral("Census 1841"));
@@ -471,7 +408,6 @@ private slots:
         QTRY_COMPARE(dialogs.pending(), 0);
         QCOMPARE(dialogs.unexpected, 0);
         QCOMPARE(run->prompts.unexpected(), 0);
-        QVERIFY(readfile(file) != saved);
         QVERIFY(readfile(file).find("1 NAME Changed Elsewhere") != std::string::npos);
         QCOMPARE(backups(s).size(), 1);
         QVERIFY(!filechanged(*w.index())); // read again
