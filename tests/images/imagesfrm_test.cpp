@@ -127,7 +127,6 @@ private slots:
         const QString wide = png(QStringLiteral("wide.png"), 40, 20);
         QCOMPARE(v.showfile(wide), imagepreview::outcome::shown);
         QCOMPARE(v.picture().size(), QSize(40, 20));
-        QCOMPARE(v.message(), QString());
         QCOMPARE(picturebox::fitted(QSize(40, 20), QSize(200, 200)), QRect(0, 0, 200, 100));
         QCOMPARE(picturebox::fitted(QSize(300, 600), QSize(200, 200)), QRect(0, 0, 100, 200));
 
