@@ -9,29 +9,26 @@
 #include <QStandardPaths>
 #include <QTemporaryDir>
 
+#include <functional>
+
 #include <gtest/gtest.h>
 
 using namespace qm;
 
-TEST(OptionsLogName, GedcomNamesAreRefusedWhateverTheirCase)
+TEST(OptionsLogName, GedcomAndEmptyNamesRefusedTxtAppendedWhenMissing)
 {
     for (const char* name : {"/tmp/family.GED", "/tmp/family.ged", "/tmp/family.Ged", "/tmp/logged"}) {
         const logname n = chooselogname(QString::fromLatin1(name));
         EXPECT_EQ(n.error, gedcomlogmessage()) << name;
         EXPECT_TRUE(n.path.isEmpty()) << name;
     }
-    EXPECT_EQ(gedcomlogmessage(), "You should not (and can not) use a gedcom file to log these changes!");
-}
-
-TEST(OptionsLogName, EmptyNameIsRefusedAndTxtIsAppendedWhenMissing)
-{
     EXPECT_EQ(chooselogname(QString()).error, "You must select a path and file name for the log file");
-    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/census")).path, QDir::toNativeSeparators("/tmp/census.txt"));
-    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/census.log")).path,
-              QDir::toNativeSeparators("/tmp/census.log.txt"));
-    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/census.txt")).path, QDir::toNativeSeparators("/tmp/census.txt"));
-    EXPECT_EQ(chooselogname(QDir::toNativeSeparators("/tmp/CENSUS.TXT")).path, QDir::toNativeSeparators("/tmp/CENSUS.TXT"));
-    EXPECT_TRUE(chooselogname(QStringLiteral("/tmp/census")).error.isEmpty());
+    for (const auto& [in, out] : {std::pair{"/tmp/census", "/tmp/census.txt"}, {"/tmp/census.log", "/tmp/census.log.txt"},
+                                  {"/tmp/census.txt", "/tmp/census.txt"}, {"/tmp/CENSUS.TXT", "/tmp/CENSUS.TXT"}}) {
+        const logname n = chooselogname(QDir::toNativeSeparators(in));
+        EXPECT_EQ(n.path, QDir::toNativeSeparators(out)) << in;
+        EXPECT_TRUE(n.error.isEmpty()) << in;
+    }
 }
 
 TEST(OptionsBackupFolder, OneTrailingSeparatorIsDropped)
@@ -47,23 +44,17 @@ TEST(OptionsBackupFolder, OneTrailingSeparatorIsDropped)
 
 TEST(OptionsCertainty, AssessmentButtonsRecordPrimaryToUnreliable)
 {
-    EXPECT_EQ(certaintyofchoice(-1), -1);
-    EXPECT_EQ(certaintyofchoice(0), 3); // primary
-    EXPECT_EQ(certaintyofchoice(1), 2); // secondary
-    EXPECT_EQ(certaintyofchoice(2), 1); // questionable
-    EXPECT_EQ(certaintyofchoice(3), 0); // unreliable
-    for (int c = -1; c <= 3; ++c)
-        EXPECT_EQ(certaintyofchoice(choiceofcertainty(c)), c);
+    for (int choice = -1; choice <= 3; ++choice) {
+        EXPECT_EQ(certaintyofchoice(choice), choice < 0 ? -1 : 3 - choice) << choice; // primary 3 ... unreliable 0
+        EXPECT_EQ(choiceofcertainty(certaintyofchoice(choice)), choice) << choice;
+    }
     EXPECT_EQ(choiceofcertainty(7), -1);
 }
 
 TEST(OptionsEnabling, DependentControlsFollowTheirBoxes)
 {
     settings s = defaultsettings();
-    s.keeplog = false;
-    s.opt1entrydate = false;
-    s.requestimages2 = false;
-    s.alternateseparator = false;
+    s.keeplog = s.opt1entrydate = s.requestimages2 = s.alternateseparator = false;
     s.country = "USA";
     optionsenabling e = enablingof(s);
     EXPECT_FALSE(e.logpath);
@@ -76,9 +67,7 @@ TEST(OptionsEnabling, DependentControlsFollowTheirBoxes)
     e = enablingof(s);
     EXPECT_TRUE(e.entrydatetoday);
     EXPECT_FALSE(e.image2event);
-    s.requestimages2 = true;
-    s.keeplog = true;
-    s.alternateseparator = true;
+    s.requestimages2 = s.keeplog = s.alternateseparator = true;
     s.country = "UK";
     e = enablingof(s);
     EXPECT_TRUE(e.image2event && e.logpath && e.separator && e.autoreference);
@@ -87,37 +76,27 @@ TEST(OptionsEnabling, DependentControlsFollowTheirBoxes)
 TEST(OptionsDefaults, DefaultSettingsButtonKeepsWhatItDoesNotSet)
 {
     settings form;
-    form.fullentry = false;
+    form.fullentry = form.keeplog = form.requestimage = form.occplace = false;
     form.country = "Canada";
     form.certainty = 2;
-    form.keeplog = false;
     form.logpath = "/elsewhere/log.txt";
     form.backupfolder = "/elsewhere";
     form.alternateseparator = true;
     form.alternateseparatorcharacter = "|";
-    form.requestimage = false;
-    form.occplace = false;
     form.title = "{YEAR}";
-    form.marriagecondition = true;
-    form.flaguse = true;
-    form.flagcheck = true;
-    form.birthsecondaryevidence = true;
+    form.marriagecondition = form.flaguse = form.flagcheck = form.birthsecondaryevidence = true;
     form.count = 12;
     const settings d = dialogdefaults(form);
-    EXPECT_TRUE(d.fullentry);
+    EXPECT_TRUE(d.fullentry && d.keeplog && d.requestimage && d.occplace);
     EXPECT_EQ(d.country, "UK");
     EXPECT_EQ(d.certainty, -1);
-    EXPECT_TRUE(d.keeplog);
     EXPECT_EQ(d.logpath, defaultlogpath());
     EXPECT_EQ(d.backupfolder, programfolder());
     EXPECT_FALSE(d.alternateseparator);
     EXPECT_EQ(d.alternateseparatorcharacter, "-");
-    EXPECT_TRUE(d.requestimage);
-    EXPECT_TRUE(d.occplace);
     EXPECT_EQ(d.title, defaulttitletemplate());
     // Not set by the button, or not on the dialog at all.
-    EXPECT_TRUE(d.marriagecondition);
-    EXPECT_TRUE(d.flaguse && d.flagcheck && d.birthsecondaryevidence);
+    EXPECT_TRUE(d.marriagecondition && d.flaguse && d.flagcheck && d.birthsecondaryevidence);
     EXPECT_EQ(d.count, 12);
 }
 
@@ -203,64 +182,45 @@ TEST_F(OptionsSave, WithoutKeepLogTheLogFileIsNeitherCreatedNorChecked)
     EXPECT_EQ(store->read("Keep Log"), "0");
 }
 
-TEST_F(OptionsSave, MethodChangeIsAskedAndNoStops)
+// Each change that needs the file read again is asked about, No stops the save;
+// with the method changed too, only the method question is asked.
+TEST_F(OptionsSave, MethodCountryAndIdOnlyChangesAreAskedAndNoStops)
 {
-    form.fullentry = false;
-    prompts.expect(answer::no, methodchangequestion());
-    EXPECT_EQ(save().stop, optionsstop::declined);
-    EXPECT_FALSE(written());
-    const message& m = prompts.history().back().m;
-    EXPECT_EQ(m.title, "Save Options");
-    EXPECT_EQ(m.choice, buttons::yesno);
-    EXPECT_EQ(m.kind, icon::exclamation);
-    EXPECT_EQ(m.defaultanswer, answer::no);
+    const struct {
+        std::function<void(settings&)> change;
+        QString question;
+    } cases[] = {
+        {[](settings& f) { f.fullentry = false; }, methodchangequestion()},
+        {[](settings& f) { f.country = "USA"; }, countrychangequestion()},
+        {[](settings& f) { f.idonly = true; }, idonlychangequestion()},
+        {[](settings& f) { f.fullentry = false; f.country = "Ireland"; f.idonly = true; }, methodchangequestion()},
+    };
+    int n = 0;
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.question.toStdString());
+        store = settingsstore::onfile(dir.filePath(QStringLiteral("case%1.ini").arg(++n)));
+        form = current;
+        c.change(form);
+        prompts.expect(answer::no, c.question);
+        EXPECT_EQ(save().stop, optionsstop::declined);
+        EXPECT_FALSE(written());
+        const message& m = prompts.history().back().m;
+        EXPECT_EQ(m.title, "Save Options");
+        EXPECT_EQ(m.choice, buttons::yesno);
+        EXPECT_EQ(m.kind, icon::exclamation);
+        EXPECT_EQ(m.defaultanswer, answer::no);
 
-    prompts.expect(answer::yes, methodchangequestion());
-    const optionssave r = save();
-    ASSERT_TRUE(r.saved());
-    EXPECT_TRUE(r.reloadneeded);
-    EXPECT_FALSE(r.values.fullentry);
-    EXPECT_EQ(store->read("Full Entry"), "0");
-    EXPECT_EQ(prompts.unexpected(), 0);
-}
-
-TEST_F(OptionsSave, MethodCountryAndIdOnlyChangedAskOnlyTheMethodQuestion)
-{
-    form.fullentry = false;
-    form.country = "Ireland";
-    form.idonly = true;
-    prompts.expect(answer::yes, methodchangequestion());
-    const optionssave r = save();
-    ASSERT_TRUE(r.saved());
-    EXPECT_TRUE(r.reloadneeded);
-    EXPECT_EQ(prompts.history().size(), 1u);
-    EXPECT_EQ(r.values.country, "Ireland");
-    EXPECT_TRUE(r.values.idonly);
-}
-
-TEST_F(OptionsSave, CountryChangeIsAsked)
-{
-    form.country = "USA";
-    prompts.expect(answer::no, countrychangequestion());
-    EXPECT_EQ(save().stop, optionsstop::declined);
-    prompts.expect(answer::yes, countrychangequestion());
-    const optionssave r = save();
-    EXPECT_TRUE(r.saved() && r.reloadneeded);
-    EXPECT_EQ(store->read("Country"), "USA");
-    EXPECT_EQ(prompts.unexpected(), 0);
-}
-
-TEST_F(OptionsSave, IdOnlyChangeIsAskedWhenNothingElseWas)
-{
-    form.idonly = true;
-    prompts.expect(answer::no, idonlychangequestion());
-    EXPECT_EQ(save().stop, optionsstop::declined);
-    EXPECT_FALSE(written());
-    EXPECT_EQ(prompts.history().back().m.title, "Save Options");
-    prompts.expect(answer::yes, idonlychangequestion());
-    const optionssave r = save();
-    EXPECT_TRUE(r.saved() && r.reloadneeded && r.values.idonly);
-    EXPECT_EQ(prompts.unexpected(), 0);
+        prompts.expect(answer::yes, c.question);
+        const optionssave r = save();
+        ASSERT_TRUE(r.saved());
+        EXPECT_TRUE(r.reloadneeded);
+        EXPECT_EQ(r.values.fullentry, form.fullentry);
+        EXPECT_EQ(r.values.country, form.country);
+        EXPECT_EQ(r.values.idonly, form.idonly);
+        EXPECT_EQ(store->read("Country"), form.country);
+        EXPECT_EQ(prompts.unexpected(), 0);
+    }
+    EXPECT_EQ(prompts.history().size(), 8u); // two questions a case, nothing more
 }
 
 TEST_F(OptionsSave, EmptySeparatorStopsAfterTheQuestions)
