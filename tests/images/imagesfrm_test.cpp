@@ -47,8 +47,7 @@ QStringList rows(const QListWidget* l)
 
 QString readtext(const QString& path)
 {
-    QFile f(path);
-    return f.open(QIODevice::ReadOnly) ? QString::fromUtf8(f.readAll()) : QString();
+    return QString::fromStdString(readfile(path));
 }
 
 // A family file with three multimedia records: a census title, a census

@@ -152,25 +152,6 @@ TEST_F(OptionsSave, UnchangedFormSavesWithoutQuestionsAndClearsFirstStart)
     EXPECT_TRUE(written());
 }
 
-TEST_F(OptionsSave, LogFileThatCannotBeCreatedStopsBeforeAnyQuestion)
-{
-    form.logpath = dir.filePath("no such folder/log.txt");
-    form.fullentry = false;
-    prompts.expect(answer::ok, "Error creating the log file specified, please check the file name and path and that "
-                               "you have access to it and that the disk is not full.");
-    EXPECT_EQ(save().stop, optionsstop::logfile);
-    EXPECT_EQ(prompts.history().size(), 1u);
-    EXPECT_EQ(prompts.unexpected(), 0);
-    EXPECT_FALSE(written());
-
-    // A path typed by hand naming a GEDCOM file is refused as the chooser refuses it.
-    form.logpath = dir.filePath("family.GED");
-    prompts.expect(answer::ok, gedcomlogmessage());
-    EXPECT_EQ(save().stop, optionsstop::logfile);
-    EXPECT_FALSE(QFileInfo::exists(form.logpath));
-    EXPECT_EQ(prompts.unexpected(), 0);
-}
-
 TEST_F(OptionsSave, WithoutKeepLogTheLogFileIsNeitherCreatedNorChecked)
 {
     form.keeplog = false;
@@ -223,21 +204,44 @@ TEST_F(OptionsSave, MethodCountryAndIdOnlyChangesAreAskedAndNoStops)
     EXPECT_EQ(prompts.history().size(), 8u); // two questions a case, nothing more
 }
 
-TEST_F(OptionsSave, EmptySeparatorStopsAfterTheQuestions)
+// Each stop of Save: its message or question, in that order, and nothing written.
+TEST_F(OptionsSave, EachStopShowsItsMessageAndWritesNothing)
 {
-    form.alternateseparator = true;
-    form.alternateseparatorcharacter.clear();
-    form.country = "Canada";
-    prompts.expect(answer::yes, countrychangequestion());
-    EXPECT_EQ(save().stop, optionsstop::noseparator);
-    EXPECT_FALSE(written());
-    EXPECT_EQ(prompts.unexpected(), 0);
+    const struct {
+        std::function<void(settings&)> change;
+        std::vector<std::pair<answer, QString>> shown;
+        optionsstop stop;
+    } cases[] = {
+        {[&](settings& f) { f.logpath = dir.filePath("no such folder/log.txt"), f.fullentry = false; },
+         {{answer::ok, "Error creating the log file specified, please check the file name and path and that you have "
+                       "access to it and that the disk is not full."}},
+         optionsstop::logfile}, // before the method question
+        {[&](settings& f) { f.logpath = dir.filePath("family.GED"); }, {{answer::ok, gedcomlogmessage()}},
+         optionsstop::logfile}, // typed by hand: refused as the chooser refuses it
+        {[](settings& f) { f.alternateseparator = true, f.alternateseparatorcharacter.clear(), f.country = "Canada"; },
+         {{answer::yes, countrychangequestion()}}, optionsstop::noseparator}, // the window shows its message
+        {[&](settings& f) { f.backupfolder = dir.filePath("gone"), f.occage = true; },
+         {{answer::ok, "does not exist."}}, optionsstop::paths},
+    };
+    for (const auto& c : cases) {
+        form = current;
+        c.change(form);
+        const size_t before = prompts.history().size();
+        for (const auto& [a, text] : c.shown)
+            prompts.expect(a, text);
+        EXPECT_EQ(save().stop, c.stop) << c.shown.back().second.toStdString();
+        EXPECT_EQ(prompts.history().size() - before, c.shown.size());
+        EXPECT_EQ(prompts.unexpected(), 0);
+        EXPECT_FALSE(written());
+    }
+    EXPECT_FALSE(QFileInfo::exists(dir.filePath("family.GED")));
+}
 
-    // Unticked, an empty character is kept as it is.
+TEST_F(OptionsSave, UntickedSeparatorKeepsAnEmptyCharacter)
+{
     form.alternateseparator = false;
-    form.country = current.country;
-    const optionssave r = save();
-    ASSERT_TRUE(r.saved());
+    form.alternateseparatorcharacter.clear();
+    ASSERT_TRUE(save().saved());
     EXPECT_EQ(store->read("Alternate Separator Character"), "");
 }
 
@@ -248,18 +252,6 @@ TEST_F(OptionsSave, BackupFolderIsStoredWithoutItsTrailingSeparator)
     ASSERT_TRUE(r.saved());
     EXPECT_EQ(r.values.backupfolder, QDir::toNativeSeparators(dir.path()));
     EXPECT_EQ(store->read("Backup Folder"), QDir::toNativeSeparators(dir.path()));
-}
-
-TEST_F(OptionsSave, FailedPathCheckLeavesTheStoreAndTheSettingsAlone)
-{
-    current.firststart = true;
-    form.backupfolder = dir.filePath("gone");
-    form.occage = true;
-    prompts.expect(answer::ok, "does not exist.");
-    const optionssave r = save();
-    EXPECT_EQ(r.stop, optionsstop::paths);
-    EXPECT_FALSE(written());
-    EXPECT_EQ(prompts.unexpected(), 0);
 }
 
 TEST_F(OptionsSave, EverySettingOfTheFormIsStored)

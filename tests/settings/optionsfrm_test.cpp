@@ -153,8 +153,6 @@ private slots:
                            run.prompts.expect(answer::ok, QStringLiteral("does not exist. "));
                            f.savebut->click();
                            QVERIFY(f.isVisible());
-                           QCOMPARE(run.read("Occ Age"), QStringLiteral("0"));
-                           QVERIFY(!run.w->currentsettings().occage);
                            run.prompts.expectfile(files_.path() + QLatin1Char('/'));
                            f.folderpathbut->click();
                            QCOMPARE(f.folderpathtxt->text(), native(files_.path() + QLatin1Char('/')));
