@@ -350,10 +350,11 @@ private slots:
                 child<QPushButton>(*d, "okbut")->click();
             });
         });
-        dialogs.expect(QStringLiteral("currentimagesfrm"), [](QDialog* d) {
+        const auto link1881page = [](QDialog* d) {
             pick(child<QListWidget>(*d, "imageslst"), QStringLiteral("Census 1881 Hebden Bridge"));
             child<QPushButton>(*d, "okbut")->click();
-        });
+        };
+        dialogs.expect(QStringLiteral("currentimagesfrm"), link1881page);
         dialogs.expect(QStringLiteral("newimagefrm"), [&](QDialog* d) {
             run->prompts.expectfile(page);
             child<QPushButton>(*d, "choosefilebut")->click();
@@ -421,10 +422,7 @@ private slots:
                 child<QPushButton>(*d, "okbut")->click();
             });
         });
-        dialogs.expect(QStringLiteral("currentimagesfrm"), [](QDialog* d) {
-            pick(child<QListWidget>(*d, "imageslst"), QStringLiteral("Census 1881 Hebden Bridge"));
-            child<QPushButton>(*d, "okbut")->click();
-        });
+        dialogs.expect(QStringLiteral("currentimagesfrm"), link1881page);
         menu->trigger();
         QTRY_COMPARE(dialogs.pending(), 0);
         QCOMPARE(dialogs.unexpected, 0);
