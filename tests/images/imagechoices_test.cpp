@@ -30,12 +30,11 @@ gedcomindex sampleindex()
 
 TEST(ImageChoices, FileTypesAndTitlesFromTheFileName)
 {
-    EXPECT_EQ(imagefiletype(QStringLiteral("C:\\Scans\\page.JPG")), QStringLiteral("jpeg"));
-    EXPECT_EQ(imagefiletype(QStringLiteral("/s/page.jpeg")), QStringLiteral("jpeg"));
-    EXPECT_EQ(imagefiletype(QStringLiteral("/s/page.TIFF")), QStringLiteral("tiff"));
-    EXPECT_EQ(imagefiletype(QStringLiteral("/s/page.PNG")), QStringLiteral("png"));
-    EXPECT_EQ(imagefiletype(QStringLiteral("/s/page")), QString());
-    EXPECT_EQ(imagefiletype(QStringLiteral("/scans.2024/page")), QString()); // a "." of the folder is no type
+    // A "." of the folder is no type.
+    for (const auto& [path, type] : {std::pair{"C:\\Scans\\page.JPG", "jpeg"}, {"/s/page.jpeg", "jpeg"},
+                                     {"/s/page.TIFF", "tiff"}, {"/s/page.PNG", "png"}, {"/s/page", ""},
+                                     {"/scans.2024/page", ""}})
+        EXPECT_EQ(imagefiletype(QString::fromLatin1(path)), QString::fromLatin1(type)) << path;
 
     EXPECT_EQ(titlefromfilename(QStringLiteral("C:\\Scans\\RG11 4426.52.jpg")), QStringLiteral("RG11 4426.52"));
     EXPECT_EQ(titlefromfilename(QStringLiteral("/s/page")), QStringLiteral("page"));
