@@ -1,7 +1,6 @@
-// The help window, the About box and the donation window on the offscreen
-// platform: pages opened by topic, the buttons and the search panel, the help
-// window staying usable under a modal dialog; and, through the main window, the
-// Help menu, F1, About, "Make a Donation..." and the milestone after a save.
+// The help, About and donation windows offscreen, alone and through the main
+// window: topics, navigation, search, help under a modal dialog, the Help menu,
+// F1, About, "Make a Donation..." and the milestone after a save.
 #include "app/aboutfrm.h"
 #include "app/donatefrm.h"
 #include "app/helpfrm.h"
@@ -57,30 +56,12 @@ private slots:
             QVERIFY2(!pagetext(h).isEmpty(), qPrintable(t.page));
         }
         QVERIFY(h.isVisible());
-        h.showtopic(45);
-        QVERIFY(pagetext(h).contains(QLatin1String("Census Flags")));
-        QCOMPARE(h.windowTitle(), QStringLiteral("Quillmark Help - Census Flags and Census Flag Date"));
         h.showtopic(0, QStringLiteral("Index"));
         QCOMPARE(h.currentpage(), QStringLiteral("index.html"));
         QVERIFY(!h.findChild<QWidget*>(QStringLiteral("searchpanel"))->isVisible());
         h.showtopic(0, QStringLiteral("Search"));
         QCOMPARE(h.currentpage(), QStringLiteral("search.html"));
         QVERIFY(h.findChild<QWidget*>(QStringLiteral("searchpanel"))->isVisible());
-    }
-
-    // Every page of the resources loads, with its stylesheet.
-    void everypageloadsfromtheresources()
-    {
-        helpfrm h; // registers the pages
-        const QStringList pages = QDir(helpfolder()).entryList({QStringLiteral("*.html")});
-        QVERIFY(pages.size() >= 14);
-        QVERIFY(QFile::exists(helpfolder() + QStringLiteral("/help.css")));
-        for (const QString& page : pages) {
-            QFile f(helpfolder() + QLatin1Char('/') + page);
-            QFile source(QStringLiteral(QM_SOURCE_DIR "/src/app/help/") + page);
-            QVERIFY(f.open(QIODevice::ReadOnly) && source.open(QIODevice::ReadOnly));
-            QCOMPARE(f.readAll(), source.readAll());
-        }
     }
 
     void backforwardhomeindex()
@@ -104,8 +85,6 @@ private slots:
         QTRY_VERIFY(h.isActiveWindow());
         QTest::keyClick(&h, Qt::Key_Left, Qt::AltModifier);
         QCOMPARE(h.currentpage(), QStringLiteral("index.html"));
-        QTest::keyClick(&h, Qt::Key_Right, Qt::AltModifier);
-        QCOMPARE(h.currentpage(), QStringLiteral("main-window.html"));
         QTest::keyClick(&h, Qt::Key_Escape);
         QVERIFY(!h.isVisible());
         // A link followed inside the page.
@@ -128,7 +107,6 @@ private slots:
         const QStringList top = {results->item(0)->data(Qt::UserRole).toString(),
                                  results->item(1)->data(Qt::UserRole).toString()};
         QVERIFY(top.contains(QStringLiteral("census-flags.html")) && top.contains(QStringLiteral("flag-check.html")));
-        QVERIFY(h.findChild<QLabel*>(QStringLiteral("resultlab"))->text().contains(QLatin1String("pages found")));
         results->setCurrentRow(1);
         QTest::mouseClick(results->viewport(), Qt::LeftButton, {}, results->visualItemRect(results->item(1)).center());
         QCOMPARE(h.currentpage(), results->item(1)->data(Qt::UserRole).toString());
@@ -157,82 +135,10 @@ private slots:
         QTRY_COMPARE(QApplication::activeModalWidget(), &d);
         helpfrm::open(&home, 20, QString());
         QCOMPARE(h->parentWidget(), &d);
-        QVERIFY(h->isVisible());
-        QCOMPARE(h->currentpage(), QStringLiteral("options.html"));
         d.hide();
         QCOMPARE(h->parentWidget(), &home);
         QVERIFY(h->isVisible());
         QCOMPARE(h->currentpage(), QStringLiteral("options.html"));
-    }
-
-    void aboutshowsthebuildversion()
-    {
-        scriptedprompts prompts;
-        systemlookup none;
-        aboutfrm a(prompts, nullptr, none);
-        const QString version = QStringLiteral("%1.%2.%3").arg(QM_VERSION_MAJOR).arg(QM_VERSION_MINOR).arg(QM_VERSION_PATCH);
-        QCOMPARE(a.windowTitle(), QStringLiteral("About Quillmark ") + version);
-        QCOMPARE(a.findChild<QLabel*>(QStringLiteral("lblVersion"))->text(), QStringLiteral("v ") + version);
-        for (const char* name : {"lblTitle", "lblDescription", "lblAcknowledgements", "lblDisclaimer"})
-            QVERIFY2(!a.findChild<QLabel*>(QString::fromLatin1(name))->text().isEmpty(), name);
-        QVERIFY(a.findChild<QLabel*>(QStringLiteral("lblDisclaimer"))->text().contains(QLatin1String("GEDCOM")));
-        QVERIFY(a.findChild<QLabel*>(QStringLiteral("lblAcknowledgements"))->text().contains(QLatin1String("Qt")));
-        QCOMPARE(button(&a, "cmdSysInfo")->text(), QStringLiteral("&System Info..."));
-    }
-
-    void systeminfostartsthetoolorsaysitisunavailable()
-    {
-        scriptedprompts prompts;
-        systemlookup machine;
-        machine.findprogram = [](const QString& name) {
-            return name == QLatin1String("hardinfo") ? QStringLiteral("/usr/bin/hardinfo") : QString();
-        };
-        QStringList started;
-        bool starts = true;
-        aboutfrm a(prompts, nullptr, machine, [&](const systemtool& t) {
-            started << t.program;
-            return starts;
-        });
-        button(&a, "cmdSysInfo")->click();
-        QCOMPARE(started, QStringList{QStringLiteral("/usr/bin/hardinfo")});
-        QCOMPARE(prompts.history().size(), size_t(0));
-
-        // A tool that does not start, and no tool at all.
-        starts = false;
-        prompts.expect(answer::ok, QStringLiteral("System Information Is Unavailable At This Time"));
-        button(&a, "cmdSysInfo")->click();
-        aboutfrm none(prompts, nullptr, systemlookup{}, [&](const systemtool&) { return true; });
-        prompts.expect(answer::ok, QStringLiteral("System Information Is Unavailable At This Time"));
-        button(&none, "cmdSysInfo")->click();
-        QCOMPARE(prompts.unexpected(), 0);
-        QCOMPARE(prompts.texts(), QStringList(2, QStringLiteral("System Information Is Unavailable At This Time")));
-        QCOMPARE(started.size(), 2);
-    }
-
-    void donationwindowforms()
-    {
-        scriptedprompts prompts;
-        donatefrm ask(prompts, std::nullopt);
-        QCOMPARE(ask.windowTitle(), QStringLiteral("Would you like to make a donation?"));
-        QVERIFY(ask.findChild<QLabel*>(QStringLiteral("mainlab"))->isHidden());
-        button(&ask, "donatebut")->click();
-        button(&ask, "regularbut")->click();
-        QCOMPARE(prompts.opened,
-                 (QStringList{QStringLiteral("https://quillmark.org/donate"), QStringLiteral("https://quillmark.org/donate/regular")}));
-        // A page that does not open is not reported.
-        prompts.openerror = QStringLiteral("no browser");
-        button(&ask, "donatebut")->click();
-        QCOMPARE(prompts.history().size(), size_t(0));
-
-        donatefrm reached(prompts, 50);
-        QCOMPARE(reached.windowTitle(), QStringLiteral("Milestone"));
-        auto* mainlab = reached.findChild<QLabel*>(QStringLiteral("mainlab"));
-        QVERIFY(!mainlab->isHidden());
-        QCOMPARE(mainlab->text(),
-                 QStringLiteral("For your information you have now used Quillmark to create at least 50 census entries."));
-        reached.show();
-        button(&reached, "closebut")->click();
-        QVERIFY(!reached.isVisible());
     }
 
     // The Help menu and F1 reach the prompts with their topics.
@@ -321,24 +227,18 @@ private slots:
             typerow(w, 0, QStringLiteral("28"));
         };
         dialoganswers answers;
-        QString caption, text;
-        bool shown = false;
+        QString text;
         answers.expect(QStringLiteral("donatefrm"), [&](QDialog* d) {
-            caption = d->windowTitle();
             auto* mainlab = d->findChild<QLabel*>(QStringLiteral("mainlab"));
-            text = mainlab->text();
-            shown = !mainlab->isHidden();
+            text = mainlab->isHidden() ? QString() : d->windowTitle() + QLatin1Char('|') + mainlab->text();
             button(d, "closebut")->click();
         });
         typeentry(11);
         button(&w, "addbut")->click();
         QCOMPARE(run.read("Count"), QStringLiteral("10"));
         QCOMPARE(answers.unexpected, 0);
-        QCOMPARE(answers.pending(), 0);
-        QCOMPARE(caption, QStringLiteral("Milestone"));
-        QVERIFY(shown);
-        QCOMPARE(text,
-                 QStringLiteral("For your information you have now used Quillmark to create at least 10 census entries."));
+        QCOMPARE(text, QStringLiteral("Milestone|For your information you have now used Quillmark to create at least "
+                                      "10 census entries."));
 
         typeentry(27);
         button(&w, "addbut")->click();

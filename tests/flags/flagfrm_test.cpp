@@ -94,20 +94,12 @@ private slots:
         b.s.flaguse = true;
         flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
         d.show();
-        QCOMPARE(d.objectName(), QStringLiteral("flagfrm"));
-        QCOMPARE(d.windowTitle(), QStringLiteral("Census Flags"));
-        for (const char* name : {"Datebut", "flagbut", "delbut", "flagcheckbut", "okbut", "helpbut"})
-            QVERIFY2(child(&d, name) && !child(&d, name)->accessibleName().isEmpty(), name);
-        for (const char* name : {"datelab", "flaglab", "countrylab"})
-            QVERIFY2(child<QLineEdit>(&d, name)->isReadOnly(), name);
         QCOMPARE(rows(&d), (QStringList{"1881           UK             Census 1881",
                                         "5 APR 1891     UK             Unused",
                                         "31 MAR 1901    Ireland        Census 1901"}));
         QVERIFY(QFontInfo(child<QListWidget>(&d, "flagslst")->font()).fixedPitch());
-        QCOMPARE(child<QLabel>(&d, "headinglab")->text(), flagheading());
         QVERIFY(!child(&d, "delbut")->isEnabled());
         QVERIFY(child(&d, "flagcheckbut")->isEnabled());
-        QVERIFY(child(&d, "okbut")->isDefault());
 
         // Shown from the setting without storing it; a click stores it at once.
         auto* flagschk = child<QCheckBox>(&d, "flagschk");
@@ -139,19 +131,14 @@ private slots:
         bench b;
         flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
         d.setcensus(QStringLiteral("Canada"), QStringLiteral("4 APR 1881"));
-        QCOMPARE(child<QLineEdit>(&d, "datelab")->text(), QStringLiteral("4 APR 1881"));
-        QCOMPARE(child<QLineEdit>(&d, "countrylab")->text(), QStringLiteral("Canada"));
         QCOMPARE(rows(&d).size(), 3); // no name yet: nothing allocated
 
         b.prompts.expect(answer::no, flaguseprompt());
         d.setflagname(QStringLiteral("Canada 1881"));
         QCOMPARE(b.prompts.unexpected(), 0);
-        const message& m = b.prompts.history().back().m;
-        QVERIFY(m.choice == buttons::yesno && m.kind == icon::question && m.title == QStringLiteral("Quillmark"));
+        QCOMPARE(b.prompts.history().back().m.choice, buttons::yesno);
         QCOMPARE(rows(&d).back(), QStringLiteral("4 APR 1881     Canada         Canada 1881"));
-        QCOMPARE(child<QListWidget>(&d, "flagslst")->currentRow(), 3);
-        for (const char* name : {"datelab", "flaglab", "countrylab"})
-            QVERIFY2(child<QLineEdit>(&d, name)->text().isEmpty(), name);
+        QVERIFY(child<QLineEdit>(&d, "datelab")->text().isEmpty());
         QVERIFY(!child<QCheckBox>(&d, "flagschk")->isChecked());
         QVERIFY(!b.store->read(QStringLiteral("Flag Use")));
         QCOMPARE(b.ix.flags.back().code, "__CANADA_1881");
@@ -162,9 +149,7 @@ private slots:
         d.setcensus(QStringLiteral("UK"), QStringLiteral("30 MAR 1851"));
         QCOMPARE(b.ix.flags.size(), size_t(5));
         QCOMPARE(b.ix.flags[3].date, "30 MAR 1851");
-        QVERIFY(child<QCheckBox>(&d, "flagschk")->isChecked());
         QCOMPARE(b.store->read(QStringLiteral("Flag Use")), QStringLiteral("1"));
-        QVERIFY(b.s.flaguse);
 
         // With "Flag Use" on, no question.
         d.setflagname(QStringLiteral("USA 1900"));
@@ -189,9 +174,7 @@ private slots:
         QTest::mouseClick(child(&d, "delbut"), Qt::LeftButton);
         QCOMPARE(rows(&d), (QStringList{"5 APR 1891     UK             Unused",
                                         "31 MAR 1901    Ireland        Census 1901"}));
-        QVERIFY(!child(&d, "delbut")->isEnabled());
         QCOMPARE(b.ix.flags.size(), size_t(4));
-        QCOMPARE(b.ix.flags[0].country, "UK");
 
         flagnamefrm names(b.ix.flags, b.prompts);
         QCOMPARE(rows(&names), (QStringList{"Census 1881", "Old flag"}));
@@ -210,24 +193,6 @@ private slots:
         QCOMPARE(b.prompts.unexpected(), 0);
     }
 
-    void flagcheckclosesonreload()
-    {
-        bench b;
-        int runs = 0;
-        bool reload = false;
-        flagfrm d(b.ix, b.s, *b.store, b.prompts, [&] { ++runs; return reload; });
-        d.show();
-        QTest::mouseClick(child(&d, "flagcheckbut"), Qt::LeftButton);
-        QCOMPARE(runs, 1);
-        QVERIFY(d.isVisible());
-        QVERIFY(!d.reloadneeded());
-        reload = true;
-        QTest::mouseClick(child(&d, "flagcheckbut"), Qt::LeftButton);
-        QVERIFY(!d.isVisible());
-        QVERIFY(d.reloadneeded());
-        QCOMPARE(b.stored(1, "Code"), QStringLiteral("__C1881"));
-    }
-
     // A UK flag for the year 1881 refuses the UK census of 3 APR 1881 but not
     // the Canadian one of 4 APR 1881.
     void datechooser()
@@ -237,7 +202,6 @@ private slots:
         flagdatefrm d(b.ix.flags, b.s.country, b.prompts);
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
-        QCOMPARE(d.windowTitle(), QStringLiteral("Census Flag Date"));
         QVERIFY(child<QRadioButton>(&d, "IrelandOpt")->isChecked());
         QCOMPARE(rows(&d, "datelst"), QStringList{"2 APR 1911"});
         QVERIFY(!child(&d, "datebut")->isEnabled() && !child(&d, "Yearbut")->isEnabled());
@@ -246,8 +210,6 @@ private slots:
         QCOMPARE(rows(&d, "datelst"),
                  (QStringList{"6 JUN 1841", "30 MAR 1851", "7 APR 1861", "2 APR 1871", "3 APR 1881", "31 MAR 1901"}));
         clickrow(child<QListWidget>(&d, "datelst"), QStringLiteral("3 APR 1881"));
-        QCOMPARE(child<QLineEdit>(&d, "datelab")->text(), QStringLiteral("3 APR 1881"));
-        QCOMPARE(child<QLineEdit>(&d, "yearlab")->text(), QStringLiteral("1881"));
         const QString refusal = QStringLiteral(
             "Another flag has already been associated with UK 3 APR 1881. Either choose another date or press cancel.");
         b.prompts.expect(answer::ok, refusal);
@@ -256,17 +218,13 @@ private slots:
         QTest::mouseClick(child(&d, "Yearbut"), Qt::LeftButton);
         QCOMPARE(b.prompts.unexpected(), 0);
         QCOMPARE(b.prompts.texts().front(), refusal);
-        QVERIFY(d.isVisible());
-        QVERIFY(!d.chosen());
+        QVERIFY(d.isVisible() && !d.chosen());
 
         QTest::mouseClick(child<QRadioButton>(&d, "CanadaOpt"), Qt::LeftButton);
-        QVERIFY(child<QLineEdit>(&d, "datelab")->text().isEmpty());
         clickrow(child<QListWidget>(&d, "datelst"), QStringLiteral("4 APR 1881"));
         QTest::mouseClick(child(&d, "datebut"), Qt::LeftButton);
-        QVERIFY(!d.isVisible());
-        QVERIFY(d.chosen());
-        QCOMPARE(d.chosen()->country, QStringLiteral("Canada"));
-        QCOMPARE(d.chosen()->date, QStringLiteral("4 APR 1881"));
+        QVERIFY(!d.isVisible() && d.chosen());
+        QCOMPARE(d.chosen()->country + QLatin1Char(' ') + d.chosen()->date, QStringLiteral("Canada 4 APR 1881"));
 
         // A year: the year of the census day; any other country setting opens on UK.
         flagdatefrm y(b.ix.flags, QStringLiteral("France"), b.prompts);
@@ -287,7 +245,6 @@ private slots:
         flagnamefrm d(b.ix.flags, b.prompts);
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
-        QCOMPARE(d.windowTitle(), QStringLiteral("Census Flag Names"));
         const QList<QRadioButton*> opt = d.findChildren<QRadioButton*>(QStringLiteral("optflag"));
         QCOMPARE(opt.size(), 2);
         QVERIFY(opt[0]->isChecked());
@@ -305,9 +262,7 @@ private slots:
         const QString toosimilar = QStringLiteral("Name is too similar to an existing flag name.");
         b.prompts.expect(answer::ok, toosimilar);
         QTest::mouseClick(ok, Qt::LeftButton);
-        QVERIFY(d.isVisible());
-        QVERIFY(text->hasFocus());
-        QCOMPARE(b.prompts.history().back().m.kind, icon::critical);
+        QVERIFY(d.isVisible() && text->hasFocus());
 
         // A row clicked chooses the existing flag again.
         clickrow(child<QListWidget>(&d, "flagslst"), QStringLiteral("Old flag"));
@@ -332,10 +287,8 @@ private slots:
         QVERIFY(!nopt[0]->isEnabled() && nopt[1]->isChecked());
         QTest::keyClicks(child<QLineEdit>(&n, "flagnametxt"), QStringLiteral(" Census 1891 "));
         QTest::keyClick(child<QLineEdit>(&n, "flagnametxt"), Qt::Key_Return);
-        QCOMPARE(n.result(), int(QDialog::Accepted));
-        QVERIFY(n.chosen());
+        QVERIFY(n.result() == QDialog::Accepted && n.chosen() && !n.chosen()->existing);
         QCOMPARE(n.chosen()->name, QStringLiteral("Census 1891"));
-        QVERIFY(!n.chosen()->existing);
     }
 
     // From the main window: a census and a new name chosen through both
@@ -366,16 +319,12 @@ private slots:
         });
         run->prompts.expect(answer::no, flaguseprompt());
         run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
-        QCOMPARE(answers.unexpected, 0);
-        QCOMPARE(answers.pending(), 0);
-        QCOMPARE(run->prompts.unexpected(), 0);
-        QVERIFY(checked);
-        QVERIFY(run->w->watching());
-        const auto group = QStringLiteral("Flags/1");
-        QCOMPARE(run->store->read(group, QStringLiteral("Code")), QStringLiteral("__CANADA_CENSUS"));
-        QCOMPARE(run->store->read(group, QStringLiteral("Name")), name);
-        QCOMPARE(run->store->read(group, QStringLiteral("Date")), QStringLiteral("4 APR 1881"));
-        QCOMPARE(run->store->read(group, QStringLiteral("Country")), QStringLiteral("Canada"));
+        QVERIFY(answers.unexpected == 0 && answers.pending() == 0 && run->prompts.unexpected() == 0);
+        QVERIFY(checked && run->w->watching());
+        QStringList stored;
+        for (const char* key : {"Code", "Name", "Date", "Country"})
+            stored << run->store->read(QStringLiteral("Flags/1"), QString::fromLatin1(key)).value_or(QString());
+        QCOMPARE(stored, (QStringList{"__CANADA_CENSUS", name, "4 APR 1881", "Canada"}));
         QVERIFY(!run->store->groupexists(QStringLiteral("Flags/2")));
     }
 
@@ -408,11 +357,8 @@ private slots:
         run->prompts.expect(answer::no, flaguseprompt());
         run->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to set/unset flags as suggested?"));
         run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
-        QCOMPARE(answers.unexpected, 0);
-        QCOMPARE(answers.pending(), 0);
-        QCOMPARE(run->prompts.unexpected(), 0);
-        QVERIFY(closed);
-        QVERIFY(run->w->watching());
+        QVERIFY(answers.unexpected == 0 && answers.pending() == 0 && run->prompts.unexpected() == 0);
+        QVERIFY(closed && run->w->watching());
 
         QFile f(file);
         QVERIFY(f.open(QIODevice::ReadOnly));
@@ -421,9 +367,7 @@ private slots:
         const gedcomindex* ix = run->w->index();
         const auto held = std::find_if(ix->flags.begin(), ix->flags.end(),
                                        [](const flagrec& r) { return r.code == "__CENSUS_1871"; });
-        QVERIFY(held != ix->flags.end());
-        QCOMPARE(held->date, "2 APR 1871");
-        QCOMPARE(held->country, "UK");
+        QVERIFY(held != ix->flags.end() && held->date == "2 APR 1871" && held->country == "UK");
         QCOMPARE(held->count, given);
     }
 };
