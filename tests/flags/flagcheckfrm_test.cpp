@@ -169,27 +169,33 @@ private slots:
         QVERIFY(r->w->watching());
     }
 
-    // Cancelling the country question ends the check: the message, no Flag
-    // Check dialog, nothing written.
-    void cancelledquestionwritesnothing()
+    // Cancelling the country question ends the check (the message, no Flag
+    // Check dialog); "Don't make changes" closes it. Neither writes anything.
+    void cancelledordeclinedwritesnothing()
     {
-        const QString file = familyfile();
-        const int before = backupcount();
-        dialoganswers dialogs;
-        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
-            click(d, "cancelbut");
-        });
-        auto r = start(file, checking(), [](scriptedprompts& p) {
-            p.expect(answer::ok, QStringLiteral("out of sync"));
-            p.expect(answer::ok, QStringLiteral("Flag check was cancelled. The flags in the file have not been changed."));
-        });
-        QVERIFY(r);
-        QTest::qWait(30);
-        QCOMPARE(dialogs.seen, QStringList({QStringLiteral("flagcheckcountryfrm")}));
-        QCOMPARE(dialogs.unexpected, 0);
-        QCOMPARE(r->prompts.unexpected(), 0);
-        QCOMPARE(bytesof(file), family);
-        QCOMPARE(backupcount(), before);
+        for (const bool cancel : {true, false}) {
+            const QString file = familyfile();
+            const int before = backupcount();
+            dialoganswers dialogs;
+            dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [cancel](QDialog* d) {
+                d->findChild<QCheckBox*>(QStringLiteral("alwayschk"))->setChecked(true);
+                click(d, cancel ? "cancelbut" : "okbut");
+            });
+            if (!cancel)
+                dialogs.expect(QStringLiteral("flagcheckfrm"), [](QDialog* d) { click(d, "closebut"); });
+            auto r = start(file, checking(), [cancel](scriptedprompts& p) {
+                p.expect(answer::ok, QStringLiteral("out of sync"));
+                if (cancel)
+                    p.expect(answer::ok,
+                             QStringLiteral("Flag check was cancelled. The flags in the file have not been changed."));
+            });
+            QVERIFY(r);
+            QTest::qWait(30);
+            QVERIFY(dialogs.unexpected == 0 && dialogs.pending() == 0 && r->prompts.unexpected() == 0);
+            QCOMPARE(dialogs.seen.size(), cancel ? 1 : 2);
+            QCOMPARE(bytesof(file), family);
+            QCOMPARE(backupcount(), before);
+        }
     }
 
     // The family file changes outside the program while the dialog is open:
@@ -224,24 +230,6 @@ private slots:
         QCOMPARE(bytesof(file), changed);
         QCOMPARE(backupcount(), before);
         QCOMPARE(QString::fromUtf8(r->w->index()->people.at(3).name), QStringLiteral("Byrne, Patrick"));
-    }
-
-    // "Don't make changes" writes nothing.
-    void dontmakechanges()
-    {
-        const QString file = familyfile();
-        dialoganswers dialogs;
-        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
-            d->findChild<QCheckBox*>(QStringLiteral("alwayschk"))->setChecked(true);
-            click(d, "okbut");
-        });
-        dialogs.expect(QStringLiteral("flagcheckfrm"), [](QDialog* d) {
-            click(d, "closebut");
-        });
-        auto r = start(file, checking(), [](scriptedprompts& p) { p.expect(answer::ok, QStringLiteral("out of sync")); });
-        QVERIFY(r);
-        QVERIFY(dialogs.pending() == 0 && dialogs.unexpected == 0 && r->prompts.unexpected() == 0);
-        QCOMPARE(bytesof(file), family);
     }
 
     // With the flags in step nothing is shown; opening a file from the menu checks it too.
