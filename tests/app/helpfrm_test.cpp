@@ -1,8 +1,6 @@
-// The help, About and donation windows offscreen, alone and through the main
-// window: topics, navigation, search, help under a modal dialog, the Help menu,
-// F1, About, "Make a Donation..." and the milestone after a save.
-#include "app/aboutfrm.h"
-#include "app/donatefrm.h"
+// The help window offscreen (topics, navigation, search, help under a modal
+// dialog) and, through the main window, the Help menu, F1, About, "Make a
+// Donation..." and the milestone after a save.
 #include "app/helpfrm.h"
 #include "app/helptopics.h"
 #include "support/mainfrmfixture.h"
@@ -184,6 +182,7 @@ private slots:
         answers.expect(QStringLiteral("donatefrm"), [&](QDialog* d) {
             caption += QLatin1Char('|') + d->windowTitle();
             button(d, "donatebut")->click();
+            button(d, "regularbut")->click();
             button(d, "closebut")->click();
         });
         trigger(*run->w, "aboutmen");
@@ -193,7 +192,8 @@ private slots:
                               .arg(QM_VERSION_MAJOR)
                               .arg(QM_VERSION_MINOR)
                               .arg(QM_VERSION_PATCH));
-        QCOMPARE(run->prompts.opened, QStringList{QStringLiteral("https://quillmark.org/donate")});
+        QCOMPARE(run->prompts.opened, (QStringList{QStringLiteral("https://quillmark.org/donate"),
+                                                   QStringLiteral("https://quillmark.org/donate/regular")}));
     }
 
     // The tenth saved entry shows the milestone window; the eleventh does not.

@@ -14,6 +14,8 @@
 
 #include <gtest/gtest.h>
 
+#include <tuple>
+
 using namespace qm;
 
 namespace {
@@ -152,15 +154,14 @@ TEST(DateCheck, TiesGoToTheCensusMetFirstFromTheChosenCountry)
 {
     // 2 APR 1871 is the census day of the UK and of Canada: a date one day off
     // is as near to both.
-    const QDate d(1871, 4, 3);
-    EXPECT_EQ(nearestcensus(d, QStringLiteral("UK")), row("UK", 1871));
-    EXPECT_EQ(nearestcensus(d, QStringLiteral("Canada")), row("Canada", 1871));
-    // From Ireland's or the USA's rows Canada's census is met before the walk wraps round to the UK's.
-    EXPECT_EQ(nearestcensus(d, QStringLiteral("Ireland")), row("Canada", 1871));
-    EXPECT_EQ(nearestcensus(d, QStringLiteral("USA")), row("Canada", 1871));
-    // 31 MAR 1901: UK, Ireland and Canada.
-    EXPECT_EQ(nearestcensus(QDate(1901, 4, 1), QStringLiteral("Ireland")), row("Ireland", 1901));
-    EXPECT_EQ(nearestcensus(QDate(1901, 4, 1), QStringLiteral("USA")), row("Ireland", 1901));
+    // From Ireland's or the USA's rows Canada's census is met before the walk
+    // wraps round to the UK's. 31 MAR 1901: UK, Ireland and Canada.
+    const QDate d(1871, 4, 3), e(1901, 4, 1);
+    const std::tuple<QDate, const char*, int> cases[] = {
+        {d, "UK", row("UK", 1871)},       {d, "Canada", row("Canada", 1871)},  {d, "Ireland", row("Canada", 1871)},
+        {d, "USA", row("Canada", 1871)}, {e, "Ireland", row("Ireland", 1901)}, {e, "USA", row("Ireland", 1901)}};
+    for (const auto& [date, country, census] : cases)
+        EXPECT_EQ(nearestcensus(date, QLatin1String(country)), census) << country;
 }
 
 TEST(DateCheck, ListTexts)
