@@ -143,29 +143,23 @@ private slots:
                          QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with UK 1861 Census date 7 APR 1861]"),
                          QStringLiteral("ABT 1851 (1 occurence) : [Suggest replacing with UK 1851 Census date 30 MAR 1851]")}));
             QCOMPARE(rows(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
-            const QStringList current = rows(d, "currentlst");
-            QCOMPARE(current.size(), 7);
-            QCOMPARE(current[0], QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
-            QVERIFY(current.contains(QStringLiteral("31 MAR 1901 (3 occurences) : UK 1901 Census")));
+            QCOMPARE(rows(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
             auto* changebut = control<QPushButton>(d, QStringLiteral("changebut"));
-            QVERIFY(changebut->isEnabled());
             auto* frame = control<QGroupBox>(d, QStringLiteral("suggestionframe"));
-            QVERIFY(frame->isHidden());
+            QVERIFY(changebut->isEnabled() && frame->isHidden());
             auto* combo = control<QComboBox>(d, QStringLiteral("suggestcombo"));
             click(d, QStringLiteral("helpbut"));
             QCOMPARE(run->prompts.helpshown, QStringList{QStringLiteral("35")});
 
             // Another country's date: only "Don't make change" or "Change to:".
             clickentry(d, "countrylst", 0);
-            QVERIFY(frame->isVisible());
+            QVERIFY(frame->isVisible() && !combo->isEnabled());
             QVERIFY(!control<QRadioButton>(d, QStringLiteral("suggestopt0"))->isEnabled());
             QVERIFY(control<QRadioButton>(d, QStringLiteral("suggestopt1"))->isChecked());
-            QVERIFY(!combo->isEnabled());
             QCOMPARE(details(d), QStringList{qs(w.index()->people[0].name) + QStringLiteral(" 43 Hebden Bridge, Yorkshire, England")});
             // ... left as it is.
             click(d, QStringLiteral("OKbut"));
-            QVERIFY(frame->isHidden());
-            QCOMPARE(rows(d, "countrylst").size(), 1);
+            QVERIFY(frame->isHidden() && rows(d, "countrylst").size() == 1);
 
             // Refuse the first proposal.
             clickentry(d, "changelst", 0);
