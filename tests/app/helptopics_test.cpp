@@ -39,6 +39,15 @@ QStringList qrcfiles()
     return out;
 }
 
+// "page:score" of each hit, best first.
+QStringList ranked(const std::vector<helpdoc>& docs, const char* query)
+{
+    QStringList out;
+    for (const helphit& h : searchhelp(docs, QString::fromUtf8(query)))
+        out << h.page + QLatin1Char(':') + QString::number(h.score);
+    return out;
+}
+
 } // namespace
 
 TEST(HelpTopics, EveryTopicHasItsOwnPageInTheResources)
@@ -132,26 +141,18 @@ TEST(HelpSearch, WholeWordsAnyCaseRankedByMatches)
         {QStringLiteral("c.html"), QStringLiteral("Gamma"), QStringLiteral("flagged, flagpole, flags")},
         {QStringLiteral("index.html"), QStringLiteral("Index"), QStringLiteral("flag flag flag flag flag flag")},
     };
-    const std::vector<helphit> hits = searchhelp(docs, QStringLiteral("FLAG"));
-    ASSERT_EQ(hits.size(), 2u); // c.html has no whole word "flag"; the index is left out
-    EXPECT_EQ(hits[0].page + QString::number(hits[0].score), QStringLiteral("b.html6")); // 1 in the text + 5 for the title
-    EXPECT_EQ(hits[1].page + QString::number(hits[1].score), QStringLiteral("a.html2"));
-    EXPECT_EQ(hits[1].excerpt, QStringLiteral("Flag flag and flags"));
-
-    const std::vector<helphit> prefix = searchhelp(docs, QStringLiteral("flag*"));
-    ASSERT_EQ(prefix.size(), 3u);
-    EXPECT_EQ(prefix[2].page + QString::number(prefix[2].score), QStringLiteral("c.html3"));
+    // c.html has no whole word "flag"; the index is left out; b.html: 1 in
+    // the text + 5 for the title.
+    EXPECT_EQ(ranked(docs, "FLAG"), (QStringList{"b.html:6", "a.html:2"}));
+    EXPECT_EQ(searchhelp(docs, QStringLiteral("FLAG")).at(1).excerpt, QStringLiteral("Flag flag and flags"));
+    EXPECT_EQ(ranked(docs, "flag*").value(2), QStringLiteral("c.html:3"));
 
     // The words of the query side by side count ten more.
     const std::vector<helpdoc> phrase = {
         {QStringLiteral("p.html"), QStringLiteral("P"), QStringLiteral("source source source where within it")},
         {QStringLiteral("q.html"), QStringLiteral("Q"), QStringLiteral("Where within source")},
     };
-    const std::vector<helphit> together = searchhelp(phrase, QStringLiteral("where within source"));
-    ASSERT_EQ(together.size(), 2u);
-    EXPECT_EQ(together[0].page, QStringLiteral("q.html"));
-    EXPECT_EQ(together[0].score, 13);
-    EXPECT_EQ(together[1].score, 5);
+    EXPECT_EQ(ranked(phrase, "where within source"), (QStringList{"q.html:13", "p.html:5"}));
 
     // The rarest word of the query decides first: one page with both words
     // twice beats one with a single word many times.
@@ -159,11 +160,9 @@ TEST(HelpSearch, WholeWordsAnyCaseRankedByMatches)
         {QStringLiteral("m.html"), QStringLiteral("M"), QStringLiteral("census census census census census census flag")},
         {QStringLiteral("n.html"), QStringLiteral("N"), QStringLiteral("census flag census flag")},
     };
-    const std::vector<helphit> both = searchhelp(mixed, QStringLiteral("census flag"));
-    ASSERT_EQ(both.size(), 2u);
-    EXPECT_EQ(both[0].page, QStringLiteral("n.html"));
-    EXPECT_EQ(both[0].least, 2);
-    EXPECT_EQ(both[1].score, 17); // 6 + 1 + 10 for the words side by side
+    // m.html: 6 + 1 + 10 for the words side by side.
+    EXPECT_EQ(ranked(mixed, "census flag").value(1), QStringLiteral("m.html:17"));
+    EXPECT_EQ(searchhelp(mixed, QStringLiteral("census flag")).at(0).least, 2);
 
     // Every word must occur; nothing typed finds nothing.
     EXPECT_EQ(searchhelp(docs, QStringLiteral("flag here")).size(), 1u);
