@@ -236,6 +236,11 @@ TEST(LoadGedcom, PeopleListOrderAndLimit)
     auto ix = load(ged("0 @I1@ INDI\n1 NAME Zoe /smith/\n0 @I2@ INDI\n1 NAME Al /Brown/\n"
                        "0 @I3@ INDI\n1 NAME Ann /SMITH/\n0 @I4@ INDI\n1 NAME ann /smith/\n0 @I5@ INDI\n1 NAME /brown/\n"));
     EXPECT_EQ(sortedpeople(*ix, true), (std::vector<int32_t>{4, 1, 2, 3, 0}));
+    // Accented names sort among their plain letters (the record number then decides).
+    auto accents = load(ged("0 @I1@ INDI\n1 NAME Louise /Durand/\n0 @I2@ INDI\n1 NAME \xC3\x89mile /Durand/\n"
+                            "0 @I3@ INDI\n1 NAME Emile /Durand/\n0 @I4@ INDI\n1 NAME Zo\xC3\xAB /Ashworth/\n"
+                            "0 @I5@ INDI\n1 NAME Zoe /Ashworth/\n"));
+    EXPECT_EQ(sortedpeople(*accents, true), (std::vector<int32_t>{3, 4, 1, 2, 0}));
 
     gedcomindex big;
     big.people.resize(32000);
