@@ -1,5 +1,6 @@
 #include "settings/optionsfrm.h"
 
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QButtonGroup>
@@ -27,22 +28,6 @@ namespace {
 
 // Captions longer than this wrap in a label beside their button.
 constexpr int shortcaption = 45;
-
-QLineEdit* textbox(const char* name, const QString& accessible, QWidget* parent)
-{
-    auto* e = new QLineEdit(parent);
-    e->setObjectName(QString::fromLatin1(name));
-    e->setAccessibleName(accessible);
-    return e;
-}
-
-QPushButton* button(const char* name, const QString& caption, QWidget* parent)
-{
-    auto* b = new QPushButton(caption, parent);
-    b->setObjectName(QString::fromLatin1(name));
-    b->setAutoDefault(false);
-    return b;
-}
 
 QVBoxLayout* rowsof(QGroupBox* f)
 {
@@ -80,14 +65,15 @@ optionsfrm::optionsfrm(prompts& p, settingsstore& store, const settings& current
     SSTab1->addTab(method2tab(), QStringLiteral("Recording Method &2"));
     SSTab1->addTab(misctab(), QStringLiteral("&Miscellaneous"));
 
-    savebut = button("savebut", QStringLiteral("&Save"), this);
+    savebut = plainbutton(this, "savebut", QStringLiteral("&Save"), QStringLiteral("Save"));
     savebut->setDefault(true);
-    Cancelbut = button("Cancelbut", QStringLiteral("Cancel"), this);
-    defaultbut = button("defaultbut", QStringLiteral("&Default Settings"), this);
-    Command1 = button("Command1", QStringLiteral("&Help"), this);
+    Cancelbut = plainbutton(this, "Cancelbut", QStringLiteral("Cancel"), QStringLiteral("Cancel"));
+    defaultbut =
+        plainbutton(this, "defaultbut", QStringLiteral("&Default Settings"), QStringLiteral("Default Settings"));
+    Command1 = plainbutton(this, "Command1", QStringLiteral("&Help"), QStringLiteral("Help"));
     auto* donateframe = new QGroupBox(QStringLiteral("Donate?"), this);
     donateframe->setObjectName(QStringLiteral("donatefra"));
-    donatebut = button("donatebut", QStringLiteral("D&onate"), donateframe);
+    donatebut = plainbutton(donateframe, "donatebut", QStringLiteral("D&onate"), QStringLiteral("Donate"));
     auto* d = new QHBoxLayout(donateframe);
     d->addWidget(donatebut);
 
@@ -201,11 +187,11 @@ QWidget* optionsfrm::generaltab()
 
     QGroupBox* backup = frame(QStringLiteral("Backup Folder"), "backupfra");
     auto* folderlab = new QLabel(QStringLiteral("Backups will be saved into this folder:"), backup);
-    folderpathtxt = textbox("folderpathtxt", QStringLiteral("Backup folder"), backup);
+    folderpathtxt = named(new QLineEdit(backup), "folderpathtxt", QStringLiteral("Backup folder"));
     folderpathtxt->setReadOnly(true);
     folderlab->setBuddy(folderpathtxt);
-    folderpathbut = button("folderpathbut", QStringLiteral("Change..."), backup);
-    folderpathbut->setAccessibleName(QStringLiteral("Change backup folder"));
+    folderpathbut =
+        plainbutton(backup, "folderpathbut", QStringLiteral("Change..."), QStringLiteral("Change backup folder"));
     auto* folderrow = new QHBoxLayout;
     folderrow->addWidget(folderpathtxt, 1);
     folderrow->addWidget(folderpathbut);
@@ -214,9 +200,8 @@ QWidget* optionsfrm::generaltab()
 
     QGroupBox* log = frame(QStringLiteral("Log File"), "logfra");
     keeplogchk = check(log, "keeplogchk", QStringLiteral("Keep a log of census entries created"));
-    pathtxt = textbox("pathtxt", QStringLiteral("Log file"), log);
-    pathbut = button("pathbut", QStringLiteral("Change..."), log);
-    pathbut->setAccessibleName(QStringLiteral("Change log file"));
+    pathtxt = named(new QLineEdit(log), "pathtxt", QStringLiteral("Log file"));
+    pathbut = plainbutton(log, "pathbut", QStringLiteral("Change..."), QStringLiteral("Change log file"));
     auto* logrow = new QHBoxLayout;
     logrow->addWidget(pathtxt, 1);
     logrow->addWidget(pathbut);
@@ -279,7 +264,7 @@ QWidget* optionsfrm::methodstab()
     separatorchk = new QCheckBox(QStringLiteral("Separate Auto-text columns with a"), autotext);
     separatorchk->setObjectName(QStringLiteral("separatorchk"));
     separatorchk->setAccessibleName(separatorchk->text());
-    separatortxt = textbox("separatortxt", QStringLiteral("Separator character"), autotext);
+    separatortxt = named(new QLineEdit(autotext), "separatortxt", QStringLiteral("Separator character"));
     separatortxt->setMaxLength(1);
     separatortxt->setFixedWidth(separatortxt->fontMetrics().horizontalAdvance(QStringLiteral("WW")) + 12);
     auto* separatorrow = new QHBoxLayout;
@@ -336,20 +321,21 @@ QWidget* optionsfrm::method1tab()
               QStringLiteral("Record the census reference in the source 'publication information' field"));
     auto* typelab = new QLabel(QStringLiteral("Record the Source Type (Leave empty if not required):"), options);
     typelab->setWordWrap(true);
-    sourcetypetxt = textbox("sourcetypetxt", QStringLiteral("Source type"), options);
+    sourcetypetxt = named(new QLineEdit(options), "sourcetypetxt", QStringLiteral("Source type"));
     typelab->setBuddy(sourcetypetxt);
     rowsof(options)->addWidget(typelab);
     rowsof(options)->addWidget(sourcetypetxt);
 
     QGroupBox* title = frame(QStringLiteral("Title Template"), "titlefra");
-    titletxt = textbox("titletxt", QStringLiteral("Title template"), title);
+    titletxt = named(new QLineEdit(title), "titletxt", QStringLiteral("Title template"));
     titlerefcom = new QComboBox(title);
     titlerefcom->setObjectName(QStringLiteral("titlerefcom"));
     titlerefcom->setAccessibleName(QStringLiteral("Add Reference"));
     titlerefcom->setPlaceholderText(QStringLiteral("<<Add Reference"));
     titlerefcom->addItems(titleplaceholders());
     titlerefcom->setCurrentIndex(-1);
-    defaulttitlebut = button("defaulttitlebut", QStringLiteral("Reset to Default Title"), title);
+    const QString resettitle = QStringLiteral("Reset to Default Title");
+    defaulttitlebut = plainbutton(title, "defaulttitlebut", resettitle, resettitle);
     auto* examplelab = new QLabel(QStringLiteral("Example Output:"), title);
     titleoutputlab = new QLabel(title);
     titleoutputlab->setObjectName(QStringLiteral("titleoutputlab"));
