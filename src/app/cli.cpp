@@ -1,5 +1,6 @@
 #include "app/cli.h"
 
+#include "flags/flagalloc.h"
 #include "flags/flagtable.h"
 #include "platform/settingsstore.h"
 
@@ -119,6 +120,14 @@ QString readapplyargs(const QStringList& args, const QString& name, const QStrin
         if (const QString refused = take(value); !refused.isEmpty())
             return refused;
     }
+    return QString();
+}
+
+QString censuscountry(const QString& text)
+{
+    for (const QString& c : flagcountries())
+        if (text.trimmed().compare(c, Qt::CaseInsensitive) == 0)
+            return c;
     return QString();
 }
 

@@ -72,6 +72,10 @@ QString unknownoption(const QStringList& args);
 QString readapplyargs(const QStringList& args, const QString& name, const QString& missing,
                       const std::function<QString(const QString& value)>& take, bool* apply, QStringList* files);
 
+// One of the census countries (flagcountries()) named by text, in any letter
+// case and with spaces around it, in its own spelling; "" when none is.
+QString censuscountry(const QString& text);
+
 // "" when path names a file, else "PATH: no such file" or "PATH is a folder ...".
 QString checkfamilypath(const QString& path);
 

@@ -38,10 +38,7 @@ int clidatecheck(QStringList args)
     QString country;
     QStringList files;
     const auto takecountry = [&country](const QString& given) {
-        country.clear();
-        for (const QString& c : datecheckcountries())
-            if (given.trimmed().compare(c, Qt::CaseInsensitive) == 0)
-                country = c;
+        country = censuscountry(given);
         return country.isEmpty() ? QStringLiteral("--country %1: give one of UK, USA, Ireland, Canada").arg(given)
                                  : QString();
     };

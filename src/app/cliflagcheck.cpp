@@ -17,15 +17,6 @@ namespace qm {
 
 namespace {
 
-// "UK", "USA", "Ireland" or "Canada" in any letter case, in its own spelling; "" otherwise.
-QString censuscountry(const QString& text)
-{
-    for (const char* c : {"UK", "USA", "Ireland", "Canada"})
-        if (text.compare(QLatin1String(c), Qt::CaseInsensitive) == 0)
-            return QLatin1String(c);
-    return QString();
-}
-
 QString usage()
 {
     return QStringLiteral("flag-check needs one family file: quillmark-cli flag-check FILE [--apply] "
@@ -45,7 +36,7 @@ int cliflagcheck(QStringList args)
     const auto takeanswer = [&countryfor](const QString& answer) {
         // The country follows the last "=": place names may hold one, countries never do.
         const qsizetype eq = answer.lastIndexOf(QLatin1Char('='));
-        const QString country = eq < 0 ? QString() : censuscountry(answer.mid(eq + 1).trimmed());
+        const QString country = eq < 0 ? QString() : censuscountry(answer.mid(eq + 1));
         if (country.isEmpty())
             return QStringLiteral("--country-for %1: give PLACE=COUNTRY with COUNTRY one of UK, USA, "
                                   "Ireland, Canada")
