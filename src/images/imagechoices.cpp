@@ -46,19 +46,10 @@ QString cleanfilename(QString text)
 
 QString imagefiletype(const QString& path)
 {
-    const QString last = path.right(4).toLower();
-    if (last == QLatin1String(".bmp"))
-        return QStringLiteral("bmp");
-    if (last == QLatin1String(".gif"))
-        return QStringLiteral("gif");
-    if (last == QLatin1String(".jpg"))
+    const QString ext = extensionof(path).toLower();
+    if (ext == QLatin1String(".jpg"))
         return QStringLiteral("jpeg");
-    if (last == QLatin1String(".pcx"))
-        return QStringLiteral("pcx");
-    if (last == QLatin1String(".tif"))
-        return QStringLiteral("tif");
-    const QString ext = extensionof(path);
-    return ext.isEmpty() ? QString() : ext.mid(1).toLower().trimmed();
+    return ext.mid(1).trimmed();
 }
 
 QString titlefromfilename(const QString& path)
@@ -115,10 +106,8 @@ QString refuseexistingimage(int32_t objectid, const std::vector<imagechoice>& ch
 
 int32_t firstobjectbase(const gedcomindex& index)
 {
-    int32_t highest = index.maxobjectid;
-    for (const objectrec& o : index.objects)
-        highest = std::max(highest, o.id);
-    return highest;
+    // The loader and recordattached() keep it at the highest O number.
+    return index.maxobjectid;
 }
 
 const imagechoice& addnewimage(std::vector<imagechoice>& chosen, int32_t& nextobjectid, const QString& file,
