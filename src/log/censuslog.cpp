@@ -119,15 +119,10 @@ QStringList loglines(const settings& s, const logentry& e)
     return out;
 }
 
-QStringList renamelines(const QString& from, const QString& to)
-{
-    return {logseparator(), QStringLiteral("Image renamed on: ") + timestamp(),
-            QStringLiteral("From: ") + native(from), QStringLiteral("To: ") + native(to)};
-}
-
 QString writerenameentry(const settings& s, const QString& from, const QString& to)
 {
-    return appendlines(s, renamelines(from, to));
+    return appendlines(s, {logseparator(), QStringLiteral("Image renamed on: ") + timestamp(),
+                           QStringLiteral("From: ") + native(from), QStringLiteral("To: ") + native(to)});
 }
 
 QString writelogentry(const settings& s, const logentry& e)

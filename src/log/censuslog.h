@@ -48,9 +48,8 @@ QString checklogfile(const QString& logpath);
 // The separator line that starts every entry.
 QString logseparator();
 
-// The entry noting that an image file was renamed to match its title, and its
-// lines; appended like writelogentry.
-QStringList renamelines(const QString& from, const QString& to);
+// Appends the entry noting that an image file was renamed to match its title;
+// returns like writelogentry.
 QString writerenameentry(const settings& s, const QString& from, const QString& to);
 
 } // namespace qm
