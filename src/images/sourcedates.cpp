@@ -13,11 +13,6 @@ namespace qm {
 
 namespace {
 
-bool startswith(std::string_view s, std::string_view prefix)
-{
-    return s.size() >= prefix.size() && s.compare(0, prefix.size(), prefix) == 0;
-}
-
 // Indented lines are recognised as if they began at their level number.
 std::string_view unindent(std::string_view line)
 {
@@ -109,19 +104,19 @@ void findcensusdates(gedcomindex& index, linereader& reader)
             counting = false;
             continue;
         }
-        if (startswith(t, "1 ")) {
+        if (t.starts_with("1 ")) {
             date.clear();
-            counting = !startswith(t, "1 CHAN");
-            birth = startswith(t, "1 BIRT");
+            counting = !t.starts_with("1 CHAN");
+            birth = t.starts_with("1 BIRT");
             continue;
         }
         if (!counting)
             continue;
-        if (startswith(t, "2 DATE ")) {
+        if (t.starts_with("2 DATE ")) {
             setdate(date, t.substr(6), reader.encoding());
             continue;
         }
-        if (date.empty() || !startswith(t, "2 SOUR @S"))
+        if (date.empty() || !t.starts_with("2 SOUR @S"))
             continue;
         const auto it = byid.find(citedsource(t));
         if (it == byid.end())
