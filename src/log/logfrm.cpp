@@ -1,5 +1,6 @@
 #include "log/logfrm.h"
 
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QFontDatabase>
@@ -31,21 +32,13 @@ logfrm::logfrm(const QString& logpath, prompts& asker, QWidget* parent)
 
     auto* buttonspic = new QWidget(this);
     buttonspic->setObjectName(QStringLiteral("buttonspic"));
-    startbut_ = new QPushButton(QStringLiteral("&Start"), buttonspic);
-    startbut_->setObjectName(QStringLiteral("startbut"));
-    startbut_->setAccessibleName(QStringLiteral("Back to the first page"));
-    startbut_->setAutoDefault(false);
-    nextpagebut_ = new QPushButton(QStringLiteral("&Next Page"), buttonspic);
-    nextpagebut_->setObjectName(QStringLiteral("nextpagebut"));
-    nextpagebut_->setAccessibleName(QStringLiteral("Next page"));
+    startbut_ = plainbutton(buttonspic, "startbut", QStringLiteral("&Start"), QStringLiteral("Back to the first page"));
+    nextpagebut_ = named(new QPushButton(QStringLiteral("&Next Page"), buttonspic), "nextpagebut",
+                         QStringLiteral("Next page"));
     nextpagebut_->setDefault(true);
     auto* pagecaption = new QLabel(QStringLiteral("Page"), buttonspic);
-    pagelab_ = new QLabel(buttonspic);
-    pagelab_->setObjectName(QStringLiteral("pagelab"));
-    pagelab_->setAccessibleName(QStringLiteral("Page number"));
-    auto* closebut = new QPushButton(QStringLiteral("Close"), buttonspic);
-    closebut->setObjectName(QStringLiteral("closebut"));
-    closebut->setAutoDefault(false);
+    pagelab_ = named(new QLabel(buttonspic), "pagelab", QStringLiteral("Page number"));
+    auto* closebut = plainbutton(buttonspic, "closebut", QStringLiteral("Close"), QStringLiteral("Close"));
 
     auto* strip = new QHBoxLayout(buttonspic);
     strip->setContentsMargins(0, 0, 0, 0);
