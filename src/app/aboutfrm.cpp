@@ -1,5 +1,6 @@
 #include "app/aboutfrm.h"
 
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QDialogButtonBox>
@@ -15,12 +16,8 @@ namespace {
 
 QLabel* textlabel(const char* name, const QString& accessible, const QString& text, QWidget* parent)
 {
-    auto* l = new QLabel(text, parent);
-    l->setObjectName(QString::fromLatin1(name));
-    l->setAccessibleName(accessible);
+    QLabel* l = valuelabel(parent, QString::fromLatin1(name), accessible, text);
     l->setWordWrap(true);
-    l->setTextFormat(Qt::PlainText);
-    l->setTextInteractionFlags(Qt::TextSelectableByMouse);
     return l;
 }
 
