@@ -1,6 +1,7 @@
 #include "tools/datecheck.h"
 
 #include "census/censustable.h"
+#include "flags/flagalloc.h"
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
 #include "settings/settings.h"
@@ -138,22 +139,15 @@ void sortdetails(std::vector<detailentry>& list)
 
 } // namespace
 
-const QStringList& datecheckcountries()
-{
-    static const QStringList countries = {QStringLiteral("UK"), QStringLiteral("USA"), QStringLiteral("Ireland"),
-                                          QStringLiteral("Canada")};
-    return countries;
-}
-
 int countryoption(const QString& country)
 {
-    const qsizetype i = datecheckcountries().indexOf(country);
+    const qsizetype i = flagcountries().indexOf(country);
     return i < 0 ? 0 : static_cast<int>(i);
 }
 
 countryrows rowsofcountry(const QString& country)
 {
-    const QString name = datecheckcountries()[countryoption(country)];
+    const QString name = flagcountries()[countryoption(country)];
     countryrows r{0, -1};
     for (int row = 1; row <= rowcount(); ++row) {
         if (rowdef(row).country != name)
@@ -335,7 +329,7 @@ datecheckstate::datecheckstate(const gedcomindex& index, dateorder order) : inde
 
 void datecheckstate::choosecountry(const QString& country)
 {
-    country_ = datecheckcountries()[countryoption(country)];
+    country_ = flagcountries()[countryoption(country)];
     changes_ = analysecensusdates(index_, country_);
     proposecensusdates(changes_, country_, order_);
 }

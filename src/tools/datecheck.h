@@ -31,8 +31,6 @@ struct settings;
 constexpr int noproposal = -1;
 constexpr int refusedchange = -2;
 
-// The countries in the order of the dialog's option buttons.
-const QStringList& datecheckcountries();
 // Option of the "Country" setting: "USA" 1, "Ireland" 2, "Canada" 3, anything else 0 ("UK").
 int countryoption(const QString& country);
 

@@ -1,5 +1,6 @@
 #include "tools/datecheckfrm.h"
 
+#include "flags/flagalloc.h"
 #include "model/gedcomindex.h"
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
@@ -72,7 +73,7 @@ void Datecheckfrm::build()
                                                  QStringLiteral("Ca&nada")};
     for (int i = 0; i < 4; ++i) {
         auto* o = named(new QRadioButton(countrytexts[static_cast<size_t>(i)], countries),
-                        QStringLiteral("countryopt%1").arg(i), datecheckcountries()[i]);
+                        QStringLiteral("countryopt%1").arg(i), flagcountries()[i]);
         countrygroup->addButton(o, i);
         countryrow->addWidget(o);
         countryopt_[static_cast<size_t>(i)] = o;
@@ -214,7 +215,7 @@ void Datecheckfrm::build()
 
 void Datecheckfrm::countrychosen(int option)
 {
-    const QString country = datecheckcountries()[option];
+    const QString country = flagcountries()[option];
     currentcountrylab_->setText(currentcountrycaption(country));
     currentlst_->setAccessibleName(currentcountrylab_->text());
     countrylab_->setText(othercountrycaption(country));
