@@ -1,5 +1,7 @@
 #include "app/helpfrm.h"
 
+#include "platform/formparts_ui.h"
+
 #include <QApplication>
 #include <QTextCursor>
 #include <QEvent>
@@ -37,11 +39,8 @@ QUrl pageurl(const QString& page)
 QPushButton* toolbutton(const QString& text, const char* name, const QString& accessible, const QString& tip,
                         QWidget* parent)
 {
-    auto* b = new QPushButton(text, parent);
-    b->setObjectName(QString::fromLatin1(name));
-    b->setAccessibleName(accessible);
+    QPushButton* b = plainbutton(parent, name, text, accessible);
     b->setToolTip(tip);
-    b->setAutoDefault(false);
     return b;
 }
 
