@@ -267,11 +267,7 @@ void Attachimagesfrm::attach()
         prompts_.tell(alreadylinkedmessage(dropped), icon::information);
     if (chosen.empty())
         return;
-    // The user may have spent some time choosing: look again.
-    if (qm::filechanged(index_)) {
-        closeonchange();
-        return;
-    }
+    // A change made while the user was choosing is caught by savechange().
 
     rewriterequest rq;
     rq.mode = rewritemode::attachimages;
