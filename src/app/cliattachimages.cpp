@@ -99,23 +99,20 @@ int cliattachimages(QStringList args)
     error = unknownoption(args);
     if (!error.isEmpty())
         return clifail(error);
+    const QString usage = QStringLiteral("attach-images needs a family file, a source and at least one image: "
+                                         "quillmark-cli attach-images FILE --source S_NUMBER --image PATH[=TITLE]... "
+                                         "--object O_NUMBER...");
     if (args.size() != 1 || sourcetext.isEmpty() || asked.empty())
-        return clifail(QStringLiteral("attach-images needs a family file, a source and at least one image: quillmark-cli "
-                                      "attach-images FILE --source S_NUMBER --image PATH[=TITLE]... --object O_NUMBER..."));
+        return clifail(usage);
     const int32_t sourceid = recordnumber(sourcetext, u'S');
     if (sourceid == 0)
         return clifail(QStringLiteral("--source needs a source record number such as 12 or S12, not %1").arg(sourcetext));
     const QString path = args.front();
-    if (!QFileInfo(path).isFile())
-        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
-
-    const auto cs = opensettings(inipath, &error);
-    if (!cs)
-        return clifail(error);
-    const settings& s = cs->values;
-    loadresult loaded = loadfamily(path, *cs);
-    if (!loaded.index)
-        return clifail(loaded.error);
+    const auto f = openfamily(args, usage, inipath);
+    if (!f)
+        return clifailure;
+    const settings& s = f->settings->values;
+    loadresult& loaded = f->loaded;
     gedcomindex& ix = *loaded.index;
 
     int32_t sourcepos = -1;
