@@ -1,6 +1,7 @@
 #include "app/donatefrm.h"
 
 #include "app/milestone.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QDialogButtonBox>
@@ -46,15 +47,11 @@ donatefrm::donatefrm(prompts& opener, std::optional<int64_t> milestone, QWidget*
     asklab->setObjectName(QStringLiteral("asklab"));
     asklab->setWordWrap(true);
 
-    auto* once = new QPushButton(QStringLiteral("Make a &Donation..."), this);
-    once->setObjectName(QStringLiteral("donatebut"));
-    once->setAccessibleName(QStringLiteral("Make a donation"));
-    auto* regular = new QPushButton(QStringLiteral("Make a &Regular Donation..."), this);
-    regular->setObjectName(QStringLiteral("regularbut"));
-    regular->setAccessibleName(QStringLiteral("Make a regular donation"));
-    auto* close = new QPushButton(QStringLiteral("Close"), this);
-    close->setObjectName(QStringLiteral("closebut"));
-    close->setAccessibleName(QStringLiteral("Close"));
+    auto* once = named(new QPushButton(QStringLiteral("Make a &Donation..."), this), "donatebut",
+                       QStringLiteral("Make a donation"));
+    auto* regular = named(new QPushButton(QStringLiteral("Make a &Regular Donation..."), this), "regularbut",
+                          QStringLiteral("Make a regular donation"));
+    auto* close = named(new QPushButton(QStringLiteral("Close"), this), "closebut", QStringLiteral("Close"));
     close->setDefault(true);
 
     // A failure to open the page is not reported: the browser shows its own.
