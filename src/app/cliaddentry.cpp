@@ -290,8 +290,9 @@ int cliaddentry(QStringList args)
         return clifail(QStringLiteral("add-entry needs a family file and an entry: "
                                       "quillmark-cli add-entry FILE --entry ENTRY.json [--settings S.ini]"));
     const QString path = args.front();
-    if (!QFileInfo(path).isFile())
-        return clifail(QStringLiteral("%1: no such file").arg(QDir::toNativeSeparators(path)));
+    error = checkfamilypath(path);
+    if (!error.isEmpty())
+        return clifail(error);
 
     QFile ef(entrypath);
     if (!ef.open(QIODevice::ReadOnly))
