@@ -9,16 +9,12 @@ namespace qm {
 
 namespace {
 
-QString addrow(const flagrec& f, const personrec& p)
+// "'NAME' flag to individual ..." (add) or "'NAME' flag from individual ...".
+QString flagrow(const flagrec& f, const personrec& p, bool add)
 {
-    return QStringLiteral("'") + qs(f.name) + QStringLiteral("' flag to individual ") + qs(p.name) +
-           QStringLiteral(" (ID: ") + QString::number(p.id) + QStringLiteral(")");
-}
-
-QString removerow(const flagrec& f, const personrec& p)
-{
-    return QStringLiteral("'") + qs(f.name) + QStringLiteral("' flag from individual ") + qs(p.name) +
-           QStringLiteral(" (ID: ") + QString::number(p.id) + QStringLiteral(")");
+    const QString linkword = add ? QStringLiteral("' flag to individual ") : QStringLiteral("' flag from individual ");
+    return QStringLiteral("'") + qs(f.name) + linkword + qs(p.name) + QStringLiteral(" (ID: ") + QString::number(p.id) +
+           QStringLiteral(")");
 }
 
 bool holds(const personrec& p, size_t flag)
@@ -101,7 +97,7 @@ private:
             if (listed)
                 continue;
             r_.changes.push_back(flagchange{k, static_cast<int32_t>(flag), true});
-            r_.addrows.push_back(addrow(x_.flags[flag], p));
+            r_.addrows.push_back(flagrow(x_.flags[flag], p, true));
         }
         return true;
     }
@@ -124,7 +120,7 @@ private:
             if (!interactive_)
                 return;
             r_.changes.push_back(flagchange{k, f, false});
-            r_.removerows.push_back(removerow(flag, p));
+            r_.removerows.push_back(flagrow(flag, p, false));
         }
     }
 
