@@ -3,6 +3,7 @@
 #include "flags/flagcheckcountryfrm.h"
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
 #include "writer/saveprompts.h"
@@ -20,9 +21,7 @@ namespace {
 
 QListWidget* rowlist(const QString& name, const QString& accessible, QWidget* parent)
 {
-    auto* l = new QListWidget(parent);
-    l->setObjectName(name);
-    l->setAccessibleName(accessible);
+    auto* l = named(new QListWidget(parent), name, accessible);
     l->setSelectionMode(QAbstractItemView::SingleSelection);
     l->setMinimumSize(520, 140);
     return l;
@@ -45,24 +44,17 @@ flagcheckfrm::flagcheckfrm(gedcomindex& index, settings& s, settingsstore& store
                          this);
     removecaption->setBuddy(removelst_);
 
-    flagschk_ = new QCheckBox(QStringLiteral("Al&ways run a flag check to check that flags are up to date each time "
-                                             "Quillmark loads family history files."),
-                              this);
-    flagschk_->setObjectName(QStringLiteral("flagschk"));
-    flagschk_->setAccessibleName(QStringLiteral("Always run a flag check each time Quillmark loads family history files"));
+    flagschk_ = named(new QCheckBox(QStringLiteral("Al&ways run a flag check to check that flags are up to date each "
+                                                   "time Quillmark loads family history files."),
+                                    this),
+                      "flagschk", QStringLiteral("Always run a flag check each time Quillmark loads family history files"));
 
-    Changebut_ = new QPushButton(QStringLiteral("&Make required changes"), this);
-    Changebut_->setObjectName(QStringLiteral("Changebut"));
-    Changebut_->setAccessibleName(QStringLiteral("Make required changes"));
-    closebut_ = new QPushButton(QStringLiteral("&Don't make changes"), this);
-    closebut_->setObjectName(QStringLiteral("closebut"));
-    closebut_->setAccessibleName(QStringLiteral("Don't make changes"));
+    Changebut_ = plainbutton(this, "Changebut", QStringLiteral("&Make required changes"),
+                             QStringLiteral("Make required changes"));
+    closebut_ = named(new QPushButton(QStringLiteral("&Don't make changes"), this), "closebut",
+                      QStringLiteral("Don't make changes"));
     closebut_->setDefault(true);
-    helpbut_ = new QPushButton(QStringLiteral("&Help"), this);
-    helpbut_->setObjectName(QStringLiteral("helpbut"));
-    helpbut_->setAccessibleName(QStringLiteral("Help"));
-    helpbut_->setAutoDefault(false);
-    Changebut_->setAutoDefault(false);
+    helpbut_ = plainbutton(this, "helpbut", QStringLiteral("&Help"), QStringLiteral("Help"));
 
     auto* buttons = new QHBoxLayout;
     buttons->addWidget(Changebut_);
