@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <cstdio>
 #include <cstring>
+#include <deque>
 #include <memory>
 #include <unordered_map>
 
@@ -79,6 +80,81 @@ int64_t numbervalue(const QString& s)
     return refnumber(u8(s.trimmed()), 0);
 }
 
+bool flagheader(std::string_view t)
+{
+    return startswith(t, "1 _FLGS");
+}
+
+// A line that ends a flag block: the next line of level 1 or 0.
+bool endsflags(std::string_view t)
+{
+    return startswith(t, "1") || startswith(t, "0");
+}
+
+// The flag code of a line under "1 _FLGS" ("2 " + code + " " + name), as UTF-8
+// to compare with the flag table; "" for any other line.
+std::string flagcodeof(std::string_view t, textencoding enc)
+{
+    if (!startswith(t, "2 "))
+        return {};
+    std::string_view code = t.substr(2);
+    return toutf8(code.substr(0, code.find(' ')), enc);
+}
+
+// The lines of a record from its first "1 _FLGS" or "1 CHAN" line, the line
+// that ends the record last (when one came). All its flag lines are brought
+// under one "1 _FLGS" header, which stands where the first header stood or,
+// when that came after the change stamp, just before "1 CHAN": hand-edited
+// files and other programs put the block anywhere, and the header written by
+// an earlier fault may stand twice.
+void gatherflags(std::vector<std::string>& record)
+{
+    const size_t body = !record.empty() && !lefttrim(record.back()).empty() && lefttrim(record.back())[0] == '0'
+        ? record.size() - 1
+        : record.size();
+    std::vector<std::string> kept, flags;
+    std::string header;
+    size_t at = std::string::npos; // where the block goes among the kept lines
+    bool inflags = false;
+    for (size_t i = 0; i < body; ++i) {
+        const std::string_view t = lefttrim(record[i]);
+        if (inflags && !endsflags(t)) {
+            flags.push_back(std::move(record[i]));
+            continue;
+        }
+        inflags = flagheader(t);
+        if (inflags) {
+            if (header.empty())
+                header = std::move(record[i]);
+            at = std::min(at, kept.size());
+            continue;
+        }
+        if (startswithnocase(t, "1 CHAN"))
+            at = std::min(at, kept.size());
+        kept.push_back(std::move(record[i]));
+    }
+    if (header.empty()) {
+        // No block: the lines go back as they were.
+        for (size_t i = 0; i < kept.size(); ++i)
+            record[i] = std::move(kept[i]);
+        return;
+    }
+    std::vector<std::string> out;
+    out.reserve(record.size());
+    for (size_t i = 0; i <= kept.size(); ++i) {
+        if (i == at) {
+            out.push_back(std::move(header));
+            for (std::string& f : flags)
+                out.push_back(std::move(f));
+        }
+        if (i < kept.size())
+            out.push_back(std::move(kept[i]));
+    }
+    if (body < record.size())
+        out.push_back(std::move(record.back()));
+    record = std::move(out);
+}
+
 enum class citekind { birth, census, occupation };
 
 // One run of the rewrite.
@@ -95,6 +171,12 @@ public:
 
 private:
     bool fetch();
+    // Reads the rest of the record from the current line ahead, its flag
+    // lines gathered under one header; the loop then takes its lines from there.
+    void readtailahead();
+    bool holdsentryflag(const selectionrec& who) const;
+    // Mode 4: whether the changes of the current individual alter these lines of its record.
+    bool flagsalter(const std::vector<size_t>& changes, const std::vector<std::string>& lines) const;
     void iteration();
     void writecensusblock(const selectionrec& who);
     void writecitation(citekind kind);
@@ -107,8 +189,8 @@ private:
     // written as read. (Census dates look at lines inside records.)
     bool quiet() const
     {
-        return entryperson_ < 0 && !sourcefound_ && !recordchanged_ && !flagperson_
-            && mode_ != rewritemode::censusdates;
+        return entryperson_ < 0 && !sourcefound_ && !recordchanged_ && !flagperson_ && !flagtail_
+            && mode_ != rewritemode::censusdates && ahead_.empty();
     }
     static bool startsrecord(std::string_view line)
     {
@@ -132,6 +214,9 @@ private:
     bool atend_ = false;     // the stand-in end line has been handed out
     bool endline_ = false;   // the current line is that stand-in: never written
     bool exhausted_ = false; // nothing more to read
+    std::deque<std::string> ahead_; // lines read ahead, handed out before the reader's
+    std::string current_;           // the current line when it is no longer in the reader
+    bool flagtail_ = false;         // the flags of the current record change: its tail is still to be read ahead
 
     // Mode 1.
     std::string sid_, place_, address_, reference_, entrydate_, sourcetext_, notetext_;
@@ -166,6 +251,12 @@ private:
 bool rewriterun::fetch()
 {
     endline_ = false;
+    if (!ahead_.empty()) {
+        current_ = std::move(ahead_.front());
+        ahead_.pop_front();
+        line_ = current_;
+        return true;
+    }
     if (exhausted_)
         return false;
     if (in_.next(line_))
@@ -181,6 +272,58 @@ bool rewriterun::fetch()
     }
     exhausted_ = true;
     line_ = {};
+    return false;
+}
+
+void rewriterun::readtailahead()
+{
+    std::vector<std::string> tail{std::string(line_)};
+    tail.insert(tail.end(), std::make_move_iterator(ahead_.begin()), std::make_move_iterator(ahead_.end()));
+    ahead_.clear();
+    if (!startsrecord(tail.back())) {
+        std::string_view l;
+        while (!exhausted_ && !atend_ && in_.next(l)) {
+            tail.emplace_back(l);
+            if (startsrecord(l))
+                break;
+        }
+    }
+    // Only removals of flags the record does not hold: it is left as it is.
+    if (mode_ == rewritemode::flagchanges && !flagsalter(*flagperson_, tail))
+        flagperson_ = nullptr;
+    else
+        gatherflags(tail);
+    ahead_.assign(std::make_move_iterator(tail.begin()), std::make_move_iterator(tail.end()));
+    fetch();
+}
+
+bool rewriterun::holdsentryflag(const selectionrec& who) const
+{
+    const personrec* p = personwithid(who.id, who.personindex);
+    const auto flag = static_cast<int32_t>(*res_.entryflag);
+    return p && std::find(p->flagids.begin(), p->flagids.end(), flag) != p->flagids.end();
+}
+
+bool rewriterun::flagsalter(const std::vector<size_t>& changes, const std::vector<std::string>& lines) const
+{
+    std::vector<std::string_view> removing;
+    for (size_t k : changes) {
+        const flagchange& c = rq_.flagchanges[k];
+        if (c.add)
+            return true;
+        removing.push_back(ix_.flags[static_cast<size_t>(c.flag)].code);
+    }
+    bool inflags = false;
+    for (const std::string& line : lines) {
+        const std::string_view t = lefttrim(line);
+        if (inflags && !endsflags(t)) {
+            const std::string code = flagcodeof(t, ix_.encoding);
+            if (std::find(removing.begin(), removing.end(), code) != removing.end())
+                return true;
+            continue;
+        }
+        inflags = flagheader(t);
+    }
     return false;
 }
 
@@ -278,6 +421,14 @@ void rewriterun::iteration()
     std::string_view t = lefttrim(line_);
     const bool census = mode_ == rewritemode::censusentry;
 
+    // The individual's flags change: its flag block is found wherever it
+    // stands and brought to where it belongs before anything is written there.
+    if (flagtail_ && (flagheader(t) || startswithnocase(t, "1 CHAN"))) {
+        flagtail_ = false;
+        readtailahead();
+        t = lefttrim(line_);
+    }
+
     // A: the census block closes the events of an individual of the entry.
     if (census && entryperson_ >= 0
         && (startswith(t, "0") || startswith(t, "1 FAMS") || startswith(t, "1 FAMC") || startswith(t, "1 CHAN")
@@ -301,11 +452,7 @@ void rewriterun::iteration()
         bool again = false;
         if (census && flagpending_) {
             flagpending_ = false;
-            const selectionrec& who = e_.selection[static_cast<size_t>(flagwho_)];
-            const personrec* p = personwithid(who.id, who.personindex);
-            const auto flag = static_cast<int32_t>(*res_.entryflag);
-            const bool holds = p && std::find(p->flagids.begin(), p->flagids.end(), flag) != p->flagids.end();
-            if (!holds) {
+            if (!holdsentryflag(e_.selection[static_cast<size_t>(flagwho_)])) {
                 const flagrec& f = ix_.flags[*res_.entryflag];
                 out_.writetext("1 _FLGS");
                 out_.writefiletext("2 " + f.code + " " + f.name);
@@ -424,12 +571,15 @@ void rewriterun::iteration()
     if (startswith(t, "0")) {
         const bool indi = startswith(t, "0 @I");
         const int64_t id = indi ? refnumber(t, 4) : -1;
+        flagtail_ = false;
         if (census && indi) {
             for (size_t k = 0; k < e_.selection.size(); ++k) {
                 if (e_.selection[k].id == id) {
                     entryperson_ = flagwho_ = static_cast<int>(k);
                     seen_[k] = true;
                     flagpending_ = res_.entryflag.has_value();
+                    // The flag goes into the individual's own block, wherever that stands.
+                    flagtail_ = flagpending_ && !holdsentryflag(e_.selection[k]);
                     break;
                 }
             }
@@ -440,6 +590,7 @@ void rewriterun::iteration()
         } else if (mode_ == rewritemode::flagchanges) {
             const auto it = indi ? changesbyid_.find(static_cast<int32_t>(id)) : changesbyid_.end();
             flagperson_ = it == changesbyid_.end() ? nullptr : &it->second;
+            flagtail_ = flagperson_ != nullptr;
         }
     }
 
@@ -591,6 +742,7 @@ void rewriterun::occupationdate(std::string_view t)
 // header, then the kept ones; a header only when a flag line remains.
 void rewriterun::flagblock(std::string_view t)
 {
+    const int32_t madebefore = res_.flagchangesmade;
     std::vector<std::string_view> removing;
     bool header = false;
     for (size_t k : *flagperson_) {
@@ -604,23 +756,21 @@ void rewriterun::flagblock(std::string_view t)
             out_.writetext("1 _FLGS");
         header = true;
         out_.writefiletext("2 " + f.code + " " + f.name);
+        ++res_.flagchangesmade;
     }
-    if (startswith(t, "1 _FLGS")) {
+    if (flagheader(t)) {
         for (;;) {
             if (!fetch())
                 break;
             const std::string_view u = lefttrim(line_);
-            if (startswith(u, "1") || startswith(u, "0"))
+            if (endsflags(u))
                 break;
             // A flag line is "2 " + code + " " + name: its code is compared whole.
-            bool drop = false;
-            if (startswith(u, "2 ")) {
-                std::string_view code = u.substr(2);
-                code = code.substr(0, code.find(' '));
-                drop = std::find(removing.begin(), removing.end(), code) != removing.end();
-            }
-            if (drop)
+            const std::string code = flagcodeof(u, ix_.encoding);
+            if (!code.empty() && std::find(removing.begin(), removing.end(), code) != removing.end()) {
+                ++res_.flagchangesmade;
                 continue;
+            }
             if (!header)
                 out_.writetext("1 _FLGS");
             header = true;
@@ -629,7 +779,7 @@ void rewriterun::flagblock(std::string_view t)
     }
     reuse_ = !exhausted_;
     flagperson_ = nullptr;
-    recordchanged_ = true;
+    recordchanged_ = recordchanged_ || res_.flagchangesmade > madebefore;
 }
 
 rewriteresult refuse(const QString& message)

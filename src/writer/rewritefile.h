@@ -22,6 +22,11 @@
 // ends the file, and any new record still due, are written there. An
 // individual of the entry whose record is not in the file, or a source to
 // extend that is not there, refuses the run with the file untouched.
+//
+// Flags: an individual whose flags change keeps them under one "1 _FLGS"
+// header, where its block stood, or just before "1 CHAN" when the block came
+// after it (several blocks are joined into the first). The result counts the
+// flag lines actually written and taken away, which the census log reports.
 
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
@@ -68,6 +73,7 @@ struct rewriteresult {
 
     std::optional<size_t> entryflag; // mode 1: the flag given (position in the index's flag table)
     int32_t flaggiven = 0;           // mode 1: individuals given the entry flag (its count rises by this)
+    int32_t flagchangesmade = 0;     // mode 4: flag lines written and taken away
     int32_t occdateschanged = 0;     // mode 3: OCCU dates replaced
     int32_t censusdateschanged = 0;  // mode 3: CENS dates replaced
     int32_t maxnoteid = 0;           // the index's value, raised to the new note's number

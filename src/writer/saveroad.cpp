@@ -46,7 +46,7 @@ logentry logfor(const gedcomindex& index, const rewriterequest& rq, const rewrit
         e.occdateschanged = r.occdateschanged;
         break;
     case rewritemode::flagchanges:
-        e.flagchangecount = static_cast<int>(rq.flagchanges.size());
+        e.flagchangecount = r.flagchangesmade;
         break;
     }
     return e;

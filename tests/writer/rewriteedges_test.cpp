@@ -232,6 +232,51 @@ TEST_F(RewriteEdges, FlagRemovalComparesWholeCodesAndKeepsOtherLines)
                                                "0 TRLR"}));
 }
 
+TEST_F(RewriteEdges, FlagsAreChangedInTheirOwnBlockWhereverItStands)
+{
+    flagtable defs{{"__C1881", "Census 1881", "1881", 0, "UK"}, {"__C1891", "Census 1891", "1891", 0, "UK"}};
+    const std::string chan = "1 CHAN\r\n2 DATE 1 JAN 2000\r\n";
+    // I1's block after its change stamp; I2's in two blocks (as an earlier
+    // fault wrote them); I3 does not hold the flag asked to go.
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME A\r\n" + chan
+                            + "1 _FLGS\r\n2 __C1881 Census 1881\r\n2 LIVING Kept\r\n"
+                              "0 @I2@ INDI\r\n1 _FLGS\r\n2 __C1891 Census 1891\r\n" + chan
+                            + "1 _FLGS\r\n2 __C1881 Census 1881\r\n0 @I3@ INDI\r\n" + chan + "0 TRLR\r\n";
+    const std::vector<std::string> stamp{"1 CHAN", "2 DATE 04 MAY 2026", "3 TIME 07:08:09"};
+    const auto join = [](std::initializer_list<std::vector<std::string>> parts) {
+        std::vector<std::string> out;
+        for (const auto& p : parts)
+            out.insert(out.end(), p.begin(), p.end());
+        return out;
+    };
+    rewriterequest r;
+    r.mode = rewritemode::flagchanges;
+    r.flagchanges = {{0, 0, false}, {0, 1, true}, {1, 0, false}, {2, 1, false}};
+    run x = rewrite(input, settings{}, r, defs);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.result.flagchangesmade, 3);
+    EXPECT_EQ(x.out, join({{"0 HEAD", "0 @I1@ INDI", "1 NAME A", "1 _FLGS", "2 __C1891 Census 1891", "2 LIVING Kept"},
+                           stamp,
+                           {"0 @I2@ INDI", "1 _FLGS", "2 __C1891 Census 1891"},
+                           stamp,
+                           {"0 @I3@ INDI", "1 CHAN", "2 DATE 1 JAN 2000", "0 TRLR"}}));
+
+    // A census entry recording its flag puts it into the block after the stamp.
+    settings s;
+    s.flaguse = true;
+    r = rewriterequest();
+    r.entry = censusof(QStringLiteral("1"), "", "");
+    r.entry.selection = {chosen(1, 0)};
+    x = rewrite("0 HEAD\r\n0 @I1@ INDI\r\n" + chan + "1 _FLGS\r\n2 __C1891 Census 1891\r\n0 TRLR\r\n", s, r, defs);
+    ASSERT_TRUE(x.result.ok);
+    EXPECT_EQ(x.result.flaggiven, 1);
+    const auto header = std::find(x.out.begin(), x.out.end(), "1 _FLGS");
+    ASSERT_GE(std::distance(header, x.out.end()), 6);
+    EXPECT_LT(lineat(x.out, "1 CENS"), lineat(x.out, "1 _FLGS"));
+    EXPECT_EQ(std::vector<std::string>(header, header + 6),
+              join({{"1 _FLGS", "2 __C1881 Census 1881", "2 __C1891 Census 1891"}, stamp}));
+}
+
 TEST_F(RewriteEdges, OccupationDatesChangeOnlyWithAMatchingCensusCitation)
 {
     const std::string input = "0 HEAD\r\n"
