@@ -1,9 +1,8 @@
 #include "census/selection.h"
 
+#include "model/labelorder.h"
 #include "model/loadgedcom.h"
 #include "platform/encoding.h"
-
-#include <QCollator>
 
 #include <algorithm>
 
@@ -164,16 +163,6 @@ void householdrows::clear()
         clearrow(r);
 }
 
-bool labelless(const QString& a, const QString& b)
-{
-    static const QCollator collator = [] {
-        QCollator c;
-        c.setCaseSensitivity(Qt::CaseInsensitive);
-        return c;
-    }();
-    return collator.compare(a, b) < 0;
-}
-
 std::vector<listentry> immediatefamily(const gedcomindex& index, int32_t k, bool idonly)
 {
     std::vector<listentry> out;
@@ -217,9 +206,11 @@ std::vector<listentry> immediatefamily(const gedcomindex& index, int32_t k, bool
             }
         }
     }
-    std::stable_sort(out.begin(), out.end(),
-                     [](const listentry& a, const listentry& b) { return labelless(a.text, b.text); });
-    return out;
+    std::vector<listentry> sorted;
+    sorted.reserve(out.size());
+    for (size_t i : labelorder(out.size(), [&out](size_t i) { return out[i].text; }))
+        sorted.push_back(std::move(out[i]));
+    return sorted;
 }
 
 alivelist couldbealive(const gedcomindex& index, const QDate& censusday, dateorder order, int cap)
@@ -261,22 +252,12 @@ alivelist couldbealive(const gedcomindex& index, const QDate& censusday, dateord
 
 std::vector<int32_t> sortbylabel(const gedcomindex& index, std::vector<int32_t> positions, bool idonly)
 {
-    QCollator collator;
-    collator.setCaseSensitivity(Qt::CaseInsensitive);
-    std::vector<QCollatorSortKey> keys;
-    keys.reserve(positions.size());
-    for (int32_t k : positions)
-        keys.push_back(collator.sortKey(personlabel(index.people[static_cast<size_t>(k)], idonly)));
-    std::vector<int32_t> order(positions.size());
-    for (size_t i = 0; i < order.size(); ++i)
-        order[i] = static_cast<int32_t>(i);
-    std::stable_sort(order.begin(), order.end(), [&](int32_t a, int32_t b) {
-        return keys[static_cast<size_t>(a)].compare(keys[static_cast<size_t>(b)]) < 0;
-    });
     std::vector<int32_t> out;
-    out.reserve(order.size());
-    for (int32_t i : order)
-        out.push_back(positions[static_cast<size_t>(i)]);
+    out.reserve(positions.size());
+    for (size_t i : labelorder(positions.size(), [&](size_t i) {
+             return personlabel(index.people[static_cast<size_t>(positions[i])], idonly);
+         }))
+        out.push_back(positions[i]);
     return out;
 }
 

@@ -74,11 +74,8 @@ struct listentry {
     int32_t person = -1;
 };
 
-// Label order of the lists: ascending, ignoring letter case.
-bool labelless(const QString& a, const QString& b);
-
 // The immediate family of people[k]: "SIB ", "WED ", "CHI " and "PAR " +
-// personlabel, in label order.
+// personlabel, in label order (model/labelorder.h).
 std::vector<listentry> immediatefamily(const gedcomindex& index, int32_t k, bool idonly);
 
 // Individuals who could be alive at a census of the given day: positions in
@@ -89,8 +86,8 @@ struct alivelist {
 };
 alivelist couldbealive(const gedcomindex& index, const QDate& censusday, dateorder order, int cap = 32000);
 
-// The individuals at these positions in label order (personlabel, ignoring
-// letter case); equal labels keep their order.
+// The individuals at these positions in label order (personlabel; see
+// model/labelorder.h); equal labels keep their order.
 std::vector<int32_t> sortbylabel(const gedcomindex& index, std::vector<int32_t> positions, bool idonly);
 
 } // namespace qm

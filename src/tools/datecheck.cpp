@@ -3,10 +3,10 @@
 #include "census/censustable.h"
 #include "flags/flagalloc.h"
 #include "model/gedcomindex.h"
+#include "model/labelorder.h"
 #include "platform/encoding.h"
 #include "settings/settings.h"
 
-#include <QCollator>
 #include <QDir>
 
 #include <algorithm>
@@ -110,30 +110,13 @@ QString countrywords(const QString& country)
     }
 }
 
-// Alphabetical order as the user's language has it, ignoring letter case
-// ("Ó Súilleabháin" among the O's); the sort keys are made once, since a date
-// may have hundreds of thousands of events.
+// In the order of every list of people ("Ó Súilleabháin" among the O's).
 void sortdetails(std::vector<detailentry>& list)
 {
-    // The C locale compares code points, letter case included: English order instead.
-    const QLocale locale = QLocale().language() == QLocale::C ? QLocale(QLocale::English) : QLocale();
-    QCollator collator(locale);
-    collator.setCaseSensitivity(Qt::CaseInsensitive);
-    std::vector<std::pair<QCollatorSortKey, size_t>> keys;
-    keys.reserve(list.size());
-    for (size_t k = 0; k < list.size(); ++k)
-        keys.emplace_back(collator.sortKey(list[k].text), k);
-    std::sort(keys.begin(), keys.end(), [&list](const auto& a, const auto& b) {
-        if (const int c = a.first.compare(b.first))
-            return c < 0;
-        if (list[a.second].text != list[b.second].text)
-            return list[a.second].text < list[b.second].text;
-        return a.second < b.second;
-    });
     std::vector<detailentry> sorted;
     sorted.reserve(list.size());
-    for (const auto& key : keys)
-        sorted.push_back(std::move(list[key.second]));
+    for (size_t k : labelorder(list.size(), [&list](size_t k) { return list[k].text; }))
+        sorted.push_back(std::move(list[k]));
     list = std::move(sorted);
 }
 

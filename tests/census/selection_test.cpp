@@ -1,8 +1,14 @@
 #include "census/selection.h"
 
 #include "model/loadgedcom.h"
+#include "tools/datecheck.h"
+#include "tools/findindividual.h"
+
+#include <QRegularExpression>
 
 #include <gtest/gtest.h>
+
+#include <clocale>
 
 using namespace qm;
 
@@ -221,4 +227,53 @@ TEST(CouldBeAlive, YearsAroundTheCensus)
 
     // Listed in label order: names first, then the bracketed dates.
     EXPECT_EQ(sortbylabel(f.index, a.people, false), (std::vector<int32_t>{2, 4, 8, 6, 7, 0}));
+}
+
+TEST(PeopleLists, OneOrderWhateverTheLocale)
+{
+    // Five children of Zed Zimmer, each with a census event in 1881.
+    std::string file = "0 HEAD\r\n1 CHAR UTF-8\r\n0 @I1@ INDI\r\n1 NAME Zed /Zimmer/\r\n1 FAMS @F1@\r\n";
+    const char* names[] = {"Yves /Young/", "Piet /van Dyke/", "Anne /\xC3\x89\x62\x65rt/", "Ann /Smith-Jones/",
+                           "John /Smith/"};
+    for (int i = 0; i < 5; ++i)
+        file += "0 @I" + std::to_string(i + 2) + "@ INDI\r\n1 NAME " + names[i]
+            + "\r\n1 FAMC @F1@\r\n1 CENS\r\n2 DATE 1881\r\n2 PLAC Leeds\r\n2 AGE 30\r\n";
+    const auto ix = loadgedcombytes(file + "0 TRLR\r\n", flagtable{});
+    const std::string expected =
+        "\xC3\x89\x62\x65rt, Anne | Smith, John | Smith-Jones, Ann | van Dyke, Piet | Young, Yves";
+    // The names of a list in its order, the father left out.
+    const auto shown = [](const std::vector<QString>& texts) {
+        static const QRegularExpression extra(QStringLiteral("^CHI | \\(ID: \\d+\\)$| 30 Leeds$"));
+        QStringList out;
+        for (QString t : texts)
+            if (!t.startsWith(QLatin1String("Zimmer")))
+                out << t.remove(extra);
+        return out.join(QStringLiteral(" | ")).toStdString();
+    };
+    const auto labels = [&](const std::vector<int32_t>& positions) {
+        std::vector<QString> out;
+        for (int32_t k : positions)
+            out.push_back(personlabel(ix->people[static_cast<size_t>(k)], false));
+        return shown(out);
+    };
+    const auto texts = [&](const auto& entries) {
+        std::vector<QString> out;
+        for (const auto& e : entries)
+            out.push_back(e.text);
+        return shown(out);
+    };
+    const QLocale before;
+    for (const char* locale : {"C", "en_GB", "sv_SE"}) {
+        std::setlocale(LC_ALL, (std::string(locale) + ".UTF-8").c_str());
+        QLocale::setDefault(QLocale(QLatin1String(locale)));
+        EXPECT_EQ(labels(sortedpeople(*ix, false)), expected) << locale;
+        EXPECT_EQ(labels(sortbylabel(*ix, couldbealive(*ix, QDate(1881, 4, 3), dateorder::dmy).people, false)),
+                  expected)
+            << locale;
+        EXPECT_EQ(texts(immediatefamily(*ix, 0, false)), expected) << locale;
+        EXPECT_EQ(texts(findlist(*ix, false, {})), expected) << locale;
+        EXPECT_EQ(texts(datedetails(*ix, QStringLiteral("1881"), false)), expected) << locale;
+    }
+    std::setlocale(LC_ALL, "C");
+    QLocale::setDefault(before);
 }
