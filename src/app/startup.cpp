@@ -3,6 +3,9 @@
 #include "app/recentfiles.h"
 #include "platform/settingsstore.h"
 
+#include <QDir>
+#include <QFileInfo>
+
 #include <cmath>
 
 namespace qm {
@@ -16,6 +19,11 @@ std::optional<QString> commandlinefile(const QStringList& arguments)
         line = line.mid(1, line.size() - 2).trimmed();
     if (line.isEmpty())
         return std::nullopt;
+    // A name given from a terminal is relative to the folder the program was
+    // started in; the file is remembered (default file, recent files) by its
+    // whole path so that it is found from anywhere.
+    if (QFileInfo(line).isRelative())
+        line = QDir::cleanPath(QDir::current().absoluteFilePath(line));
     return line;
 }
 

@@ -14,7 +14,8 @@ class settingsstore;
 
 // The family file named on the command line (the arguments after the program
 // name), or nothing. The arguments are joined and trimmed; a text of two
-// characters or fewer names no file; surrounding quotes are removed.
+// characters or fewer names no file; surrounding quotes are removed. A
+// relative path is made whole from the current folder.
 std::optional<QString> commandlinefile(const QStringList& arguments);
 
 // "Quillmark v1.0", with ".revision" when the revision is not 0.

@@ -2,6 +2,7 @@
 #include "app/startup.h"
 #include "platform/settingsstore.h"
 
+#include <QDir>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
@@ -90,6 +91,10 @@ TEST(Startup, CommandLine)
     // The shell has already removed the quotes.
     EXPECT_EQ(commandlinefile({QStringLiteral("/my"), QStringLiteral("files/a.ged")}),
               QStringLiteral("/my files/a.ged"));
+    // A relative path, as typed in a terminal, is remembered whole.
+    EXPECT_EQ(commandlinefile({QStringLiteral("family.ged")}), QDir::current().filePath(QStringLiteral("family.ged")));
+    EXPECT_EQ(commandlinefile({QStringLiteral("\"../b/family.ged\"")}),
+              QDir::cleanPath(QDir::currentPath() + QStringLiteral("/../b/family.ged")));
 }
 
 TEST(Startup, PlacementStopsAtFirstMissingValue)
