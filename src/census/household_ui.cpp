@@ -254,11 +254,21 @@ void mainfrm::findclicked()
     }
     watchfile_ = false;
     fromfind_ = false;
-    findresult_ = runfind(findresult_);
+    const int32_t chosen = runfind(findresult_);
+    // The file may have changed while Find was open: it is looked at now, and
+    // the individual chosen found again by record number after a reload (not
+    // in another file opened instead of one that has gone).
+    const int32_t chosenid = chosen >= 0 ? index_->people[static_cast<size_t>(chosen)].id : -1;
+    const QString file = gedcomfile_;
+    watchfile_ = true;
+    checkonactivate();
+    findresult_ = -1;
+    for (size_t k = 0; chosenid >= 0 && gedcomfile_ == file && k < index_->people.size() && findresult_ < 0; ++k)
+        if (index_->people[k].id == chosenid)
+            findresult_ = static_cast<int32_t>(k);
     if (findresult_ != -1)
         peopleclicked(-1);
     fromfind_ = false;
-    watchfile_ = true;
     findresult_ = -1;
 }
 

@@ -129,27 +129,31 @@ private slots:
     }
 
     // Name search from the main window with no row yet: OK adds the individual
-    // and the family list is built around it.
+    // and the family list is built around it. A change made in another
+    // program meanwhile is found as Find closes.
     void findbyname()
     {
-        auto run = files_.opened(files_.sample());
+        const QString file = files_.sample();
+        auto run = files_.opened(file);
         QVERIFY(run);
         mainfrm& w = *run->w;
         dialoganswers dialogs;
-        dialogs.expect(QStringLiteral("findfrm"), [](QDialog* d) {
+        dialogs.expect(QStringLiteral("findfrm"), [&](QDialog* d) {
             QVERIFY(!child<QPushButton>(d, "okbut")->isEnabled());
             QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("ASHWORTH, JOHN (3"));
             QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
             QCOMPARE(items(d, "spouselst"), QStringList{"Kershaw, Ellen"});
             QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("x"));
             QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
+            QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/", "1 NAME Johnny /Ashworth/"));
             QTest::mouseClick(child<QPushButton>(d, "okbut"), Qt::LeftButton);
         });
+        run->prompts.expect(answer::ok, file + QStringLiteral(" has been modified by another application"));
         QTest::mouseClick(findbut(w), Qt::LeftButton);
         QCOMPARE(dialogs.seen, QStringList{QStringLiteral("findfrm")});
         QCOMPARE(dialogs.unexpected, 0);
-        QCOMPARE(shownnames(w), QStringList{QStringLiteral("Ashworth, John")});
-        QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, John:"));
+        QCOMPARE(shownnames(w), QStringList{QStringLiteral("Ashworth, Johnny")});
+        QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, Johnny:"));
         QVERIFY(w.watching());
         QCOMPARE(run->prompts.unexpected(), 0);
     }
