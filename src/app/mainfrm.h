@@ -170,6 +170,7 @@ private:
     bool watchfile_ = false;
     bool checking_ = false;
     bool reloading_ = false;
+    QString gonetold_; // the family file the user was told is no longer there
     int32_t findresult_ = -1;
     bool fromfind_ = false;     // the Find dialog asked for the immediate family to be rebuilt
     bool reloadneeded_ = false; // a tool rewrote the file (or found it changed): read it again

@@ -14,6 +14,7 @@
 #include <QApplication>
 #include <QCheckBox>
 #include <QComboBox>
+#include <QFileInfo>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListView>
@@ -279,6 +280,17 @@ void mainfrm::checkonactivate()
     checking_ = true;
     repaint();
     QApplication::processEvents();
+    const QString& path = index_->gedcomfile;
+    if (!QFileInfo::exists(path)) {
+        // Reloading could only fail: the user is told once, and may open another file.
+        const bool told = gonetold_ == path;
+        gonetold_ = path;
+        checking_ = false;
+        if (!told && prompts_.yes(filegonequestion(path), icon::exclamation))
+            openfamilyfile(QStringLiteral("-1"));
+        return;
+    }
+    gonetold_.clear();
     if (filechanged(*index_)) {
         prompts_.tell(changedmessage(index_->gedcomfile));
         checking_ = false;

@@ -21,6 +21,13 @@ QString changedmessage(const QString& path)
     return QDir::toNativeSeparators(path) + QStringLiteral(" has been modified by another application and will be reloaded.");
 }
 
+QString filegonequestion(const QString& path)
+{
+    return QDir::toNativeSeparators(path)
+        + QStringLiteral(" can no longer be found: it has been deleted, renamed or moved by another application. "
+                         "Do you want to open another family history file?");
+}
+
 QString changedonsavemessage(const QString& path, bool imageschosen)
 {
     if (!imageschosen)

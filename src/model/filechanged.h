@@ -18,6 +18,9 @@ bool filechanged(const gedcomindex& index);
 
 // path + " has been modified by another application and will be reloaded."
 QString changedmessage(const QString& path);
+// The family file is no longer there (deleted, renamed or moved outside):
+// asks whether to open another family file.
+QString filegonequestion(const QString& path);
 // The same said during a save, which drops the images chosen for the entry.
 QString changedonsavemessage(const QString& path, bool imageschosen);
 

@@ -424,6 +424,26 @@ private slots:
         QVERIFY(shownnames(w).isEmpty());
         QCOMPARE(w.index()->people.size(), size_t(39));
         QCOMPARE(s->prompts.unexpected(), 0);
+
+        // The file renamed in the other program: said once, not reloaded.
+        QVERIFY(QFile::rename(file, file + QStringLiteral(".old")));
+        s->prompts.expect(answer::no, file + QStringLiteral(" can no longer be found"));
+        w.checkonactivate();
+        w.checkonactivate();
+        QCOMPARE(w.index()->people.size(), size_t(39));
+        QCOMPARE(s->prompts.unexpected(), 0);
+        // Back and gone again: another file may be opened instead.
+        QVERIFY(QFile::rename(file + QStringLiteral(".old"), file));
+        w.checkonactivate();
+        QVERIFY(QFile::rename(file, file + QStringLiteral(".old")));
+        const QString other = files_.sample();
+        s->prompts.expect(answer::yes, QStringLiteral("Do you want to open another family history file?"));
+        s->prompts.expectfile(other);
+        s->prompts.expect(answer::no, QStringLiteral("by default"));
+        w.checkonactivate();
+        QCOMPARE(w.gedcomfile(), other);
+        QCOMPARE(w.index()->people.size(), size_t(40));
+        QCOMPARE(s->prompts.unexpected(), 0);
     }
 
     // Not a test: scripts/screenshot.sh runs it to picture the main window
