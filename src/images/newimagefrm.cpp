@@ -283,7 +283,7 @@ void newimagefrm::addclicked()
             return;
         }
         if (!renamed.logerror.isEmpty())
-            prompts_.tell(renamed.logerror, icon::exclamation);
+            prompts_.tell(renamed.logerror, icon::critical);
         file = renamed.path;
     }
     addnewimage(chosen_, nextobjectid_, file, title, number, Datetxt_->text());

@@ -9,7 +9,7 @@ aftersave tellsaveoutcome(prompts& p, const saveoutcome& out)
     switch (out.status) {
     case savestatus::saved:
         if (!out.logerror.isEmpty())
-            p.tell(out.logerror, icon::exclamation);
+            p.tell(out.logerror, icon::critical);
         return aftersave::saved;
     case savestatus::changed:
         return aftersave::changed;

@@ -59,6 +59,6 @@ TEST(SavePrompts, SaveStandsAndOnlyALogErrorIsShown)
     EXPECT_EQ(tellsaveoutcome(p, outcome(savestatus::saved, QString(), QStringLiteral("The census log could not be written"))),
               aftersave::saved);
     ASSERT_EQ(p.history().size(), 1u);
-    EXPECT_EQ(p.history()[0].m.kind, icon::exclamation);
+    EXPECT_EQ(p.history()[0].m.kind, icon::critical);
     EXPECT_EQ(p.unexpected(), 0);
 }
