@@ -3,8 +3,11 @@
 # they are missing. Runs apt-get through sudo when not run as root.
 set -euo pipefail
 
+# fonts-noto-core makes the system's fixed font proportional: the window tests
+# check that columns of text line up all the same.
 packages=(g++ cmake ninja-build pkg-config qt6-base-dev qt6-base-dev-tools qt6-qpa-plugins
-          qt6-image-formats-plugins libgtest-dev libgmock-dev libbenchmark-dev python3 ccache)
+          qt6-image-formats-plugins libgtest-dev libgmock-dev libbenchmark-dev python3 ccache
+          fonts-noto-core)
 [ "${QM_WITH_FUZZ:-0}" = 1 ] && packages+=(clang libclang-rt-dev)
 
 missing=()

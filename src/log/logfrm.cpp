@@ -3,7 +3,6 @@
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
-#include <QFontDatabase>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPlainTextEdit>
@@ -27,7 +26,7 @@ logfrm::logfrm(const QString& logpath, prompts& asker, QWidget* parent)
     logtxt_->setAccessibleName(QStringLiteral("Census log"));
     logtxt_->setReadOnly(true);
     logtxt_->setLineWrapMode(QPlainTextEdit::NoWrap);
-    logtxt_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+    logtxt_->setFont(fixedfont());
     logtxt_->setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
 
     auto* buttonspic = new QWidget(this);

@@ -1,7 +1,10 @@
 #include "platform/formparts_ui.h"
 
 #include <QFontDatabase>
+#include <QFontInfo>
+#include <QFontMetricsF>
 #include <QGridLayout>
+#include <QGuiApplication>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
@@ -60,12 +63,57 @@ okcancel okcancelrow(QWidget* dialog)
     return b;
 }
 
+namespace {
+// Whether text in the font the system gives for `f` lines up in columns.
+bool fixedpitch(const QFont& f)
+{
+    const QFontMetricsF m(f);
+    return QFontInfo(f).fixedPitch() && m.horizontalAdvance(QLatin1Char('i')) == m.horizontalAdvance(QLatin1Char('M'));
+}
+
+QFont choosefixedfont()
+{
+    const qreal points = QGuiApplication::font().pointSizeF();
+    const auto sized = [points](QFont f) {
+        if (points > 0)
+            f.setPointSizeF(points);
+        return f;
+    };
+    // The family asked for is not always the one given: where "monospace"
+    // stands for a proportional font (Debian with the Noto fonts, for one)
+    // the system's own fixed font can be proportional too.
+    QFont asked = sized(QFont(QStringLiteral("monospace")));
+    asked.setStyleHint(QFont::TypeWriter);
+    if (fixedpitch(asked))
+        return asked;
+    const QFont system = QFontDatabase::systemFont(QFontDatabase::FixedFont);
+    if (fixedpitch(system))
+        return system;
+    QStringList families{QStringLiteral("Courier New"),  QStringLiteral("Consolas"),
+                         QStringLiteral("DejaVu Sans Mono"), QStringLiteral("Liberation Mono"),
+                         QStringLiteral("Noto Sans Mono"), QStringLiteral("Noto Mono"),
+                         QStringLiteral("Menlo"),          QStringLiteral("Cousine"),
+                         QStringLiteral("FreeMono"),       QStringLiteral("Nimbus Mono PS"),
+                         QStringLiteral("Courier")};
+    for (const QString& family : QFontDatabase::families())
+        if (QFontDatabase::isFixedPitch(family) && !families.contains(family))
+            families << family;
+    for (const QString& family : families) {
+        if (!QFontDatabase::hasFamily(family))
+            continue;
+        QFont f = sized(QFont(family));
+        f.setStyleHint(QFont::TypeWriter);
+        if (fixedpitch(f))
+            return f;
+    }
+    return asked; // no fixed-pitch font installed: the nearest the system has
+}
+} // namespace
+
 QFont fixedfont()
 {
-    QFont font = QFontDatabase::systemFont(QFontDatabase::FixedFont);
-    if (QFontDatabase::hasFamily(QStringLiteral("Courier New")))
-        font.setFamily(QStringLiteral("Courier New"));
-    return font;
+    static const QFont chosen = choosefixedfont();
+    return chosen;
 }
 
 } // namespace qm

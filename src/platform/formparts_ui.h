@@ -50,7 +50,9 @@ struct okcancel {
 };
 okcancel okcancelrow(QWidget* dialog);
 
-// The fixed-pitch font for columns of text: Courier New where installed.
+// The fixed-pitch font for columns of text, for every control that shows
+// them: one that really is fixed-pitch wherever the program runs (checked, not
+// taken from its name), found once.
 QFont fixedfont();
 
 } // namespace qm

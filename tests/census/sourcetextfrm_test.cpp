@@ -1,7 +1,7 @@
 #include "census/sourcetextfrm.h"
+#include "support/fixedpitch.h"
 
 #include <QApplication>
-#include <QFontInfo>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QTimer>
@@ -20,7 +20,7 @@ private slots:
         sourcetextfrm text(sourcetextfrm::sourcetext, QStringLiteral("x"), &main);
         QCOMPARE(text.windowTitle(), QStringLiteral("Source Text"));
         QCOMPARE(text.size(), QSize(950, 760));
-        QVERIFY(QFontInfo(text.findChild<QPlainTextEdit*>(QStringLiteral("sourcetxt"))->font()).fixedPitch());
+        QVERIFY(qmtest::linesupcolumns(text.findChild<QPlainTextEdit*>(QStringLiteral("sourcetxt"))->font()));
         QCOMPARE(text.findChild<QPushButton*>(QStringLiteral("cancelbut"))->text(), QStringLiteral("Cancel"));
         QCOMPARE(sourcetextfrm(sourcetextfrm::sourcenote, QString(), &main).windowTitle(), QStringLiteral("Source Note"));
         QCOMPARE(sourcetextfrm(7, QString(), &main).windowTitle(), QStringLiteral("Source Note"));

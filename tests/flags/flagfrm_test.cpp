@@ -7,12 +7,12 @@
 
 #include "flags/flagalloc.h"
 #include "model/gedcomindex.h"
+#include "support/fixedpitch.h"
 #include "support/mainfrmfixture.h"
 
 #include <QAction>
 #include <QCheckBox>
 #include <QDir>
-#include <QFontInfo>
 #include <QListWidget>
 #include <QPushButton>
 #include <QRadioButton>
@@ -97,7 +97,7 @@ private slots:
         QCOMPARE(rows(&d), (QStringList{"1881           UK             Census 1881",
                                         "5 APR 1891     UK             Unused",
                                         "31 MAR 1901    Ireland        Census 1901"}));
-        QVERIFY(QFontInfo(child<QListWidget>(&d, "flagslst")->font()).fixedPitch());
+        QVERIFY(linesupcolumns(child<QListWidget>(&d, "flagslst")->font()));
         QVERIFY(!child(&d, "delbut")->isEnabled());
         QVERIFY(child(&d, "flagcheckbut")->isEnabled());
 

@@ -2,7 +2,9 @@
 // the View menu's "View Log..." and "Clear Log File" in the main window.
 #include "log/logfrm.h"
 
+#include "support/fixedpitch.h"
 #include "support/mainfrmfixture.h"
+#include "support/screenreader.h"
 
 #include <QAction>
 #include <QFileInfo>
@@ -58,6 +60,7 @@ private slots:
         auto* next = child<QPushButton>(&v, "nextpagebut");
         auto* page = child<QLabel>(&v, "pagelab");
         QCOMPARE(page->text(), QStringLiteral("1"));
+        QVERIFY(linesupcolumns(text->font()));
         QCOMPARE(text->document()->blockCount(), 651 + 1); // the last line end opens an empty block
         QVERIFY(!text->toPlainText().contains(QStringLiteral("  ")));
         QVERIFY(next->isEnabled());
