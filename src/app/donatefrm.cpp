@@ -28,9 +28,8 @@ donatefrm::donatefrm(prompts& opener, std::optional<int64_t> milestone, QWidget*
     setWindowTitle(milestone ? QStringLiteral("Milestone") : QStringLiteral("Would you like to make a donation?"));
     setModal(true);
 
-    auto* mainlab = new QLabel(milestone ? milestonetext(*milestone) : QString(), this);
-    mainlab->setObjectName(QStringLiteral("mainlab"));
-    mainlab->setAccessibleName(QStringLiteral("Milestone"));
+    auto* mainlab = showsvalue(new QLabel(milestone ? milestonetext(*milestone) : QString(), this),
+                               QStringLiteral("mainlab"), QStringLiteral("Milestone"));
     mainlab->setWordWrap(true);
     QFont bold = mainlab->font();
     bold.setBold(true);

@@ -8,6 +8,7 @@
 #include "flags/flagtable.h"
 #include "model/dates.h"
 #include "model/loadgedcom.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
 #include "writer/backups.h"
@@ -213,9 +214,7 @@ void mainfrm::buildform()
     buttons->addWidget(reloadbut_);
     v->addLayout(buttons);
 
-    infolab_ = new QLabel(central);
-    infolab_->setObjectName(QStringLiteral("infolab"));
-    infolab_->setAccessibleName(QStringLiteral("Information"));
+    infolab_ = showsvalue(new QLabel(central), QStringLiteral("infolab"), QStringLiteral("Information"));
     infolab_->setWordWrap(true);
     infolab_->setTextFormat(Qt::PlainText);
     infolab_->setFrameShape(QFrame::StyledPanel);

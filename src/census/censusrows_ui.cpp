@@ -1,5 +1,7 @@
 #include "census/censusrows_ui.h"
 
+#include "platform/formparts_ui.h"
+
 #include <QGridLayout>
 #include <QKeyEvent>
 #include <QLabel>
@@ -60,9 +62,7 @@ censusrowsview::censusrowsview(QWidget* parent) : QWidget(parent)
         rowcontrols& c = rows_[static_cast<size_t>(r)];
         const QString n = QString::number(r + 1);
         const int gr = r + 1;
-        c.namelab = new QLabel(this);
-        c.namelab->setObjectName(QStringLiteral("namelab"));
-        c.namelab->setAccessibleName(QStringLiteral("Name, row ") + n);
+        c.namelab = showsvalue(new QLabel(this), QStringLiteral("namelab"), QStringLiteral("Name, row ") + n);
         c.namelab->setMinimumWidth(120);
         c.namelab->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
         grid->addWidget(c.namelab, gr, 0);
@@ -94,9 +94,7 @@ censusrowsview::censusrowsview(QWidget* parent) : QWidget(parent)
         c.occtxt->installEventFilter(this);
         grid->addWidget(c.occtxt, gr, 3);
 
-        c.idlab = new QLabel(this);
-        c.idlab->setObjectName(QStringLiteral("idlab"));
-        c.idlab->setAccessibleName(QStringLiteral("Record ID, row ") + n);
+        c.idlab = showsvalue(new QLabel(this), QStringLiteral("idlab"), QStringLiteral("Record ID, row ") + n);
         c.idlab->setMinimumWidth(c.idlab->fontMetrics().horizontalAdvance(QStringLiteral("0000000")));
         grid->addWidget(c.idlab, gr, 4);
 

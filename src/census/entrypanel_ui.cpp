@@ -1,6 +1,7 @@
 #include "census/entrypanel_ui.h"
 
 #include "census/backtab_ui.h"
+#include "platform/formparts_ui.h"
 
 #include <QComboBox>
 #include <QGridLayout>
@@ -21,7 +22,8 @@ constexpr double minshare = 0.2;
 constexpr double closeshare = 0.97;
 
 // A caption label for a field: its buddy is the field, and the field's
-// accessible name is the caption without its colon.
+// accessible name is the caption without its colon; a label showing a value
+// keeps the value as its name and takes the caption as its description.
 QLabel* caption(QWidget* parent, const QString& text, QWidget* field)
 {
     auto* l = new QLabel(text, parent);
@@ -30,7 +32,10 @@ QLabel* caption(QWidget* parent, const QString& text, QWidget* field)
     name.remove(QLatin1Char('&'));
     if (name.endsWith(QLatin1Char(':')))
         name.chop(1);
-    field->setAccessibleName(name);
+    if (auto* value = qobject_cast<QLabel*>(field))
+        showsvalue(value, value->objectName(), name);
+    else
+        field->setAccessibleName(name);
     return l;
 }
 
@@ -168,7 +173,11 @@ entrypanel::entrypanel(int m, QWidget* parent) : QWidget(parent), mode(m)
     dividerpic->setCollapsible(0, false);
     dividerpic->setCollapsible(1, true);
     dividerpic->setHandleWidth(7);
-    dividerpic->handle(1)->setToolTip(QStringLiteral("Drag up or down to reveal/resize the Source Note box"));
+    const QString dividertip = QStringLiteral("Drag up or down to reveal/resize the Source Note box");
+    dividerpic->setAccessibleName(QStringLiteral("Source Text and Source Note"));
+    dividerpic->handle(1)->setToolTip(dividertip);
+    dividerpic->handle(1)->setAccessibleName(QStringLiteral("Divider between Source Text and Source Note"));
+    dividerpic->handle(1)->setAccessibleDescription(dividertip);
     dividerpic->handle(1)->installEventFilter(this);
     connect(dividerpic, &QSplitter::splitterMoved, this, [this] { settle(false); });
     outer->addWidget(dividerpic, 6);

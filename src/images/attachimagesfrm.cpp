@@ -69,7 +69,8 @@ void Attachimagesfrm::build()
     searchbut_->setEnabled(false);
     imagecountchk_ = named(new QCheckBox(QStringLiteral("Only show sources with &no images attached"), sourcesframe),
                            "imagecountchk", QStringLiteral("Only show sources with no images attached"));
-    countlab_ = named(new QLabel(sourcesframe), "countlab", QStringLiteral("Number of sources listed"));
+    countlab_ = showsvalue(new QLabel(sourcesframe), QStringLiteral("countlab"),
+                           QStringLiteral("Number of sources listed"));
 
     auto* search = new QHBoxLayout;
     search->addWidget(sourceopt_[2]);

@@ -1,6 +1,7 @@
 #include "images/imagepreview_ui.h"
 
 #include "images/imageviewfrm.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QApplication>
@@ -75,9 +76,8 @@ imagepreview::imagepreview(prompts& p, QSize boxsize, QWidget* parent) : QWidget
     imagepic_->setAccessibleName(QStringLiteral("Image preview"));
     imagepic_->setToolTip(QStringLiteral("Click on image to see full-size version"));
     imagepic_->setFixedSize(boxsize);
-    previewmessagelab_ = new QLabel(this);
-    previewmessagelab_->setObjectName(QStringLiteral("previewmessagelab"));
-    previewmessagelab_->setAccessibleName(QStringLiteral("Preview message"));
+    previewmessagelab_ =
+        showsvalue(new QLabel(this), QStringLiteral("previewmessagelab"), QStringLiteral("Preview message"));
     previewmessagelab_->setWordWrap(true);
     previewmessagelab_->setAlignment(Qt::AlignLeft | Qt::AlignTop);
     previewmessagelab_->setFixedSize(boxsize);

@@ -6,6 +6,7 @@
 #include "images/imagepreview_ui.h"
 #include "images/newimagefrm.h"
 #include "model/gedcomindex.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 
 #include <QGridLayout>
@@ -48,9 +49,7 @@ void imagesfrm::build()
     auto* layout = new QVBoxLayout(this);
     auto* sourceline = new QHBoxLayout;
     sourceline->addWidget(new QLabel(QStringLiteral("Current Source:"), this));
-    sourcetitlelab_ = new QLabel(this);
-    sourcetitlelab_->setObjectName(QStringLiteral("sourcetitlelab"));
-    sourcetitlelab_->setAccessibleName(QStringLiteral("Current Source"));
+    sourcetitlelab_ = showsvalue(new QLabel(this), QStringLiteral("sourcetitlelab"), QStringLiteral("Current Source"));
     sourcetitlelab_->setWordWrap(true);
     sourcetitlelab_->setTextInteractionFlags(Qt::TextSelectableByMouse);
     sourceline->addWidget(sourcetitlelab_, 1);

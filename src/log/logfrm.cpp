@@ -36,7 +36,7 @@ logfrm::logfrm(const QString& logpath, prompts& asker, QWidget* parent)
                          QStringLiteral("Next page"));
     nextpagebut_->setDefault(true);
     auto* pagecaption = new QLabel(QStringLiteral("Page"), buttonspic);
-    pagelab_ = named(new QLabel(buttonspic), "pagelab", QStringLiteral("Page number"));
+    pagelab_ = showsvalue(new QLabel(buttonspic), QStringLiteral("pagelab"), QStringLiteral("Page number"));
     auto* closebut = plainbutton(buttonspic, "closebut", QStringLiteral("Close"), QStringLiteral("Close"));
 
     auto* strip = new QHBoxLayout(buttonspic);

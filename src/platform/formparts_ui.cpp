@@ -26,9 +26,17 @@ QLineEdit* shownfield(QWidget* parent, const char* name, const QString& accessib
     return e;
 }
 
-QLabel* valuelabel(QWidget* parent, const QString& name, const QString& accessible, const QString& text)
+QLabel* showsvalue(QLabel* l, const QString& name, const QString& caption)
 {
-    auto* l = named(new QLabel(text, parent), name, accessible);
+    l->setObjectName(name);
+    l->setAccessibleName(QString());
+    l->setAccessibleDescription(caption);
+    return l;
+}
+
+QLabel* valuelabel(QWidget* parent, const QString& name, const QString& caption, const QString& text)
+{
+    auto* l = showsvalue(new QLabel(text, parent), name, caption);
     l->setTextFormat(Qt::PlainText);
     l->setTextInteractionFlags(Qt::TextSelectableByMouse);
     return l;

@@ -33,8 +33,13 @@ T* named(T* w, const char* name, const QString& accessible)
 QLineEdit* readonlybox(QWidget* parent, const char* name, const QString& accessible);
 // The same, passed over by Tab: a value shown beside the button that sets it.
 QLineEdit* shownfield(QWidget* parent, const char* name, const QString& accessible);
-// A label showing a value as plain text the user can select.
-QLabel* valuelabel(QWidget* parent, const QString& name, const QString& accessible, const QString& text);
+// Names a label that shows a value (a name, a number, a count) so that screen
+// readers read the value: a label without an accessible name of its own is
+// read by its text, and Qt tells them whenever the text changes. The caption
+// saying what the value is becomes its accessible description.
+QLabel* showsvalue(QLabel* l, const QString& name, const QString& caption);
+// A label showing a value as plain text the user can select (showsvalue).
+QLabel* valuelabel(QWidget* parent, const QString& name, const QString& caption, const QString& text);
 // A button that Enter does not press unless it has the focus.
 QPushButton* plainbutton(QWidget* parent, const char* name, const QString& text, const QString& accessible);
 // Adds `w` with its caption (buddy of `w`, for the mnemonic) in the next row

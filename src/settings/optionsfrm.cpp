@@ -337,9 +337,7 @@ QWidget* optionsfrm::method1tab()
     const QString resettitle = QStringLiteral("Reset to Default Title");
     defaulttitlebut = plainbutton(title, "defaulttitlebut", resettitle, resettitle);
     auto* examplelab = new QLabel(QStringLiteral("Example Output:"), title);
-    titleoutputlab = new QLabel(title);
-    titleoutputlab->setObjectName(QStringLiteral("titleoutputlab"));
-    titleoutputlab->setAccessibleName(QStringLiteral("Example Output"));
+    titleoutputlab = showsvalue(new QLabel(title), QStringLiteral("titleoutputlab"), QStringLiteral("Example Output"));
     titleoutputlab->setTextFormat(Qt::PlainText);
     titleoutputlab->setWordWrap(true);
     titleoutputlab->setTextInteractionFlags(Qt::TextSelectableByMouse);

@@ -107,7 +107,7 @@ void Datecheckfrm::build()
                              QStringLiteral("Edit Suggestions"));
     auto* edit = new QGridLayout(suggestionframe_);
     edit->addWidget(new QLabel(QStringLiteral("Census Date:"), suggestionframe_), 0, 0);
-    datelab_ = named(new QLabel(suggestionframe_), QStringLiteral("datelab"), QStringLiteral("Census Date"));
+    datelab_ = showsvalue(new QLabel(suggestionframe_), QStringLiteral("datelab"), QStringLiteral("Census Date"));
     datelab_->setTextFormat(Qt::PlainText);
     QFont bold = datelab_->font();
     bold.setBold(true);

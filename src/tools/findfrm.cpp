@@ -80,7 +80,7 @@ void findfrm::build()
     peoplelst_->setSelectionMode(QAbstractItemView::SingleSelection);
     peoplelst_->setEditTriggers(QAbstractItemView::NoEditTriggers);
     peoplelst_->setMinimumWidth(280);
-    countlab_ = named(new QLabel(this), "countlab", QStringLiteral("Number of individuals"));
+    countlab_ = showsvalue(new QLabel(this), QStringLiteral("countlab"), QStringLiteral("Number of individuals"));
 
     IDfindtxt_ = named(new QLineEdit(this), "IDfindtxt", QStringLiteral("Individual ID to find"));
     IDfindtxt_->setToolTip(

@@ -3,8 +3,10 @@
 #include "app/mainfrm.h"
 #include "census/entrypanel_ui.h"
 #include "census/householdpanel_ui.h"
+#include "model/dates.h"
 #include "platform/encoding.h"
 #include "support/mainfrmfixture.h"
+#include "support/screenreader.h"
 
 #include <QAbstractButton>
 #include <QAction>
@@ -12,6 +14,7 @@
 #include <QDir>
 #include <QPlainTextEdit>
 #include <QPushButton>
+#include <QSplitter>
 #include <QTest>
 #include <QToolButton>
 
@@ -45,6 +48,8 @@ private slots:
         QVERIFY(!s->w->firststart()); // the fixture writes complete settings
         QCOMPARE(s->prompts.unexpected(), 0);
 
+        // The divider under the source text is named for screen readers.
+        QVERIFY(!accessiblename(s->w->panel()->dividerpic->handle(1)).isEmpty());
         // Every control carries its name, and every box and list an accessible name.
         for (QWidget* c : s->w->findChildren<QWidget*>()) {
             if (!qobject_cast<QLineEdit*>(c) && !qobject_cast<QPlainTextEdit*>(c) && !qobject_cast<QComboBox*>(c) &&
@@ -187,6 +192,12 @@ private slots:
 
         clickid(w, peoplelist(w), 11); // William Ashworth junior
         QCOMPARE(w.household().selectioncount, 1);
+        // A screen reader reads the values shown: name, record ID, information, new source number.
+        for (QLabel* value : {rowcontrols<QLabel>(w, "namelab")[0], rowcontrols<QLabel>(w, "idlab")[0],
+                              w.findChild<QLabel*>(QStringLiteral("infolab")), w.panel()->sourceidlab}) {
+            QVERIFY(!value->text().isEmpty());
+            QCOMPARE(accessiblename(value), value->text());
+        }
         QVERIFY(w.findChild<QLabel*>(QStringLiteral("immediatefamilylab"))->text().startsWith("Immediate Family of "));
         QVERIFY(w.findChild<QPushButton*>(QStringLiteral("Autosourcebut"))->isEnabled());
         QVERIFY(w.findChild<QLabel*>(QStringLiteral("infolab"))->text().contains(QStringLiteral("in this census would be aged")));

@@ -1,6 +1,7 @@
 #include "census/birthfrm.h"
 
 #include "platform/scriptedprompts.h"
+#include "support/screenreader.h"
 
 #include <QApplication>
 #include <QLabel>
@@ -69,6 +70,9 @@ private slots:
         QTEST(child(d, "agelab")->text(), "agelab");
         QTEST(child(d, "doblab")->text(), "doblab");
         QVERIFY(child<QPushButton>(d, "okbut")->isEnabled());
+        // A screen reader reads the values themselves.
+        for (const char* name : {"namelab", "idlab", "agelab", "doblab"})
+            QCOMPARE(qmtest::accessiblename(child(d, name)), child(d, name)->text());
     }
 
     void buttonsandoccupation()
@@ -79,6 +83,7 @@ private slots:
         QCOMPARE(child<QPushButton>(d, "okbut")->text(), QStringLiteral("Create Birth Event"));
         QCOMPARE(child<QPushButton>(d, "cancelbut")->text(), QStringLiteral("Do Not Create Birth Event"));
         QCOMPARE(child(d, "occlab")->text(), QStringLiteral("Ag Lab"));
+        QCOMPARE(qmtest::accessiblename(child(d, "occlab")), QStringLiteral("Ag Lab"));
         QCOMPARE(child(d, "occtitlelab")->text(), QStringLiteral("Occupation:"));
         QVERIFY(child(d, "occlab")->isVisible());
         QSignalSpy help(&d, &birthfrm::helprequested);

@@ -11,6 +11,7 @@
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
 #include "support/mainfrmfixture.h"
+#include "support/screenreader.h"
 
 #include <QCheckBox>
 #include <QDir>
@@ -218,6 +219,7 @@ private slots:
         r.imagedate = QStringLiteral("3 APR 1881");
         imagesfrm f(r, *ix, s, *store, p);
         f.show();
+        QCOMPARE(accessiblename(child<QLabel>(&f, QStringLiteral("sourcetitlelab"))), r.sourcetitle);
         auto* list = child<QListWidget>(&f, QStringLiteral("newimageslst"));
         QVERIFY(!button(&f, "okbut")->isEnabled());
         button(&f, "helpbut")->click();

@@ -66,6 +66,7 @@ private slots:
         QVERIFY(next->isEnabled());
         QTest::mouseClick(next, Qt::LeftButton);
         QCOMPARE(page->text(), QStringLiteral("2"));
+        QCOMPARE(accessiblename(page), QStringLiteral("2"));
         QCOMPARE(text->document()->blockCount(), 49 + 1);
         QVERIFY(!next->isEnabled());
         QTest::mouseClick(child<QPushButton>(&v, "startbut"), Qt::LeftButton);

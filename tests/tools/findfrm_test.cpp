@@ -5,6 +5,7 @@
 
 #include "model/loadgedcom.h"
 #include "support/mainfrmfixture.h"
+#include "support/screenreader.h"
 #include "tools/findindividual.h"
 
 #include <QCheckBox>
@@ -88,6 +89,7 @@ private slots:
         findfrm d(*x, findlist(*x, false, {}), -1, asker);
         d.show();
         QCOMPARE(child<QLabel>(&d, "countlab")->text(), QStringLiteral("3 individuals."));
+        QCOMPARE(accessiblename(child<QLabel>(&d, "countlab")), QStringLiteral("3 individuals."));
         QVERIFY(!child<QPushButton>(&d, "okbut")->isEnabled());
         QVERIFY(!child<QPushButton>(&d, "IDfindbut")->isEnabled());
 
