@@ -57,6 +57,14 @@ struct personrec {
     int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
 };
 
+// One "1 CENS" event of a family ("0 @F..."): a census event of the file like
+// those of individuals, which the census date check lists and changes too.
+struct familycensusrec {
+    int32_t family = 0;     // the family's record number
+    std::string_view date;  // "2 DATE" value
+    std::string_view place; // "2 PLAC" value
+};
+
 // One source record ("0 @S...").
 struct sourcerec {
     int32_t id = 0;
@@ -92,6 +100,7 @@ struct gedcomindex {
     std::vector<sourcerec> sources;
     std::vector<objectrec> objects;
     std::vector<placerec> places; // sorted by name ignoring case, one entry per group
+    std::vector<familycensusrec> familycensus; // in file order
     flagtable flags;              // the defined flags, then those met in the file
 
     std::vector<int32_t> censussources; // positions in `sources` of census sources, in file order

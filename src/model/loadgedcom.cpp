@@ -166,7 +166,7 @@ public:
     void finish();
 
 private:
-    enum class kind { none, source, person, object };
+    enum class kind { none, source, person, object, family };
 
     std::string_view text(std::string_view raw);
     std::string_view place(std::string_view raw);
@@ -182,6 +182,7 @@ private:
     void sourceline(std::string_view s);
     void objectline(std::string_view s);
     void personline(std::string_view s);
+    void familyline(std::string_view s);
     void setname(std::string_view s);
     void flagline(std::string_view s);
     template <typename T>
@@ -201,6 +202,7 @@ private:
     std::string conv_, flagcode_, flagname_; // conversion scratch
 
     kind kind_ = kind::none;
+    int32_t familyid_ = 0; // of the current family record
     int32_t highestsource = 0;
     bool namepending = false, birthpending = false, deathpending = false;
     bool inbirthdate = false, inbirthplace = false, indeath = false;
@@ -318,6 +320,9 @@ void loader::line(std::string_view s)
     case kind::object:
         objectline(s);
         break;
+    case kind::family:
+        familyline(s);
+        break;
     case kind::none:
         break;
     }
@@ -362,6 +367,10 @@ void loader::startrecord(std::string_view s)
     }
     case 'N':
         ix_.maxnoteid = std::max(ix_.maxnoteid, id);
+        break;
+    case 'F':
+        kind_ = kind::family;
+        familyid_ = id;
         break;
     default:
         break;
@@ -524,6 +533,23 @@ void loader::flagline(std::string_view s)
     convert(s.substr(2, space - 2), flagcode_);
     convert(trim(s.substr(space + 1)), flagname_);
     flagids_.push_back(static_cast<int32_t>(noteflag(ix_.flags, flagcode_, flagname_)));
+}
+
+// Families: only their census events are kept (date and place).
+void loader::familyline(std::string_view s)
+{
+    if (s[0] == '1') {
+        incensus = startswith(s, "1 CENS");
+        if (incensus)
+            ix_.familycensus.push_back({familyid_, {}, {}});
+        return;
+    }
+    if (!incensus)
+        return;
+    if (startswith(s, "2 DATE") && s.size() > 7)
+        ix_.familycensus.back().date = text(s.substr(7));
+    else if (startswith(s, "2 PLAC") && s.size() > 7)
+        ix_.familycensus.back().place = placetext(s.substr(7));
 }
 
 void loader::personline(std::string_view s)

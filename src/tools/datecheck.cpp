@@ -55,12 +55,45 @@ const std::vector<QDate>& rowdays()
 
 // The date of a census event as the rewrite reads it: without the spaces and
 // tabs that may end its line, so that every date listed can be replaced.
-std::string_view eventdate(const censusrec& c)
+std::string_view eventdate(std::string_view d)
 {
-    std::string_view d = c.date;
     while (!d.empty() && (d.back() == ' ' || d.back() == '\t'))
         d.remove_suffix(1);
     return d;
+}
+
+// Every census event of the file, the individuals' in people order, then the
+// families' (the rewrite changes the dates of both): f(date, place, age,
+// person), person being the individual's position in people or, for a family,
+// -1 - its position in familycensus.
+template <typename F>
+void foreachcensusevent(const gedcomindex& index, F&& f)
+{
+    for (size_t k = 0; k < index.people.size(); ++k)
+        for (const censusrec& c : index.people[k].census)
+            f(eventdate(c.date), c.place, c.age, static_cast<int32_t>(k));
+    for (size_t k = 0; k < index.familycensus.size(); ++k) {
+        const familycensusrec& c = index.familycensus[k];
+        f(eventdate(c.date), c.place, std::string_view(), -1 - static_cast<int32_t>(k));
+    }
+}
+
+// The names a family's census event is listed under: "Family of " + its
+// spouses' names joined by " and ", or "Family F" + its number without them.
+std::unordered_map<int32_t, QString> familynames(const gedcomindex& index, const std::vector<int32_t>& families)
+{
+    std::unordered_map<int32_t, QString> names;
+    for (int32_t f : families)
+        names.emplace(f, QString());
+    for (const personrec& p : index.people)
+        for (int32_t f : p.fams)
+            if (const auto it = names.find(f); it != names.end())
+                it->second += (it->second.isEmpty() ? QStringLiteral("Family of ") : QStringLiteral(" and "))
+                    + qs(p.name);
+    for (auto& [f, name] : names)
+        if (name.isEmpty())
+            name = QStringLiteral("Family F") + QString::number(f);
+    return names;
 }
 
 // The row after `row`, round from the last to the first.
@@ -159,24 +192,21 @@ std::vector<datechange> analysecensusdates(const gedcomindex& index, const QStri
     std::vector<datechange> out;
     // Position in `out` of each date met, by its text in the index.
     std::unordered_map<std::string_view, size_t> seen;
-    for (const personrec& p : index.people) {
-        for (const censusrec& c : p.census) {
-            const std::string_view date = eventdate(c);
-            if (date.empty())
-                continue;
-            const auto [it, added] = seen.try_emplace(date, out.size());
-            if (!added) {
-                ++out[it->second].count;
-                continue;
-            }
-            datechange d;
-            d.founddate = qs(date);
-            d.count = 1;
-            d.censusrow = officialrow(date, range.first);
-            d.datekind = d.censusrow == noproposal ? 0 : range.contains(d.censusrow) ? 1 : 2;
-            out.push_back(std::move(d));
+    foreachcensusevent(index, [&](std::string_view date, std::string_view, std::string_view, int32_t) {
+        if (date.empty())
+            return;
+        const auto [it, added] = seen.try_emplace(date, out.size());
+        if (!added) {
+            ++out[it->second].count;
+            return;
         }
-    }
+        datechange d;
+        d.founddate = qs(date);
+        d.count = 1;
+        d.censusrow = officialrow(date, range.first);
+        d.datekind = d.censusrow == noproposal ? 0 : range.contains(d.censusrow) ? 1 : 2;
+        out.push_back(std::move(d));
+    });
     return out;
 }
 
@@ -280,25 +310,35 @@ std::vector<detailentry> datedetails(const gedcomindex& index, const QString& fo
     static const QString noplace = QStringLiteral("<no place recorded>");
     std::vector<detailentry> out;
     if (!places) {
-        for (size_t k = 0; k < index.people.size(); ++k) {
-            const personrec& p = index.people[k];
-            for (const censusrec& c : p.census)
-                if (eventdate(c) == date)
-                    out.push_back({qs(p.name) + QLatin1Char(' ') + qs(c.age) + QLatin1Char(' ')
-                                       + (c.place.empty() ? noplace : qs(c.place)),
-                                   static_cast<int32_t>(k)});
-        }
+        std::vector<int32_t> families;
+        for (const familycensusrec& c : index.familycensus)
+            if (eventdate(c.date) == date)
+                families.push_back(c.family);
+        const std::unordered_map<int32_t, QString> names = familynames(index, families);
+        foreachcensusevent(index, [&](std::string_view d, std::string_view place, std::string_view age, int32_t k) {
+            if (d != date)
+                return;
+            const QString placetext = place.empty() ? noplace : qs(place);
+            if (k >= 0)
+                out.push_back({qs(index.people[static_cast<size_t>(k)].name) + QLatin1Char(' ') + qs(age)
+                                   + QLatin1Char(' ') + placetext,
+                               k});
+            else
+                out.push_back({names.at(index.familycensus[static_cast<size_t>(-1 - k)].family) + QLatin1Char(' ')
+                                   + placetext,
+                               -1});
+        });
     } else {
         std::vector<std::pair<std::string_view, int32_t>> counted;
         std::unordered_map<std::string_view, size_t> at;
-        for (const personrec& p : index.people)
-            for (const censusrec& c : p.census)
-                if (eventdate(c) == date) {
-                    const auto [it, added] = at.try_emplace(c.place, counted.size());
-                    if (added)
-                        counted.emplace_back(c.place, 0);
-                    ++counted[it->second].second;
-                }
+        foreachcensusevent(index, [&](std::string_view d, std::string_view place, std::string_view, int32_t) {
+            if (d != date)
+                return;
+            const auto [it, added] = at.try_emplace(place, counted.size());
+            if (added)
+                counted.emplace_back(place, 0);
+            ++counted[it->second].second;
+        });
         for (const auto& [place, n] : counted)
             out.push_back({(place.empty() ? noplace : qs(place)) + QStringLiteral(" (in ") + QString::number(n)
                                + QStringLiteral(" census events)"),

@@ -48,7 +48,8 @@ QString currentcountrycaption(const QString& country);
 // "Entries assumed to be for countries other than the UK:".
 QString othercountrycaption(const QString& country);
 
-// Every distinct census event date with its count and the census whose
+// Every distinct census event date, of individuals and of families (the
+// rewrite changes both), with its count and the census whose
 // official day it is (searched from the country's first row, wrapping round),
 // before any proposal. A date is read without the spaces that may end its
 // line (the rewrite reads it so); events without a date are left out.
@@ -85,8 +86,9 @@ datelists makedatelists(const std::vector<datechange>& changes);
 QStringList censuschoices();
 
 // The details of one date: each census event with it (individual's name, age,
-// place; person = position in `people`), or each distinct place with the
-// number of its events. Sorted alphabetically as the details list is.
+// place; person = position in `people`; a family's event as "Family of " + its
+// spouses' names and the place, person -1), or each distinct place with the
+// number of its events. In the order of every list of people.
 struct detailentry {
     QString text;
     int32_t person = -1;

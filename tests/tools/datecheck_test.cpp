@@ -223,33 +223,41 @@ TEST(DateCheck, Details)
                              "0 @I1@ INDI\r\n1 NAME Zoe /Adams/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n2 AGE 3\r\n"
                              "0 @I2@ INDI\r\n1 NAME Al /Brown/\r\n1 CENS\r\n2 DATE 1851\r\n2 AGE 40\r\n"
                              "1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n"
-                             "1 CENS\r\n2 DATE 1861\r\n2 PLAC Hull\r\n"
+                             "1 CENS\r\n2 DATE 1861\r\n2 PLAC Hull\r\n1 FAMS @F1@\r\n"
                              "0 @I3@ INDI\r\n1 NAME Cy /Adams/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC bath\r\n2 AGE 7\r\n"
+                             "1 FAMS @F1@\r\n"
                              "0 @I4@ INDI\r\n1 NAME Ed /\xC3\x93 Neill/\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC \xC3\x93mey\r\n"
+                             "0 @F1@ FAM\r\n1 HUSB @I2@\r\n1 WIFE @I3@\r\n1 CENS\r\n2 DATE 1851\r\n2 PLAC York\r\n"
+                             "0 @F2@ FAM\r\n1 CENS\r\n2 DATE 1851\r\n"
                              "0 TRLR\r\n";
     auto ix = load(file);
     datecheckstate s(*ix, dateorder::dmy);
     s.choosecountry(QStringLiteral("UK"));
+    // The families' census events are counted and listed with the individuals'.
+    EXPECT_EQ(s.changes()[0].count, 7);
     const auto people = s.details(0, false);
-    ASSERT_EQ(people.size(), 5u);
+    ASSERT_EQ(people.size(), 7u);
     const QString name1 = qs(ix->people[0].name), name2 = qs(ix->people[1].name), name3 = qs(ix->people[2].name);
     QStringList texts;
-    for (size_t i = 0; i < 4; ++i)
+    for (size_t i = 0; i < 6; ++i)
         texts << people[i].text;
     EXPECT_EQ(texts, (QStringList{name3 + QStringLiteral(" 7 bath"), name1 + QStringLiteral(" 3 York"),
                                   name2 + QStringLiteral("  York"), // no age
-                                  name2 + QStringLiteral(" 40 <no place recorded>")}));
-    EXPECT_TRUE(people[0].person == 2 && people[4].person == 3);
+                                  name2 + QStringLiteral(" 40 <no place recorded>"),
+                                  QStringLiteral("Family F2 <no place recorded>"),
+                                  QStringLiteral("Family of ") + name2 + QStringLiteral(" and ") + name3
+                                      + QStringLiteral(" York")}));
+    EXPECT_TRUE(people[0].person == 2 && people[4].person == -1 && people[6].person == 3);
 
     const auto places = s.details(0, true);
     // Letters with accents among their plain letters, not after Z.
     QStringList placetexts;
     for (const auto& p : places)
         placetexts << p.text;
-    EXPECT_EQ(placetexts, (QStringList{QStringLiteral("<no place recorded> (in 1 census events)"),
+    EXPECT_EQ(placetexts, (QStringList{QStringLiteral("<no place recorded> (in 2 census events)"),
                                        QStringLiteral("bath (in 1 census events)"),
                                        QString::fromUtf8("\xC3\x93mey (in 1 census events)"),
-                                       QStringLiteral("York (in 2 census events)")}));
+                                       QStringLiteral("York (in 3 census events)")}));
     EXPECT_TRUE(s.details(9, true).empty());
 }
 
@@ -270,6 +278,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
                       "1 CENS\r\n2 DATE ABT 1650\r\n"
                       "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
                       "0 @I3@ INDI\r\n1 CENS\r\n2 DATE ABT 1851 \r\n"
+                      "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE ABT 1851\r\n"
                       "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
     loadresult r = loadgedcom(path, flagtable{});
     ASSERT_TRUE(r.index);
@@ -286,7 +295,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
     const saveoutcome out = makedatechanges(*r.index, s, st.changes());
     setclockfortests(QDateTime());
     ASSERT_TRUE(out.saved()) << out.message.toStdString();
-    EXPECT_EQ(out.rewrite.censusdateschanged, 2); // one line ended with a space
+    EXPECT_EQ(out.rewrite.censusdateschanged, 3); // one line ended with a space; one a family's
     EXPECT_EQ(out.rewrite.occdateschanged, 1);
     EXPECT_TRUE(QFile::exists(out.backuppath));
     EXPECT_EQ(qmtest::readfile(path),
@@ -301,9 +310,11 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
               "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
               "0 @I3@ INDI\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
               "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
+              "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
+              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
               "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
     const std::string log = qmtest::readfile(s.logpath);
-    EXPECT_NE(log.find("Changed 2 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
+    EXPECT_NE(log.find("Changed 3 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
     EXPECT_EQ(log.find("1881"), std::string::npos) << log;
 
     // A file changed since it was read is left alone, with the check's own message.
