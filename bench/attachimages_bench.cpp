@@ -1,5 +1,5 @@
 // Attach Images to Existing Sources on generated family files (folder
-// QM_BENCH_DIR, else /work/gen): the census dates of the sources, read from the
+// QM_BENCH_DIR, else build/gen): the census dates of the sources, read from the
 // file each time the dialog opens, and the details of the source cited most
 // (the longest list of individuals the dialog fills).
 #include "images/sourcedates.h"

@@ -1,6 +1,7 @@
 #pragma once
 // The generated family files the benchmarks read (made by
-// gen_family_gedcom.py; the folder is QM_BENCH_DIR, else /work/gen).
+// gen_family_gedcom.py; the folder is QM_BENCH_DIR, else build/gen in the
+// repository: see bench/README.md).
 #include "flags/flagtable.h"
 #include "model/loadgedcom.h"
 
@@ -19,7 +20,7 @@ namespace qmbench {
 inline QString benchfile(const char* name)
 {
     const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromLocal8Bit(dir && *dir ? dir : "/work/gen") + QLatin1Char('/') + QLatin1String(name);
+    return QString::fromLocal8Bit(dir && *dir ? dir : QM_BENCH_DEFAULT_DIR) + QLatin1Char('/') + QLatin1String(name);
 }
 
 // The file loaded once for all the benchmarks of the program that use it,

@@ -1,5 +1,5 @@
 // The census date check on generated family files (gen_family_gedcom.py; the
-// folder is QM_BENCH_DIR, else /work/gen): the analysis with its proposals,
+// folder is QM_BENCH_DIR, else build/gen): the analysis with its proposals,
 // run when the dialog opens and at each country chosen, and the details of the
 // most frequent date (the individuals of the longest list the dialog fills).
 #include "tools/datecheck.h"

@@ -1,5 +1,5 @@
 // The Find Individual dialog and the log viewer on generated files (folder
-// QM_BENCH_DIR, else /work/gen): showing an individual (one pass over every
+// QM_BENCH_DIR, else build/gen): showing an individual (one pass over every
 // individual for its relatives), the dialog's list of a file just under the
 // people-list limit, a name search that misses, and paging through a large log.
 #include "log/logpages.h"

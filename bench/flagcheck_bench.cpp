@@ -1,5 +1,5 @@
 // The flag check on generated family files (folder QM_BENCH_DIR, else
-// /work/gen) with one year flag allocated to each UK census: the interactive
+// build/gen) with one year flag allocated to each UK census: the interactive
 // check that builds every change and row of the Flag Check dialog. It looks at
 // every individual, as the silent check after a load does when the flags are
 // in step (the silent check builds no rows, so this bounds it).

@@ -1,5 +1,5 @@
 // Loading generated family files of 10,000, 100,000 and 1,000,000 individuals
-// (made by gen_family_gedcom.py; the folder is QM_BENCH_DIR, else /work/gen).
+// (made by gen_family_gedcom.py; the folder is QM_BENCH_DIR, else build/gen).
 #include "platform/linereader.h"
 
 #include "benchfiles.h"

@@ -3,24 +3,18 @@
 // filled, and choosing a census year in a file of 100,000 until the list of
 // those who could be alive is filled. The list view itself only shows the
 // rows on screen (model/view), so the work measured here is what fills it.
-// Reads the generated files of QM_BENCH_DIR (default /work/gen).
 
 #include "census/selection.h"
 #include "model/loadgedcom.h"
 
+#include "benchfiles.h"
+
 #include <benchmark/benchmark.h>
 
-#include <cstdlib>
-
 using namespace qm;
+using qmbench::benchfile;
 
 namespace {
-
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromUtf8(dir ? dir : "/work/gen") + QLatin1Char('/') + QString::fromLatin1(name);
-}
 
 // Load, then the label order of everyone: what opening a file costs.
 void BM_openfile_peoplelist(benchmark::State& state)

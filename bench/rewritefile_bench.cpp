@@ -1,9 +1,10 @@
 // Every saved census entry rewrites the whole family file, so the rewrite
 // must stay one quick pass even for files of 100,000 individuals and more.
-// Reads the generated files of QM_BENCH_DIR (default /work/gen).
 
 #include "model/loadgedcom.h"
 #include "writer/rewritefile.h"
+
+#include "benchfiles.h"
 
 #include <benchmark/benchmark.h>
 
@@ -14,14 +15,9 @@
 #include <cstdlib>
 
 using namespace qm;
+using qmbench::benchfile;
 
 namespace {
-
-QString benchfile(const char* name)
-{
-    const char* dir = std::getenv("QM_BENCH_DIR");
-    return QString::fromUtf8(dir ? dir : "/work/gen") + QLatin1Char('/') + QString::fromLatin1(name);
-}
 
 rewriterequest entryfor(const gedcomindex& ix)
 {

@@ -5,11 +5,13 @@
 #
 # usage: bench/stats_bench.sh CLI [FAMILY.ged] [RUNS]
 #   CLI        path of quillmark-cli
-#   FAMILY.ged a generated family file (default /work/gen/fam1000000.ged); it
+#   FAMILY.ged a generated family file (default fam1000000.ged in QM_BENCH_DIR,
+#              else in build/gen of the repository); it
 #              is only read
 set -euo pipefail
 cli=$(realpath "$1")
-src=${2:-/work/gen/fam1000000.ged}
+here=$(cd "$(dirname "$0")/.." && pwd)
+src=${2:-${QM_BENCH_DIR:-$here/build/gen}/fam1000000.ged}
 runs=${3:-5}
 work=$(mktemp -d "${TMPDIR:-/tmp}/stats_bench.XXXXXX")
 trap 'rm -rf "$work"' EXIT
