@@ -632,9 +632,10 @@ void mainfrm::datechanged()
     entrypanel* p = panel();
     if (sourcemode_ == 0)
         refreshtitle();
+    // The age of the individual chosen last, who may be hidden below the rows.
     if (rows_.selectioncount > 0 && recognisedate(p->fixeddatetxt->text())) {
-        pullrows();
-        showpersoninfo(rows_.rows[static_cast<size_t>(rows_.rowsused() - 1)].chosen.toInt());
+        storerows();
+        showpersoninfo(rows_.selection[static_cast<size_t>(rows_.selectioncount - 1)].personindex);
     }
 }
 

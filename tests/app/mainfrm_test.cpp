@@ -296,6 +296,15 @@ private slots:
         QCOMPARE(ages(), QStringLiteral("1,2,3,4,5,6,7,8,9,10"));
         QVERIFY(!up->isVisible());
         QVERIFY(down->isVisible());
+        // A census date typed shows the age of the individual chosen last, hidden below.
+        const auto info = [&](int i) {
+            const int32_t k = w.household().selection[static_cast<size_t>(i)].personindex;
+            return personinfo(w.index()->people[static_cast<size_t>(k)], QStringLiteral("2 APR 1911"));
+        };
+        QVERIFY(info(10) != info(9));
+        w.panel()->fixeddatetxt->selectAll();
+        QTest::keyClicks(w.panel()->fixeddatetxt, QStringLiteral("2 APR 1911"));
+        QCOMPARE(w.findChild<QLabel*>(QStringLiteral("infolab"))->text(), info(10));
         // Deleting with a row hidden below pulls it into the last row.
         rowcontrols<QToolButton>(w, "deleterowbut")[0]->click();
         QCOMPARE(ages(), QStringLiteral("2,3,4,5,6,7,8,9,10,11"));
