@@ -181,7 +181,7 @@ QWidget* optionsfrm::generaltab()
                        "If this is not ticked then the previous default file will continue to be opened "
                        "automatically when Quillmark runs."));
 
-    QGroupBox* idframe = frame(QStringLiteral("Indiividual Record ID"), "idonlyfra");
+    QGroupBox* idframe = frame(QStringLiteral("Individual Record ID"), "idonlyfra");
     IDonlychk = check(idframe, "IDonlychk",
                       QStringLiteral("Only show Name and Record ID in All Individuals and Immediate Family lists"));
 

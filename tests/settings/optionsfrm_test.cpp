@@ -114,6 +114,8 @@ private slots:
         auto s = begin(nullptr, [](scriptedprompts&) {}, [&](optionsfrm& f, session& run) {
             QVERIFY(!f.Cancelbut->isEnabled());
             QCOMPARE(f.SSTab1->currentIndex(), 0);
+            QCOMPARE(f.findChild<QGroupBox*>(QStringLiteral("idonlyfra"))->title(),
+                     QStringLiteral("Individual Record ID"));
             QTest::keyClick(&f, Qt::Key_Escape);
             QVERIFY(f.isVisible());
             f.close();
