@@ -3,9 +3,10 @@
 # they are missing. Runs apt-get through sudo when not run as root.
 set -euo pipefail
 
+# clang and its runtime build the fuzz targets; acl gives the tests setfacl.
 packages=(g++ cmake ninja-build pkg-config qt6-base-dev qt6-base-dev-tools qt6-qpa-plugins
-          qt6-image-formats-plugins libgtest-dev libgmock-dev libbenchmark-dev python3 ccache)
-[ "${QM_WITH_FUZZ:-0}" = 1 ] && packages+=(clang libclang-rt-dev)
+          qt6-image-formats-plugins libgtest-dev libgmock-dev libbenchmark-dev python3 ccache
+          clang libclang-rt-dev acl)
 
 missing=()
 for p in "${packages[@]}"; do
