@@ -4,19 +4,13 @@
 // way; the census date check accepts exactly what the recogniser does.
 #include "model/dates.h"
 
+#include "fuzzcheck.h"
+
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 
-namespace {
-
-void check(bool ok)
-{
-    if (!ok)
-        std::abort();
-}
-
-} // namespace
+using qmfuzz::check;
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {

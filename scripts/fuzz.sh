@@ -3,13 +3,13 @@
 # runs each for a fixed number of inputs over its seeds, so that they cannot
 # rot: the loader over the bundled examples and ../shared/corpus (when
 # present), the date recogniser and the entry file over fuzz/seeds/<target>.
-# QM_FUZZ_RUNS inputs each (default 3000); the same seed every time, so a
-# failure can be run again. New inputs go to a temporary folder, never into
+# A fixed number of inputs each (the loader 3000, its inputs being whole
+# family files; the dates and entry targets 30000), or QM_FUZZ_RUNS for all;
+# the same seed every time, so a failure can be run again. New inputs go to a temporary folder, never into
 # the seed folders.
 set -euo pipefail
 here="$(cd "$(dirname "$0")/.." && pwd)"
 build="${QM_BUILD_DIR:-$here/build}-fuzz"
-runs="${QM_FUZZ_RUNS:-3000}"
 launcher=()
 command -v ccache >/dev/null && launcher=(-DCMAKE_CXX_COMPILER_LAUNCHER=ccache)
 targets=(loadgedcom dates entry)
@@ -28,12 +28,13 @@ for t in "${targets[@]}"; do
   else
     seeds+=("$here/fuzz/seeds/$t")
   fi
+  runs=${QM_FUZZ_RUNS:-$([ "$t" = loadgedcom ] && echo 3000 || echo 30000)}
   mkdir -p "$work/$t"
   start=$SECONDS
   if ! "$build/fuzz/${t}_fuzz" -runs="$runs" -seed=1 -max_len=200000 -timeout=30 -rss_limit_mb=2048 \
-       "$work/$t" "${seeds[@]}" >"$work/$t.log" 2>&1; then
+       -artifact_prefix="$build/${t}_fuzz-" "$work/$t" "${seeds[@]}" >"$work/$t.log" 2>&1; then
     tail -n 60 "$work/$t.log"
-    echo "fuzz: ${t}_fuzz failed (log above; inputs that crash are saved as crash-* in $(pwd))"
+    echo "fuzz: ${t}_fuzz failed (log above; the input that failed is saved as $build/${t}_fuzz-crash-*)"
     exit 1
   fi
   echo "fuzz: ${t}_fuzz ran $runs inputs after its seeds in $((SECONDS - start)) s: $(grep -o 'cov: [0-9]*' "$work/$t.log" | tail -n 1)"
