@@ -46,6 +46,26 @@ bool readtext(const QJsonObject& o, const char* key, QString& out, QString& erro
     return true;
 }
 
+// The objects of the list `key` (absent: none). False when it is no list of
+// objects, with the message naming the first that is not one.
+bool objectlist(const QJsonObject& o, const char* key, const char* item, std::vector<QJsonObject>& out, QString& error)
+{
+    out.clear();
+    const QJsonValue list = o.value(QLatin1String(key));
+    if (!list.isUndefined() && !list.isNull() && !list.isArray()) {
+        error = QStringLiteral("\"%1\" must be a list").arg(QLatin1String(key));
+        return false;
+    }
+    for (const QJsonValue& v : list.toArray()) {
+        if (!v.isObject()) {
+            error = QStringLiteral("%1 %2 of the list must be an object").arg(QLatin1String(item)).arg(out.size() + 1);
+            return false;
+        }
+        out.push_back(v.toObject());
+    }
+    return true;
+}
+
 // A whole number given as a JSON number or as a text of digits.
 bool readnumber(const QJsonValue& v, const QString& what, int64_t& out, QString& error)
 {
@@ -156,19 +176,12 @@ bool readentry(const QByteArray& bytes, entryfile& e, QString& error)
     e.sourcetext = crlf(e.sourcetext);
     e.notetext = crlf(e.notetext);
 
-    const QJsonValue list = o.value(QLatin1String("individuals"));
-    if (!list.isUndefined() && !list.isNull() && !list.isArray()) {
-        error = QStringLiteral("\"individuals\" must be a list");
+    std::vector<QJsonObject> list;
+    if (!objectlist(o, "individuals", "individual", list, error))
         return false;
-    }
     int k = 0;
-    for (const QJsonValue& v : list.toArray()) {
+    for (const QJsonObject& p : list) {
         ++k;
-        if (!v.isObject()) {
-            error = QStringLiteral("individual %1 of the list must be an object").arg(k);
-            return false;
-        }
-        const QJsonObject p = v.toObject();
         entryperson person;
         if (!readnumber(p.value(QLatin1String("id")), QStringLiteral("\"id\" of individual %1").arg(k), n, error))
             return false;
@@ -191,19 +204,11 @@ bool readentry(const QByteArray& bytes, entryfile& e, QString& error)
         e.people.push_back(std::move(person));
     }
 
-    const QJsonValue images = o.value(QLatin1String("images"));
-    if (!images.isUndefined() && !images.isNull() && !images.isArray()) {
-        error = QStringLiteral("\"images\" must be a list");
+    if (!objectlist(o, "images", "image", list, error))
         return false;
-    }
     k = 0;
-    for (const QJsonValue& v : images.toArray()) {
+    for (const QJsonObject& i : list) {
         ++k;
-        if (!v.isObject()) {
-            error = QStringLiteral("image %1 of the list must be an object").arg(k);
-            return false;
-        }
-        const QJsonObject i = v.toObject();
         entryimage image;
         if (i.contains(QLatin1String("object"))) {
             if (i.contains(QLatin1String("file")) || i.contains(QLatin1String("title"))) {
