@@ -18,6 +18,7 @@
 #include <QJsonObject>
 
 #include <algorithm>
+#include <cmath>
 
 namespace qm {
 
@@ -71,9 +72,10 @@ bool readnumber(const QJsonValue& v, const QString& what, int64_t& out, QString&
 {
     bool ok = false;
     if (v.isDouble()) {
+        // In range before it is converted: a double beyond int64_t has no conversion.
         const double d = v.toDouble();
-        ok = d == static_cast<double>(static_cast<int64_t>(d)) && d >= 0 && d < 2147483648.0;
-        out = static_cast<int64_t>(d);
+        ok = d >= 0 && d < 2147483648.0 && d == std::floor(d);
+        out = ok ? static_cast<int64_t>(d) : 0;
     } else if (v.isString()) {
         out = v.toString().trimmed().toInt(&ok);
         ok = ok && out >= 0;
