@@ -19,7 +19,7 @@ trap 'rm -rf "$work"' EXIT
 
 # Backups and the census log go to the program folder under XDG_DATA_HOME; an
 # empty settings file gives every setting its default ("Full Entry" on, "Keep
-# Log" on, UK censuses).
+# Log" on, UK censuses; backups in the program folder's Backups).
 export XDG_DATA_HOME="$work/data"
 : > "$work/settings.ini"
 cat > "$work/entry.json" <<'JSON'
@@ -44,7 +44,7 @@ for ((i = 0; i < runs; i++)); do
     t1=$(now)
     clitimes+=("$(echo "$t1 - $t0" | bc)")
     cputimes+=("$(awk '{print $1 + $2}' "$work/cpu")")
-    rm -f "$work/data/Quillmark/QM Backup"*
+    rm -f "$work/data/Quillmark/Backups/QM Backup"*
 done
 
 median() { printf '%s\n' "$@" | sort -n | awk '{a[NR]=$1} END {print a[int((NR+1)/2)]}'; }

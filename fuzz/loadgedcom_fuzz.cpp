@@ -2,19 +2,13 @@
 // input: it returns an index whose texts and tables hang together.
 #include "model/loadgedcom.h"
 
+#include "fuzzcheck.h"
+
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
 
-namespace {
-
-void check(bool ok)
-{
-    if (!ok)
-        std::abort();
-}
-
-} // namespace
+using qmfuzz::check;
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {

@@ -3,12 +3,12 @@
 # they are missing. Runs apt-get through sudo when not run as root.
 set -euo pipefail
 
-# fonts-noto-core makes the system's fixed font proportional: the window tests
-# check that columns of text line up all the same.
+# fonts-noto-core: the desktop fonts with which a system's "monospace" may turn
+# out proportional; the window tests check that columns of text line up all the
+# same. clang and its runtime build the fuzz targets; acl gives the tests setfacl.
 packages=(g++ cmake ninja-build pkg-config qt6-base-dev qt6-base-dev-tools qt6-qpa-plugins
           qt6-image-formats-plugins libgtest-dev libgmock-dev libbenchmark-dev python3 ccache
-          fonts-noto-core)
-[ "${QM_WITH_FUZZ:-0}" = 1 ] && packages+=(clang libclang-rt-dev)
+          fonts-noto-core clang libclang-rt-dev acl)
 
 missing=()
 for p in "${packages[@]}"; do

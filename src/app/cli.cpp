@@ -5,6 +5,7 @@
 #include "platform/settingsstore.h"
 
 #include <QDir>
+#include <QFile>
 #include <QFileInfo>
 #include <QJsonDocument>
 
@@ -42,6 +43,16 @@ QString cliusage(const QString& name)
                                "as the settings store; without it the user's own settings are used.\n"
                                "Exit status: 0 when done, 2 when the command could not be carried out.\n");
     return text;
+}
+
+QStringList takeoperands(QStringList& args)
+{
+    const qsizetype end = args.indexOf(QStringLiteral("--"));
+    if (end < 0)
+        return {};
+    const QStringList operands = args.mid(end + 1);
+    args.resize(end);
+    return operands;
 }
 
 bool takesettingsoption(QStringList& args, QString* path, QString* error)
@@ -82,8 +93,26 @@ std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error
             return nullptr;
         }
         s->store = settingsstore::onfile(inipath);
+        // An empty file asks for the defaults; anything else must hold settings
+        // (values, or only census flag definitions).
+        const bool empty = QFile(inipath).size() == 0;
+        if (!s->store->readable()
+            || (!empty && !s->store->holdsany(settingnames()) && !s->store->groupexists(QStringLiteral("Flags")))) {
+            *error = QStringLiteral("the settings file %1 cannot be read as Quillmark settings: it holds none of "
+                                    "their values (see docs/cli.md)")
+                         .arg(QDir::toNativeSeparators(inipath));
+            return nullptr;
+        }
+        if (empty)
+            cliwarn(QStringLiteral("the settings file %1 is empty: every setting takes its default")
+                        .arg(QDir::toNativeSeparators(inipath)));
     }
-    s->values = loadsettings(*s->store).values;
+    const settingsload loaded = loadsettings(*s->store);
+    s->values = loaded.values;
+    if (!inipath.isEmpty() && !loaded.defaulted.isEmpty() && loaded.defaulted.size() < settingnames().size())
+        cliwarn(QStringLiteral("the settings file %1 lacks these values or holds them in a form not accepted, so "
+                               "they take their defaults: %2")
+                    .arg(QDir::toNativeSeparators(inipath), loaded.defaulted.join(QStringLiteral(", "))));
     return s;
 }
 

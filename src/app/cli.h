@@ -50,11 +50,18 @@ void cliwarn(const QString& message);
 // Usage of one command (or of all when name is empty), for --help and mistakes.
 QString cliusage(const QString& name = QString());
 
+// Takes "--" and every argument after it out of args and returns those: they
+// are file names even when they begin with "-". Commands call it first.
+QStringList takeoperands(QStringList& args);
+
 // Takes "--settings S.ini" or "--settings=S.ini" out of args. False (with a
 // message) when the option has no value.
 bool takesettingsoption(QStringList& args, QString* path, QString* error);
 
-// The user's settings store, or the INI file named by --settings (which must exist).
+// The user's settings store, or the INI file named by --settings, which must
+// exist and read as settings (a file holding none of the values is refused).
+// Values the file lacks or holds in a form not accepted take their defaults,
+// after a warning on standard error naming them.
 struct clisettings {
     std::unique_ptr<settingsstore> store;
     settings values;

@@ -66,6 +66,7 @@ bool takevalue(QStringList& args, qsizetype i, const QString& name, QString& val
 int cliattachimages(QStringList args)
 {
     QString inipath, error, sourcetext;
+    const QStringList operands = takeoperands(args);
     if (!takesettingsoption(args, &inipath, &error))
         return clifail(error);
     std::vector<wanted> asked;
@@ -99,6 +100,7 @@ int cliattachimages(QStringList args)
     error = unknownoption(args);
     if (!error.isEmpty())
         return clifail(error);
+    args += operands;
     const QString usage = QStringLiteral("attach-images needs a family file, a source and at least one image: "
                                          "quillmark-cli attach-images FILE --source S_NUMBER --image PATH[=TITLE]... "
                                          "--object O_NUMBER...");
@@ -152,6 +154,8 @@ int cliattachimages(QStringList args)
             return clifail(QStringLiteral("%1: no such image file").arg(QDir::toNativeSeparators(w.path)));
         const QString file = QDir::toNativeSeparators(image.absoluteFilePath());
         error = refusenewimage(file, chosen, ix);
+        if (error.isEmpty())
+            error = imagefileproblem(file);
         if (!error.isEmpty())
             return clifail(QStringLiteral("%1: %2").arg(file, error));
         // Without a title of its own an image takes the source's, numbered

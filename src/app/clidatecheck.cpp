@@ -32,6 +32,7 @@ QString usage()
 int clidatecheck(QStringList args)
 {
     QString inipath, error;
+    const QStringList operands = takeoperands(args);
     if (!takesettingsoption(args, &inipath, &error))
         return clifail(error);
     bool apply = false;
@@ -46,6 +47,7 @@ int clidatecheck(QStringList args)
                           QStringLiteral("--country needs one of UK, USA, Ireland, Canada"), takecountry, &apply, &files);
     if (!error.isEmpty())
         return clifail(error);
+    files += operands;
     const auto f = openfamily(files, usage(), inipath);
     if (!f)
         return clifailure;

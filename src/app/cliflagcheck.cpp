@@ -28,6 +28,7 @@ QString usage()
 int cliflagcheck(QStringList args)
 {
     QString inipath, error;
+    const QStringList operands = takeoperands(args);
     if (!takesettingsoption(args, &inipath, &error))
         return clifail(error);
     bool apply = false;
@@ -48,6 +49,7 @@ int cliflagcheck(QStringList args)
                           takeanswer, &apply, &files);
     if (!error.isEmpty())
         return clifail(error);
+    files += operands;
     const auto f = openfamily(files, usage(), inipath);
     if (!f)
         return clifailure;

@@ -13,6 +13,7 @@
 #include <QFileInfo>
 
 #include <algorithm>
+#include <limits>
 
 namespace qm {
 
@@ -35,7 +36,56 @@ bool samepath(const QString& a, const QString& b)
     return x.compare(y, Qt::CaseInsensitive) == 0;
 }
 
+// A record's file as written, and resolved against the family file's folder
+// when it is relative (as Family Historian writes files kept beside it).
+bool samerecordfile(const QString& recordfile, const QString& path, const gedcomindex& index)
+{
+    if (samepath(recordfile, path))
+        return true;
+    QString f = recordfile.trimmed();
+    f.replace(u'\\', u'/');
+    if (f.isEmpty() || index.gedcomfile.isEmpty() || !QFileInfo(f).isRelative())
+        return false;
+    return samepath(QDir::cleanPath(QFileInfo(index.gedcomfile).absoluteDir().absoluteFilePath(f)), path);
+}
+
+// The first bytes of the picture formats whose files name themselves by
+// their extension.
+bool startsasimage(const QString& type, const QByteArray& head)
+{
+    if (type == QLatin1String("bmp"))
+        return head.startsWith("BM");
+    if (type == QLatin1String("gif"))
+        return head.startsWith("GIF87a") || head.startsWith("GIF89a");
+    if (type == QLatin1String("jpeg"))
+        return head.startsWith("\xFF\xD8\xFF");
+    if (type == QLatin1String("png"))
+        return head.startsWith("\x89PNG\r\n\x1A\n");
+    if (type == QLatin1String("tif") || type == QLatin1String("tiff"))
+        return head.startsWith(QByteArrayLiteral("II*\0")) || head.startsWith(QByteArrayLiteral("MM\0*"));
+    return true; // no signature to look for: the preview says it cannot show it
+}
+
 } // namespace
+
+QString previewfailedtext()
+{
+    return QStringLiteral("A problem occurred when trying to preview this file.");
+}
+
+QString imagefileproblem(const QString& path)
+{
+    QFile f(path);
+    if (!QFileInfo(path).isFile() || !f.open(QIODevice::ReadOnly))
+        return previewfailedtext() + QStringLiteral(" (") + (f.error() ? f.errorString() : QStringLiteral("not a file"))
+            + QStringLiteral(")");
+    const QByteArray head = f.read(16);
+    if (head.isEmpty())
+        return previewfailedtext() + QStringLiteral(" (the file is empty)");
+    if (!startsasimage(imagefiletype(path), head))
+        return previewfailedtext() + QStringLiteral(" (the file does not hold a picture of its type)");
+    return QString();
+}
 
 QString cleanfilename(QString text)
 {
@@ -89,7 +139,7 @@ QString refusenewimage(const QString& path, const std::vector<imagechoice>& chos
         if (samepath(c.file, path))
             return QStringLiteral("This image has already been selected to be part of this census entry");
     for (const objectrec& o : index.objects)
-        if (samepath(qs(o.file), path))
+        if (samerecordfile(qs(o.file), path, index))
             return QStringLiteral("This image is already loaded into Family Historian and has the title ")
                 + qs(o.title) + QStringLiteral(". Go back to the previous screen and select the 'Link current image' button");
     return QString();
@@ -114,7 +164,8 @@ const imagechoice& addnewimage(std::vector<imagechoice>& chosen, int32_t& nextob
                                const QString& title, int titlenumber, const QString& date)
 {
     imagechoice c;
-    c.objectid = ++nextobjectid;
+    // No number left: 0, which the save refuses.
+    c.objectid = nextobjectid < std::numeric_limits<int32_t>::max() ? ++nextobjectid : 0;
     c.date = date;
     c.file = file;
     c.form = imagefiletype(file);
@@ -133,6 +184,7 @@ const imagechoice& addexistingimage(std::vector<imagechoice>& chosen, const obje
     c.title = qs(object.title);
     c.file = qs(object.file);
     c.date = qs(object.date);
+    c.xref = qs(object.xref);
     c.isnew = false;
     c.titlenumber = 0;
     chosen.push_back(std::move(c));

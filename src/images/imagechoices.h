@@ -40,8 +40,18 @@ QString fulltitle(const imagechoice& image);
 
 // Why a file cannot be taken as a new image ("" when it can): an application
 // program, a GEDCOM file, an image already chosen, or the file of one of the
-// family file's multimedia records (compared ignoring letter case).
+// family file's multimedia records (compared ignoring letter case; a record's
+// relative path is taken from the family file's folder).
 QString refusenewimage(const QString& path, const std::vector<imagechoice>& chosen, const gedcomindex& index);
+
+// The preview's message for a file it cannot read as a picture.
+QString previewfailedtext();
+
+// For the command-line tool, which shows no preview: why a file cannot be
+// read as a picture ("" when it may be). It must be a readable, non-empty
+// regular file, and a file named as a BMP, GIF, JPEG, PNG or TIFF picture must
+// begin as one. Formats the preview cannot show are accepted, as there.
+QString imagefileproblem(const QString& path);
 
 // Why an existing multimedia record cannot be chosen ("" when it can): it has
 // been chosen already.

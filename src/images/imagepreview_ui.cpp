@@ -1,5 +1,6 @@
 #include "images/imagepreview_ui.h"
 
+#include "images/imagechoices.h"
 #include "images/imageviewfrm.h"
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
@@ -107,7 +108,7 @@ QString imagepreview::notfoundtext()
 
 QString imagepreview::failedtext()
 {
-    return QStringLiteral("A problem occurred when trying to preview this file.");
+    return previewfailedtext();
 }
 
 void imagepreview::clear()

@@ -5,6 +5,7 @@
 
 #include <QDir>
 #include <QFile>
+#include <QFileInfo>
 
 namespace qm {
 
@@ -23,19 +24,48 @@ QString native(const QString& path)
 
 QString appendlines(const settings& s, const QStringList& lines)
 {
-    QFile f(s.logpath);
-    if (s.logpath.isEmpty() || !f.open(QIODevice::WriteOnly | QIODevice::Append))
+    const auto unable = [&s](const QString& why) {
         return QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
-            + native(s.logpath);
+            + native(s.logpath) + QStringLiteral(" (") + why + QStringLiteral(")");
+    };
+    if (s.logpath.isEmpty())
+        return unable(QStringLiteral("no log file is set"));
+    QFile f(s.logpath);
+    if (!f.open(QIODevice::WriteOnly | QIODevice::Append))
+        return unable(f.errorString());
     QByteArray bytes;
     for (const QString& line : lines) {
         bytes += line.toUtf8();
         bytes += "\r\n";
     }
-    // Write errors after the open are not reported: the change itself stands.
-    f.write(bytes);
+    // A full disk or a file that takes no writing shows only here, or at the
+    // flush or the close.
+    if (f.write(bytes) != bytes.size() || !f.flush())
+        return unable(f.errorString());
     f.close();
+    if (f.error() != QFileDevice::NoError)
+        return unable(f.errorString());
     return QString();
+}
+
+// Two paths name the same file (the log's file need not exist yet).
+QString canonicalpath(const QString& path)
+{
+    const QFileInfo info(path);
+    const QString file = info.canonicalFilePath();
+    if (!file.isEmpty())
+        return file;
+    const QString folder = QFileInfo(info.absolutePath()).canonicalFilePath();
+    return folder.isEmpty() ? info.absoluteFilePath() : QDir(folder).filePath(info.fileName());
+}
+
+bool samepath(const QString& a, const QString& b)
+{
+#ifdef Q_OS_WIN
+    return a.compare(b, Qt::CaseInsensitive) == 0;
+#else
+    return a == b;
+#endif
 }
 
 void modeonelines(const settings& s, const logentry& e, QStringList& out)
@@ -128,6 +158,26 @@ QString writerenameentry(const settings& s, const QString& from, const QString& 
 QString writelogentry(const settings& s, const logentry& e)
 {
     return appendlines(s, loglines(s, e));
+}
+
+QString refuselogpath(const QString& logpath, const QString& familyfile, const QString& backupfolder)
+{
+    const QString log = canonicalpath(logpath.trimmed());
+    const QString shown = native(logpath.trimmed());
+    if (!familyfile.isEmpty() && samepath(log, canonicalpath(familyfile)))
+        return QStringLiteral("The census log file %1 is the family file itself: Quillmark never writes its log into "
+                              "a family file. Please choose another log file in the options.")
+            .arg(shown);
+    if (logpath.trimmed().endsWith(QLatin1String(".ged"), Qt::CaseInsensitive))
+        return QStringLiteral("The census log file %1 is a GEDCOM file: Quillmark never writes its log into a family "
+                              "file. Please choose another log file (a .txt file) in the options.")
+            .arg(shown);
+    if (!backupfolder.trimmed().isEmpty()
+        && samepath(QFileInfo(log).absolutePath(), canonicalpath(backupfolder.trimmed())))
+        return QStringLiteral("The census log file %1 is in the backup folder, which holds only backups of family "
+                              "files. Please choose a log file in another folder in the options.")
+            .arg(shown);
+    return QString();
 }
 
 QString checklogfile(const QString& logpath)

@@ -38,8 +38,14 @@ struct logentry {
 QStringList loglines(const settings& s, const logentry& e);
 
 // Appends the entry to the log at s.logpath. Returns the message for the user
-// when the log could not be opened (the entry is then lost), or "".
+// when the log could not be written, with the system's reason (the entry is
+// then lost), or "".
 QString writelogentry(const settings& s, const logentry& e);
+
+// Why the census log must not be kept at logpath: it is the family file
+// (familyfile may be ""), a GEDCOM file, or a file in the backup folder, where
+// appending would change a family file or a backup. "" when it may.
+QString refuselogpath(const QString& logpath, const QString& familyfile, const QString& backupfolder);
 
 // Opens the log for appending, creating it when absent. Returns the message
 // for the user when it cannot be written to, or "".

@@ -68,6 +68,7 @@ struct familycensusrec {
 // One source record ("0 @S...").
 struct sourcerec {
     int32_t id = 0;
+    std::string_view xref;  // the identifier as the file writes it, without its "@"s ("S12", "S0012")
     std::string_view title; // first TITL or ABBR, trimmed
     indexlist<int32_t> objectids;   // "1 OBJE @O" links, in file order
     bool iscensus = false;          // that first TITL/ABBR line mentions "census"
@@ -78,6 +79,7 @@ struct sourcerec {
 // One multimedia record ("0 @O...").
 struct objectrec {
     int32_t id = 0;
+    std::string_view xref; // the identifier as the file writes it ("O7", "O0007")
     std::string_view form, title, file, date;
     int32_t maxasid = 0; // highest "2 _ASID" value, 0 if none
 };

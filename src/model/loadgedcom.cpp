@@ -340,11 +340,17 @@ void loader::startrecord(std::string_view s)
         return;
     }
     const int32_t id = numberat(s, 4);
+    // Records are cited by the identifier as written: other programs write "@S0012@".
+    const auto xref = [&] {
+        const size_t end = s.find('@', 3);
+        return text(s.substr(2 + 1, end == std::string_view::npos ? 0 : end - 3));
+    };
     switch (s[3]) {
     case 'S': {
         kind_ = kind::source;
         sourcerec& r = ix_.sources.emplace_back();
         r.id = id;
+        r.xref = xref();
         highestsource = std::max(highestsource, id);
         titlepending = true;
         break;
@@ -362,6 +368,7 @@ void loader::startrecord(std::string_view s)
         kind_ = kind::object;
         objectrec& o = ix_.objects.emplace_back();
         o.id = id;
+        o.xref = xref();
         ix_.maxobjectid = std::max(ix_.maxobjectid, id);
         break;
     }

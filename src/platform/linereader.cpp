@@ -126,6 +126,7 @@ void linereader::detect()
                                                                                        : QStringConverter::Utf16BE);
         begin_ = end_ = 0;
         const QString text = decoder_->decode(QByteArrayView(raw_.data(), static_cast<qsizetype>(raw_.size())));
+        decoded(raw_.data(), raw_.size());
         const QByteArray utf8 = text.toUtf8();
         buf_.resize(std::max(chunk, static_cast<size_t>(utf8.size())));
         std::memcpy(buf_.data(), utf8.constData(), static_cast<size_t>(utf8.size()));
@@ -153,6 +154,21 @@ void linereader::detect()
             break;
         pos = eol + 1;
     }
+}
+
+void linereader::decoded(const char* raw, size_t n)
+{
+    rawdecoded_ += static_cast<int64_t>(n);
+    if (n)
+        lastraw_ = raw[n - 1];
+}
+
+std::string_view linereader::strayend() const
+{
+    // A UTF-16 file of an odd number of bytes: the decoder holds the last one.
+    if (decoder_ && eof_ && rawdecoded_ % 2 == 1)
+        return std::string_view(&lastraw_, 1);
+    return {};
 }
 
 // Makes room and reads more bytes after the unread ones. False when nothing more came.
@@ -185,6 +201,7 @@ bool linereader::fill()
         return false;
     }
     const QString text = decoder_->decode(QByteArrayView(raw_.data(), static_cast<qsizetype>(n)));
+    decoded(raw_.data(), n);
     const QByteArray utf8 = text.toUtf8();
     if (buf_.size() - end_ < static_cast<size_t>(utf8.size()))
         buf_.resize(end_ + static_cast<size_t>(utf8.size()));

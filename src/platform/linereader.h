@@ -89,6 +89,10 @@ public:
     std::string_view lineend() const { return lineend_; }
     bool linetruncated() const { return truncated_; }
 
+    // After the last line of a UTF-16 file of an odd number of bytes: the
+    // stray last byte, which is no character and so in no line; else "".
+    std::string_view strayend() const;
+
     textencoding encoding() const { return encoding_; }
     bool hasbom() const { return bom_; }
     bool failed() const { return failed_; }
@@ -152,6 +156,9 @@ private:
     bool bom_ = false;
     std::unique_ptr<QStringDecoder> decoder_;
     std::vector<char> raw_;
+    int64_t rawdecoded_ = 0; // UTF-16 bytes handed to the decoder
+    char lastraw_ = 0;       // the last of them
+    void decoded(const char* raw, size_t n);
 
     size_t maxline_ = 0;
     std::string cut_;

@@ -67,6 +67,19 @@ bool settingsstore::removegroup(const QString& group)
     return true;
 }
 
+bool settingsstore::readable() const
+{
+    return settings_->status() == QSettings::NoError;
+}
+
+bool settingsstore::holdsany(const QStringList& names) const
+{
+    for (const QString& n : names)
+        if (settings_->contains(n))
+            return true;
+    return false;
+}
+
 void settingsstore::sync()
 {
     settings_->sync();

@@ -40,6 +40,11 @@ public:
     // Deletes a group with its values; false when there was none.
     bool removegroup(const QString& group);
 
+    // False when the store's file is not in the store's format (or cannot be read).
+    bool readable() const;
+    // Whether any of the named values is in the root group.
+    bool holdsany(const QStringList& names) const;
+
     // Writes pending changes to permanent storage.
     void sync();
     QString location() const;

@@ -1,6 +1,7 @@
 #include "settings/options.h"
 
 #include "census/censustable.h"
+#include "log/censuslog.h"
 #include "platform/prompts.h"
 #include "writer/backups.h"
 #include "writer/maketitle.h"
@@ -179,6 +180,12 @@ optionssave saveoptions(prompts& p, settingsstore& store, const settings& curren
         // A path typed by hand could name the family file itself.
         if (logpath.endsWith(QLatin1String("ged"), Qt::CaseInsensitive)) {
             p.tell(gedcomlogmessage());
+            return stop(optionsstop::logfile);
+        }
+        // Nor into the backup folder, before the log file is made there.
+        if (const QString refused = refuselogpath(logpath, QString(), trimbackupfolder(form.backupfolder));
+            !refused.isEmpty()) {
+            p.tell(refused, icon::exclamation);
             return stop(optionsstop::logfile);
         }
         if (!makelogfile(logpath)) {

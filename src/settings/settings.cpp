@@ -209,13 +209,28 @@ QString defaultlogpath()
     return QDir::toNativeSeparators(QDir::fromNativeSeparators(programfolder()) + QStringLiteral("/censuslog.txt"));
 }
 
+QString defaultbackupfolder()
+{
+    const QString folder = QDir::fromNativeSeparators(programfolder()) + QStringLiteral("/Backups");
+    QDir().mkpath(folder);
+    return QDir::toNativeSeparators(folder);
+}
+
 settings defaultsettings()
 {
     settings d;
     d.logpath = defaultlogpath();
-    d.backupfolder = programfolder();
+    d.backupfolder = defaultbackupfolder();
     d.title = defaulttitletemplate();
     return d;
+}
+
+QStringList settingnames()
+{
+    QStringList names;
+    for (const entry& e : entries)
+        names << QLatin1String(e.name);
+    return names;
 }
 
 settingsload loadsettings(settingsstore& store)
@@ -235,8 +250,10 @@ settingsload loadsettings(settingsstore& store)
         take(s, e, *text);
     }
     for (const entry& e : entries)
-        if (e.group >= failedgroup)
+        if (e.group >= failedgroup) {
             takedefault(s, e, d);
+            out.defaulted << QLatin1String(e.name);
+        }
     // "Request Image" defaults to the recording method in use.
     if (failedgroup <= 4)
         s.requestimage = s.fullentry;

@@ -5,6 +5,7 @@
 // reads the same.
 
 #include <QString>
+#include <QStringList>
 
 #include <cstdint>
 
@@ -75,6 +76,9 @@ QString defaulttitletemplate(); // "Census {YEAR} {PLACE} {REF} ({OTHER})"
 // The folder Quillmark writes its own files to (census log, backups).
 QString programfolder();
 QString defaultlogpath();
+// "Backups" in the program folder (made when missing): apart from the census
+// log, which is never kept in the backup folder.
+QString defaultbackupfolder();
 
 // The settings a value takes when it is absent or not accepted, with the log
 // path and backup folder in the program folder.
@@ -85,7 +89,14 @@ struct settingsload {
     // The log and backup-folder checks are due before the first file is opened
     // (all groups were read, so the paths are the user's own).
     bool pathchecksdue = false;
+    // The values that took their defaults because the store lacks them or
+    // holds them in a form not accepted (with all the later values of the
+    // group order, which follow them), by their names.
+    QStringList defaulted;
 };
+
+// The names of the values read from the store, in the order they are read.
+QStringList settingnames();
 
 settingsload loadsettings(settingsstore& store);
 void savesettings(settingsstore& store, const settings& s);

@@ -4,6 +4,7 @@
 #include "platform/clock.h"
 #include "platform/filetime.h"
 #include "platform/prompts.h"
+#include "platform/replacefile.h"
 #include "settings/settings.h"
 
 #include <QDateTime>
@@ -29,18 +30,10 @@ QString infolder(const QString& folder, const QString& name)
     return QDir(folder).filePath(name);
 }
 
-// Gives the copy its original's last-modified time, also when the copy is
-// read-only like its original.
-bool keeptime(const QString& path, int64_t modified)
+// The name after `name` among backups made in one second: "1", " 2", " 3" ...
+QString nextsuffix(int n)
 {
-    if (setmodified(path, modified))
-        return true;
-    const QFileDevice::Permissions perms = QFile::permissions(path);
-    if (!QFile::setPermissions(path, perms | QFileDevice::WriteOwner))
-        return false;
-    const bool ok = setmodified(path, modified);
-    QFile::setPermissions(path, perms);
-    return ok;
+    return n == 0 ? QString() : n == 1 ? QStringLiteral("1") : QStringLiteral(" ") + QString::number(n);
 }
 
 } // namespace
@@ -55,14 +48,10 @@ QString backupfailedmessage()
 QString freebackuppath(const QString& folder, const QString& stamp)
 {
     const QString base = QStringLiteral("QM Backup ") + stamp;
-    QString suffix;
-    int n = 0;
-    for (;;) {
-        const QString path = infolder(folder, base + suffix + QStringLiteral(".ged"));
+    for (int n = 0;; ++n) {
+        const QString path = infolder(folder, base + nextsuffix(n) + QStringLiteral(".ged"));
         if (!QFileInfo::exists(path))
             return path;
-        ++n;
-        suffix = n == 1 ? QStringLiteral("1") : QStringLiteral(" ") + QString::number(n);
     }
 }
 
@@ -75,21 +64,47 @@ bool isbackupname(const QString& name)
 backupresult makebackup(const QString& familyfile, const QString& folder)
 {
     backupresult r;
-    const filestamp original = stampof(familyfile);
+    const auto failed = [&r](const QString& why) {
+        r.error = backupfailedmessage() + QStringLiteral(" (") + why + QStringLiteral(")");
+        return r;
+    };
     // No folder must never mean the current folder, wherever that is.
-    if (folder.trimmed().isEmpty() || !original.exists) {
-        r.error = backupfailedmessage();
-        return r;
+    if (folder.trimmed().isEmpty())
+        return failed(QStringLiteral("no backup folder is set"));
+    QFile from(familyfile);
+    if (!from.open(QIODevice::ReadOnly))
+        return failed(from.errorString());
+    const filestamp original = stampof(familyfile);
+
+    // The name is taken by creating the file, never by looking first: another
+    // Quillmark saving in the same second into the same folder takes the next
+    // suffix instead of this process writing over (or removing) its backup.
+    const QString base = QStringLiteral("QM Backup ") + backupstamp(now());
+    QFile to;
+    for (int n = 0;; ++n) {
+        to.setFileName(infolder(folder, base + nextsuffix(n) + QStringLiteral(".ged")));
+        if (to.open(QIODevice::WriteOnly | QIODevice::NewOnly))
+            break;
+        const QFileInfo taken(to.fileName());
+        if (n >= 9999 || !(taken.exists() || taken.isSymLink()))
+            return failed(to.errorString());
     }
-    const QString path = freebackuppath(folder, backupstamp(now()));
     // A copy, not a move: the family file stays whole until its replacement is
-    // complete on disk.
-    if (!QFile::copy(familyfile, path) || !keeptime(path, original.modified)) {
-        QFile::remove(path);
-        r.error = backupfailedmessage();
-        return r;
+    // complete on disk. The copy keeps the file's last-modified time and permissions.
+    QString why;
+    const bool copied = copydata(from, to, &why)
+        && to.setFileTime(QDateTime::fromMSecsSinceEpoch(original.modified), QFileDevice::FileModificationTime)
+        && to.setPermissions(from.permissions());
+    if (!copied && why.isEmpty())
+        why = to.errorString();
+    to.close();
+    if (!copied || to.error() != QFileDevice::NoError) {
+        if (why.isEmpty())
+            why = to.errorString();
+        to.remove(); // made by this process a moment ago
+        return failed(why);
     }
-    r.path = path;
+    r.path = to.fileName();
     return r;
 }
 
@@ -117,7 +132,9 @@ bool checkbackupfolder(prompts& p, const QString& folder)
 bool checkpaths(prompts& p, const settings& s)
 {
     if (s.keeplog) {
-        const QString error = checklogfile(s.logpath);
+        QString error = refuselogpath(s.logpath, QString(), s.backupfolder);
+        if (error.isEmpty())
+            error = checklogfile(s.logpath);
         if (!error.isEmpty()) {
             p.tell(error, icon::critical);
             return true;

@@ -37,6 +37,7 @@ struct imagechoice {
     QString date;         // the "_DATE" value
     bool isnew = false;   // a new multimedia record is written for it
     int titlenumber = 0;
+    QString xref;         // an existing record: its identifier as the file writes it ("O0007"); "" = "O" + objectid
 };
 
 // One distinct census event date found by the census date check.

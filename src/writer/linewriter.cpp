@@ -2,8 +2,6 @@
 
 #include "platform/writeback.h"
 
-#include <QSaveFile>
-
 #include <algorithm>
 
 namespace qm {
@@ -65,16 +63,14 @@ linewriter::~linewriter()
 
 bool linewriter::open(const QString& path)
 {
-    file_ = std::make_unique<QSaveFile>(path);
-    // Never write the family file in place: a failure must leave it whole.
-    file_->setDirectWriteFallback(false);
+    file_ = std::make_unique<replacefile>(path);
     if (faultstate().failopen) {
         file_.reset();
         fail(QStringLiteral("Permission denied"));
         return false;
     }
-    if (!file_->open(QIODevice::WriteOnly)) {
-        const QString e = file_->errorString();
+    if (!file_->open()) {
+        const QString e = file_->errorstring();
         file_.reset();
         fail(e);
         return false;
@@ -144,14 +140,13 @@ void linewriter::flush()
         full = true;
     }
     if (want > 0) {
-        const qint64 n = file_->write(buf_.data(), want);
-        if (n != want) {
-            fail(file_->errorString());
+        if (!file_->write(buf_.data(), want)) {
+            fail(file_->errorstring());
             return;
         }
-        written_ += n;
-        if (written_ - sentback_ >= writebackstep && file_->flush()) {
-            startwriteback(static_cast<int>(file_->handle()), sentback_, written_ - sentback_);
+        written_ += want;
+        if (written_ - sentback_ >= writebackstep) {
+            startwriteback(file_->handle(), sentback_, written_ - sentback_);
             sentback_ = written_;
         }
     }
@@ -184,6 +179,14 @@ void linewriter::writelines(std::string_view lines, int64_t count)
         flush();
 }
 
+void linewriter::writeraw(std::string_view bytes)
+{
+    if (failed_ || bytes.empty())
+        return;
+    start();
+    (memory_ ? mem_ : buf_).append(bytes);
+}
+
 bool linewriter::writetext(std::string_view utf8)
 {
     if (failed_)
@@ -214,7 +217,7 @@ bool linewriter::writefiletext(std::string_view utf8)
     return true;
 }
 
-bool linewriter::commit()
+bool linewriter::commit(const replacefile::lastcheck& check)
 {
     if (memory_) {
         start();
@@ -235,19 +238,25 @@ bool linewriter::commit()
         fail(QStringLiteral("The file is in use by another program"));
         return false;
     }
-    if (!file_->commit()) {
-        const QString e = file_->errorString();
-        file_.reset();
+    const replacefile::outcome done = file_->commit(check);
+    inplace_ = file_->inplace();
+    damaged_ = file_->damaged();
+    const QString e = file_->errorstring();
+    file_.reset();
+    if (done == replacefile::outcome::withdrawn) {
+        withdrawn_ = true;
+        return false;
+    }
+    if (done == replacefile::outcome::failed) {
         fail(e);
         return false;
     }
-    file_.reset();
     return true;
 }
 
 void linewriter::cancel()
 {
-    // A save file dropped before its commit removes its temporary file.
+    // A replacement dropped before its commit removes its temporary file.
     file_.reset();
 }
 

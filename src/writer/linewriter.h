@@ -8,11 +8,13 @@
 // ASCII only for other 8-bit sets).
 //
 // A file is written safely: the lines go to a temporary file beside it that
-// replaces it in one atomic step on commit(); until then, and whenever
-// anything fails, the file stays as it was. After the first failure nothing
-// more is written and the error is kept for the end.
+// replaces it in one atomic step on commit() (or, for a linked file, is copied
+// into it: replacefile.h); until then, and whenever anything fails, the file
+// stays as it was. After the first failure nothing more is written and the
+// error is kept for the end.
 
 #include "platform/encoding.h"
+#include "platform/replacefile.h"
 
 #include <QString>
 
@@ -20,8 +22,6 @@
 #include <memory>
 #include <string>
 #include <string_view>
-
-class QSaveFile;
 
 namespace qm {
 
@@ -62,13 +62,23 @@ public:
     // gives the file's own bytes.
     bool writefiletext(std::string_view utf8);
 
-    // Writes what is buffered and replaces the file. False on failure, with
-    // the file untouched.
-    bool commit();
+    // Bytes kept from the input as they were, outside any line (the stray
+    // last byte of a UTF-16 file of an odd length).
+    void writeraw(std::string_view bytes);
+
+    // Writes what is buffered and replaces the file, after `check` (asked when
+    // the new content is on the disk) agreed. False on failure, with the file
+    // untouched unless damaged(); false and withdrawn() when check refused.
+    bool commit(const replacefile::lastcheck& check = {});
     // Drops everything written; the file stays as it was.
     void cancel();
 
     bool failed() const { return failed_; }
+    bool withdrawn() const { return withdrawn_; }
+    // After commit: the content was copied into the existing file in place.
+    bool inplace() const { return inplace_; }
+    // A copy in place failed part way: only the backup holds the file now.
+    bool damaged() const { return damaged_; }
     QString errorstring() const { return error_; }
     int64_t lines() const { return lines_; }
     textencoding encoding() const { return enc_; }
@@ -81,7 +91,7 @@ private:
 
     textencoding enc_;
     bool bom_;
-    std::unique_ptr<QSaveFile> file_;
+    std::unique_ptr<replacefile> file_;
     bool memory_ = false;
     std::string mem_;
     std::string buf_;
@@ -91,6 +101,7 @@ private:
     int64_t lines_ = 0;
     bool failed_ = false;
     bool started_ = false;
+    bool withdrawn_ = false, inplace_ = false, damaged_ = false;
     QString error_;
 };
 

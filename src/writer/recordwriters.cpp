@@ -10,7 +10,15 @@ std::string oneline(const QString& text)
     t.replace(QStringLiteral("\r\n"), QStringLiteral(" "));
     t.replace(QLatin1Char('\r'), QLatin1Char(' '));
     t.replace(QLatin1Char('\n'), QLatin1Char(' '));
-    return u8(t);
+    return typedvalue(u8(t));
+}
+
+std::string typedvalue(std::string value)
+{
+    // "@N1@" as a value is a pointer to note 1; "@@N1@" is the text "@N1@".
+    if (!value.empty() && value.front() == '@')
+        value.insert(value.begin(), '@');
+    return value;
 }
 
 void writemultiline(linewriter& out, std::string_view text, std::string_view first, std::string_view cont)
@@ -24,11 +32,19 @@ void writemultiline(linewriter& out, std::string_view text, std::string_view fir
             if (c == '\r' && i + 1 < text.size() && text[i + 1] == '\n')
                 ++i;
         } else {
+            // Every line's value is typed text: a leading "@" is written "@@" (typedvalue).
+            if (c == '@' && (buf == first || buf == cont))
+                buf.push_back('@');
             buf.push_back(c);
         }
     }
     if (buf != cont)
         out.writetext(buf);
+}
+
+std::string objectpointer(const imagechoice& image)
+{
+    return "@" + (image.xref.isEmpty() ? "O" + std::to_string(image.objectid) : u8(image.xref)) + "@";
 }
 
 void writechangestamp(linewriter& out)
@@ -64,7 +80,7 @@ int32_t writeobjectrecords(linewriter& out, const std::vector<imagechoice>& imag
 void writeimagelinks(linewriter& out, const std::vector<imagechoice>& images, const settings& s)
 {
     for (const imagechoice& img : images) {
-        out.writetext("1 OBJE @O" + std::to_string(img.objectid) + "@");
+        out.writefiletext("1 OBJE " + objectpointer(img));
         if (img.isnew && s.asid)
             out.writetext("2 _ASID 1");
     }
@@ -81,7 +97,7 @@ void writesourcerecord(linewriter& out, const censusentry& entry, const settings
         // The source type is written as stored, only kept to one line.
         QString type = s.sourcetype;
         type.replace(QLatin1Char('\r'), QLatin1Char(' ')).replace(QLatin1Char('\n'), QLatin1Char(' '));
-        out.writetext("1 _TYPE " + u8(type));
+        out.writetext("1 _TYPE " + typedvalue(u8(type)));
     }
     const bool hasnote = !entry.notetext.trimmed().isEmpty();
     writemultiline(out, u8(entry.sourcetext), s.sourcenote && !hasnote ? "1 NOTE " : "1 TEXT ", "2 CONT ");

@@ -18,13 +18,23 @@
 namespace qm {
 
 // A typed one-line value as written after a tag: trimmed, UTF-8, any line
-// break inside it turned into a space, so that it stays one line of the file.
+// break inside it turned into a space, so that it stays one line of the file,
+// and escaped by typedvalue().
 std::string oneline(const QString& text);
+
+// A typed value as GEDCOM writes it: a leading "@" doubled, so that no typed
+// text can be read as a pointer to a record ("@N1@").
+std::string typedvalue(std::string value);
 
 // A multi-line text: the first line after `first`, every later one after
 // `cont`. CR LF, LF and CR each end a line; a text ending in a line break
-// gives no empty last line. Text is written as typed, without trimming.
+// gives no empty last line. Text is written as typed, without trimming, but
+// a line that begins with "@" gets it doubled (typedvalue).
 void writemultiline(linewriter& out, std::string_view text, std::string_view first, std::string_view cont);
+
+// The pointer to a chosen image's multimedia record: "@O7@", or the
+// identifier of an existing record as its file writes it ("@O0007@").
+std::string objectpointer(const imagechoice& image);
 
 // "1 CHAN", "2 DATE " + today, "3 TIME " + now.
 void writechangestamp(linewriter& out);

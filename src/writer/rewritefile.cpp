@@ -155,6 +155,17 @@ void gatherflags(std::vector<std::string>& record)
     record = std::move(out);
 }
 
+// The identifier of the source numbered `digits` as its record writes it
+// ("S0012"), "S" + digits when the index does not know it.
+std::string sourcexref(const gedcomindex& ix, const std::string& digits)
+{
+    const int64_t n = refnumber(digits, 0);
+    for (const sourcerec& r : ix.sources)
+        if (r.id == n && !r.xref.empty())
+            return std::string(r.xref);
+    return "S" + digits;
+}
+
 enum class citekind { birth, census, occupation };
 
 // One run of the rewrite.
@@ -219,6 +230,7 @@ private:
     bool flagtail_ = false;         // the flags of the current record change: its tail is still to be read ahead
 
     // Mode 1.
+    std::string sourcexref_; // the cited source's identifier as the file writes it
     std::string sid_, place_, address_, reference_, entrydate_, sourcetext_, notetext_;
     bool hassourcetext_ = false, hasnotetext_ = false;
     int entryperson_ = -1;
@@ -368,9 +380,11 @@ rewriteresult rewriterun::run()
         seen_.assign(e_.selection.size(), false);
         if (s_.fullentry && numbervalue(e_.sourceid) > 1)
             sourceanchor_ = "0 @S" + std::to_string(numbervalue(e_.sourceid) - 1) + "@ SOUR";
+        sourcexref_ = s_.fullentry ? "S" + sid_ : sourcexref(ix_, sid_);
     } else if (mode_ == rewritemode::attachimages) {
         sid_ = oneline(e_.sourceid);
-        sourceanchor_ = "0 @S" + sid_ + "@ SOUR";
+        sourcexref_ = sourcexref(ix_, sid_);
+        sourceanchor_ = "0 @" + sourcexref_ + "@ SOUR";
     } else if (mode_ == rewritemode::censusdates) {
         for (size_t i = 0; i < ix_.people.size(); ++i)
             peoplebyid_.emplace(ix_.people[i].id, static_cast<int32_t>(i));
@@ -401,6 +415,8 @@ rewriteresult rewriterun::run()
         }
         iteration();
     }
+    // A byte that is no character is still the file's: it stays at its end.
+    out_.writeraw(in_.strayend());
     if (in_.failed())
         res_.error = in_.errorstring();
     res_.lines = out_.lines();
@@ -630,7 +646,7 @@ void rewriterun::writecensusblock(const selectionrec& who)
 
 void rewriterun::writecitation(citekind kind)
 {
-    out_.writetext("2 SOUR @S" + sid_ + "@");
+    out_.writefiletext("2 SOUR @" + sourcexref_ + "@");
     if (!reference_.empty() && (!s_.fullentry || s_.opt1whereinsource))
         out_.writetext("3 PAGE " + reference_);
     if (!s_.fullentry || s_.opt1entrydate) {
@@ -653,7 +669,7 @@ void rewriterun::writecitation(citekind kind)
     }
     if (kind == citekind::census && !s_.fullentry) {
         for (const imagechoice& img : e_.chosenimages)
-            out_.writetext((s_.image2event ? "2 OBJE @O" : "3 OBJE @O") + std::to_string(img.objectid) + "@");
+            out_.writefiletext((s_.image2event ? "2 OBJE " : "3 OBJE ") + objectpointer(img));
     }
     if (kind == citekind::census && s_.sourceinnote && (hassourcetext_ || hasnotetext_)) {
         std::string text = sourcetext_;
@@ -825,15 +841,22 @@ rewriteresult runrewrite(linereader& in, linewriter& out, const gedcomindex& ix,
     return r;
 }
 
-void commit(linewriter& out, rewritemode mode, rewriteresult& r)
+void commit(linewriter& out, rewritemode mode, rewriteresult& r, const replacefile::lastcheck& check = {})
 {
     if (!r.ok)
         return;
-    if (!out.commit()) {
-        r.ok = false;
-        r.error = out.errorstring();
-        r.message = rewritefailuremessage(mode, r.error);
+    const bool done = out.commit(check);
+    r.inplace = out.inplace();
+    if (done)
+        return;
+    r.ok = false;
+    if (out.withdrawn()) {
+        r.withdrawn = true;
+        return;
     }
+    r.damaged = out.damaged();
+    r.error = out.errorstring();
+    r.message = rewritefailuremessage(mode, r.error);
 }
 
 } // namespace
@@ -844,7 +867,8 @@ int32_t newnotenumber(int32_t maxnoteid)
 }
 
 rewriteresult rewritefile(const QString& inputpath, const QString& outputpath, const gedcomindex& index,
-                          const settings& s, const rewriterequest& request)
+                          const settings& s, const rewriterequest& request,
+                          const replacefile::lastcheck& beforereplace)
 {
     rewriteresult r;
     {
@@ -868,7 +892,7 @@ rewriteresult rewritefile(const QString& inputpath, const QString& outputpath, c
         // The input is closed before the output replaces the family file,
         // which may be the input itself.
         in.reset();
-        commit(out, request.mode, r);
+        commit(out, request.mode, r, beforereplace);
     }
     return r;
 }

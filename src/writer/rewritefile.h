@@ -30,6 +30,7 @@
 
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
+#include "platform/replacefile.h"
 #include "settings/settings.h"
 #include "writer/censusentry.h"
 
@@ -68,6 +69,13 @@ struct rewriteresult {
     // encoding cannot hold, an input that cannot be opened ...). The family
     // file is untouched; `message` says why.
     bool refused = false;
+    // The last check before the replace said no: nothing was written.
+    bool withdrawn = false;
+    // The new content was copied into the existing file (linked, or owned by
+    // someone the new file could not be given to); damaged: that copy failed
+    // part way, so only the backup holds the file now.
+    bool inplace = false;
+    bool damaged = false;
     QString error;   // what failed, as the system describes it
     QString message; // the whole message for the user when !ok
 
@@ -86,8 +94,11 @@ struct rewriteresult {
 // Runs the rewrite from inputpath to outputpath (they may be the same path).
 // The file's encoding and byte-order mark are those found when the input is
 // read; the index supplies the people, flags, maxnoteid and maxobjectid.
+// `beforereplace` is asked once the new content is on the disk, just before
+// the family file is touched; when it says no, the run is withdrawn.
 rewriteresult rewritefile(const QString& inputpath, const QString& outputpath, const gedcomindex& index,
-                          const settings& s, const rewriterequest& request);
+                          const settings& s, const rewriterequest& request,
+                          const replacefile::lastcheck& beforereplace = {});
 
 // The same run over bytes held in memory (tests, fuzzing); output gets the
 // bytes that would have been written.

@@ -3,8 +3,12 @@
 #include "log/censuslog.h"
 #include "model/filechanged.h"
 #include "model/gedcomindex.h"
+#include "platform/familylock.h"
+#include "platform/replacefile.h"
 #include "settings/settings.h"
+#include "writer/rewritechecks.h"
 
+#include <QDir>
 #include <QFile>
 
 namespace qm {
@@ -15,6 +19,18 @@ bool& inputfault()
 {
     static bool on = false;
     return on;
+}
+
+std::function<void(savestep)>& savehook()
+{
+    static std::function<void(savestep)> hook;
+    return hook;
+}
+
+void reached(savestep step)
+{
+    if (savehook())
+        savehook()(step);
 }
 
 bool anyimages(const rewriterequest& rq)
@@ -59,6 +75,11 @@ void setinputfaultfortests(bool on)
     inputfault() = on;
 }
 
+void setsavehookfortests(std::function<void(savestep)> hook)
+{
+    savehook() = std::move(hook);
+}
+
 saveoutcome savechange(const gedcomindex& index, const settings& s, const rewriterequest& request,
                        const backupresult* made)
 {
@@ -69,18 +90,32 @@ saveoutcome savechange(const gedcomindex& index, const settings& s, const rewrit
         if (made && made->ok())
             QFile::remove(made->path);
     };
+    const auto changed = [&] {
+        out.status = savestatus::changed;
+        out.message = changedonsavemessage(family, anyimages(request));
+        return out;
+    };
 
     out.message = checkencodable(request, s, index.encoding);
+    if (out.message.isEmpty())
+        out.message = checkidentifiers(index, s, request);
+    if (out.message.isEmpty() && s.keeplog) {
+        out.message = refuselogpath(s.logpath, family, s.backupfolder);
+        if (!out.message.isEmpty())
+            out.message += QStringLiteral(" Nothing has been changed.");
+    }
+    familylock lock(family);
+    if (out.message.isEmpty())
+        out.message = lock.acquire();
     if (!out.message.isEmpty()) {
         dropmade();
         out.status = savestatus::refused;
         return out;
     }
+    reached(savestep::locked);
     if (filechanged(index)) {
         dropmade();
-        out.status = savestatus::changed;
-        out.message = changedonsavemessage(family, anyimages(request));
-        return out;
+        return changed();
     }
 
     backupresult backup;
@@ -96,21 +131,49 @@ saveoutcome savechange(const gedcomindex& index, const settings& s, const rewrit
         out.message = backup.error;
         return out;
     }
+    reached(savestep::backedup);
     // A change that slipped in while the copy was made would be lost with the
     // rewrite: look once more now that the backup holds what is rewritten.
     if (filechanged(index)) {
         QFile::remove(backup.path);
-        out.status = savestatus::changed;
-        out.message = changedonsavemessage(family, anyimages(request));
-        return out;
+        return changed();
     }
     out.backuppath = backup.path;
 
+    // The last look, when the new content is on the disk: the rewrite read the
+    // backup, so a change made meanwhile would be lost by the replace. A file
+    // that is written in place needs its backup on the disk first.
+    QString backupunsynced;
+    const auto beforereplace = [&](bool inplace) {
+        reached(savestep::written);
+        if (filechanged(index))
+            return false;
+        if (inplace)
+            backupunsynced = syncexisting(backup.path);
+        return backupunsynced.isEmpty();
+    };
     const QString input = inputfault() ? backup.path + QStringLiteral(".unreadable/") : backup.path;
-    out.rewrite = rewritefile(input, family, index, s, request);
+    out.rewrite = rewritefile(input, family, index, s, request, beforereplace);
+    if (out.rewrite.withdrawn) {
+        QFile::remove(backup.path);
+        out.backuppath.clear();
+        if (backupunsynced.isEmpty())
+            return changed();
+        out.status = savestatus::backupfailed;
+        out.message = backupfailedmessage() + QStringLiteral(" (") + backupunsynced + QStringLiteral(")");
+        return out;
+    }
     if (!out.rewrite.ok) {
         out.status = out.rewrite.refused ? savestatus::refused : savestatus::rewritefailed;
         out.message = out.rewrite.message;
+        // A copy in place that failed part way is undone from the backup.
+        if (out.rewrite.damaged) {
+            const QString notrestored = copyintofile(backup.path, family);
+            if (!notrestored.isEmpty())
+                out.message += QStringLiteral(" The family file could not be put back as it was (") + notrestored
+                    + QStringLiteral("): the backup ") + QDir::toNativeSeparators(backup.path)
+                    + QStringLiteral(" holds it.");
+        }
         return out;
     }
 

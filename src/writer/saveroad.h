@@ -1,15 +1,24 @@
 #pragma once
 // The road every change to the family file takes, whichever feature asks for
-// it: refuse text the file cannot hold, refuse to write over a change made by
-// another program, make the backup, rewrite the file (safely: it is replaced in
-// one step or not at all), add the census log entry, note the new file stamp.
+// it: refuse text the file cannot hold and a census log that would land on a
+// family file or a backup, take the family file's lock (one save at a time
+// across Quillmark processes), refuse to write over a change made by another
+// program, make the backup, rewrite the file (safely: it is replaced in one
+// step or not at all), add the census log entry, note the new file stamp.
 // The caller shows the outcome's messages and reloads the file afterwards.
+//
+// Another program's change is looked for before the backup, after it, and
+// once more when the new content is on the disk, just before the family file
+// is replaced: only a change made in the moment between that last look and the
+// replace itself can still be lost (docs/saving.md).
 
 #include "platform/filetime.h"
 #include "writer/backups.h"
 #include "writer/rewritefile.h"
 
 #include <QString>
+
+#include <functional>
 
 namespace qm {
 
@@ -18,7 +27,8 @@ struct settings;
 
 enum class savestatus {
     saved,
-    refused,       // nothing written: text the file cannot hold, or the rewrite found the entry out of date
+    refused,       // nothing written: text the file cannot hold, a bad log path, another Quillmark saving,
+                   // or the rewrite found the entry out of date
     changed,       // the file was changed by another program: reload it; nothing written
     backupfailed,  // the backup could not be made; nothing written
     rewritefailed, // the family file is as it was; the program ends after the message
@@ -54,5 +64,14 @@ saveoutcome saveentry(const gedcomindex& index, const settings& s, const censuse
 // Tests: makes the rewrite meet an input it cannot open (as with a backup
 // taken away or made unreadable after it was written).
 void setinputfaultfortests(bool on);
+
+// Tests: a hook called between the steps of a save, where a test plays the
+// other program or the other Quillmark.
+enum class savestep {
+    locked,   // the lock is held, nothing looked at yet
+    backedup, // the backup is made
+    written,  // the new content is on the disk; the family file is not touched yet
+};
+void setsavehookfortests(std::function<void(savestep)> hook);
 
 } // namespace qm

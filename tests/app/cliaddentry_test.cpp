@@ -8,6 +8,7 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QJsonObject>
+#include <QLockFile>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
@@ -40,7 +41,7 @@ protected:
         ini = dir.filePath(QStringLiteral("settings.ini"));
         // A complete store: an absent value would send its group and all later
         // ones back to their defaults.
-        qm::savesettings(*qm::settingsstore::onfile(ini), qmtest::clitestsettings(dir.path()));
+        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
     }
 
     void setting(const QString& name, const QString& value)
@@ -182,4 +183,56 @@ TEST_F(CliAddEntry, ExampleEntryWorksOnSample)
     EXPECT_EQ(r.json().value(QStringLiteral("individuals")).toInt(), 4);
     EXPECT_NE(readfile(sample).find("2 DATE 3 APR 1881\r\n2 PLAC Hebden Bridge, Yorkshire, England\r\n2 ADDR 27 Hangingroyd Lane\r\n2 AGE 1m\r\n"),
               std::string::npos);
+}
+
+// Another Quillmark process saving the same family file holds its lock.
+TEST_F(CliAddEntry, WaitsForNoOtherQuillmarkSavingTheFile)
+{
+    QLockFile other(file + QStringLiteral(".quillmark-lock"));
+    ASSERT_TRUE(other.tryLock(0));
+    const std::string entry = R"({"year": 1851, "place": "Leeds", )" + household + "}";
+    const run r = addentry(entry);
+    EXPECT_EQ(r.status, 2);
+    EXPECT_EQ(r.err.rfind("quillmark-cli: Another Quillmark (process ", 0), 0u) << r.err;
+    EXPECT_NE(r.err.find("delete the file " + QDir::toNativeSeparators(file).toStdString() + ".quillmark-lock"),
+              std::string::npos)
+        << r.err;
+    EXPECT_EQ(readfile(file), family);
+    EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty()) << "the backup made ahead is removed";
+    other.unlock();
+    EXPECT_EQ(addentry(entry).status, 0);
+}
+
+// A settings file is read as settings or refused; values it lacks are named.
+TEST_F(CliAddEntry, SettingsFileThatIsNotOneIsRefusedAndDefaultsAreNamed)
+{
+    const std::string entry = R"({"year": 1851, "place": "Leeds", )" + household + "}";
+    writefile(ini, family); // a GEDCOM file given by mistake
+    run r = addentry(entry);
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.find("cannot be read as Quillmark settings"), std::string::npos) << r.err;
+    EXPECT_EQ(readfile(file), family);
+
+    writefile(ini, "[General]\nFull%20Entry=1\nSource%20in%20Note=0\nKeep%20Log=0\nLog%20Path=x.txt\n"
+                   "Backup%20Folder=" + QDir::toNativeSeparators(dir.filePath(QStringLiteral("backups"))).toStdString()
+                   + "\n");
+    r = addentry(entry);
+    EXPECT_EQ(r.status, 0) << r.err;
+    EXPECT_NE(r.err.find("quillmark-cli: warning: the settings file"), std::string::npos) << r.err;
+    EXPECT_NE(r.err.find("take their defaults: Country, Birthdate, Certainty"), std::string::npos) << r.err;
+    EXPECT_NE(r.err.find("No Source Text Warning\n"), std::string::npos) << r.err;
+}
+
+TEST_F(CliAddEntry, DoubleDashEndsTheOptions)
+{
+    const QString odd = dir.filePath(QStringLiteral("-family.ged"));
+    writefile(odd, family);
+    const QString entry = dir.filePath(QStringLiteral("entry.json"));
+    writefile(entry, R"({"year": 1851, "place": "Leeds", )" + household + "}");
+    const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), QStringLiteral("--entry"), entry,
+                                            QStringLiteral("--settings"), ini, QStringLiteral("--"),
+                                            QStringLiteral("-family.ged")},
+                                           dir.path(), dir.path());
+    EXPECT_EQ(r.status, 0) << r.err.toStdString();
+    EXPECT_NE(readfile(odd), family);
 }

@@ -6,6 +6,7 @@
 
 #include <QDir>
 #include <QFile>
+#include <QFileInfo>
 #include <QJsonArray>
 #include <QJsonObject>
 #include <QTemporaryDir>
@@ -45,10 +46,13 @@ protected:
         page2 = image("page2.jpg");
     }
 
+    // A file that begins as a picture of its type (all the tool looks at).
     QString image(const char* name)
     {
         const QString path = dir.filePath(QString::fromLatin1(name));
-        writefile(path, "not really a picture");
+        QDir().mkpath(QFileInfo(path).path());
+        const bool png = path.endsWith(QLatin1String(".png"));
+        writefile(path, std::string(png ? "\x89PNG\r\n\x1A\n" : "\xFF\xD8\xFF\xE0") + "not really a picture");
         return path;
     }
 
@@ -132,4 +136,12 @@ TEST_F(CliAttachImages, RefusalsWriteNothing)
     expectrefused({src, QStringLiteral("1")}, "attach-images needs");
     expectrefused({src, QStringLiteral("X1"), img, page1}, "--source needs");
     expectrefused({src, QStringLiteral("1"), img}, "--image needs a value");
+    // What the Add a new image... dialog refuses: a file no preview can read,
+    // and, given by a relative path, the file of a multimedia record.
+    const QString text = dir.filePath(QStringLiteral("text.jpg"));
+    writefile(text, "just words");
+    expectrefused({src, QStringLiteral("1"), img, text}, "A problem occurred when trying to preview this file.");
+    const QString record = QDir::current().relativeFilePath(image("pages/leeds.jpg"));
+    expectrefused({src, QStringLiteral("1"), img, record},
+                  "This image is already loaded into Family Historian and has the title Leeds 1891 page.");
 }

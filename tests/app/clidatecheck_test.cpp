@@ -26,7 +26,7 @@ protected:
     {
         ASSERT_TRUE(dir.isValid());
         ini = dir.filePath(QStringLiteral("settings.ini"));
-        qm::savesettings(*qm::settingsstore::onfile(ini), qmtest::clitestsettings(dir.path()));
+        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
     }
 
     run datecheck(const QStringList& args) const

@@ -45,6 +45,7 @@ protected:
         ini = dir.filePath(QStringLiteral("settings.ini"));
         auto store = qm::settingsstore::onfile(ini);
         qm::savesettings(*store, qmtest::clitestsettings(dir.path()));
+        qm::saveflagsettings(*store, qmtest::clitestsettings(dir.path()));
         qm::saveflagdefs(*store, qmtest::testflagdefs());
         store->sync();
     }

@@ -29,9 +29,10 @@ protected:
         QFile(file).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
         before = readfile(file);
         ini = dir.filePath(QStringLiteral("settings.ini"));
-        qm::savesettings(*qm::settingsstore::onfile(ini), qmtest::clitestsettings(dir.path()));
-        for (const char* name : {"a.png", "b.jpg"})
-            writefile(scan(name), "not really an image");
+        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
+        // Each begins as a picture of its type, which is all the tool looks at.
+        writefile(scan("a.png"), "\x89PNG\r\n\x1A\nnot really an image");
+        writefile(scan("b.jpg"), "\xFF\xD8\xFF\xE0not really an image");
     }
 
     QString scan(const char* name) const { return dir.filePath(QStringLiteral("scans/") + QString::fromLatin1(name)); }
@@ -97,6 +98,12 @@ TEST_F(CliImages, RefusedImagesWriteNothing)
     expectrefused(R"([{"file": )" + quoted(scan("gone.png")) + "}]",
                   QDir::toNativeSeparators(scan("gone.png")).toStdString() + ": no such image file");
     expectrefused(R"([{"object": 1, "file": "x.png"}])", "image 1 of the list must have either \"object\" or \"file\"");
+    // A file no preview can read, as the Add a new image... dialog refuses it.
+    writefile(scan("words.png"), "just words");
+    expectrefused(R"([{"file": )" + quoted(scan("words.png")) + "}]",
+                  QDir::toNativeSeparators(scan("words.png")).toStdString()
+                      + ": A problem occurred when trying to preview this file. (the file does not hold a picture of "
+                        "its type)");
     expectrefused(R"({"object": 1})", "\"images\" must be a list");
 }
 

@@ -152,8 +152,8 @@ TEST(SourceDates, AttachingBringsTheIndexUpToDate)
     gedcomindex& ix = *x.index;
     ASSERT_EQ(ix.maxobjectid, 1);
     imagechoice fresh{2, QStringLiteral("png"), QStringLiteral("Census 1881 Leeds"), QStringLiteral("/p/leeds é.png"),
-                      QStringLiteral("3 APR 1881"), true, 1};
-    imagechoice existing{1, QStringLiteral("jpg"), QStringLiteral("York page"), QStringLiteral("york.jpg"), {}, false, 0};
+                      QStringLiteral("3 APR 1881"), true, 1, {}};
+    imagechoice existing{1, QStringLiteral("jpg"), QStringLiteral("York page"), QStringLiteral("york.jpg"), {}, false, 0, {}};
     filestamp stamp{true, 1234, 99};
     recordattached(ix, 0, {fresh, existing}, stamp);
 
@@ -175,8 +175,8 @@ TEST(SourceDates, ImagesAlreadyLinkedAreLeftOut)
 {
     const indexed x = withdates(person(1, event("CENS", "3 APR 1881", 2)));
     const sourcerec& york = x.source(2); // linked to O1
-    imagechoice fresh{1, QStringLiteral("png"), QStringLiteral("New"), QStringLiteral("new.png"), {}, true, 1};
-    imagechoice page{1, QStringLiteral("jpg"), QStringLiteral("York page"), QStringLiteral("york.jpg"), {}, false, 0};
+    imagechoice fresh{1, QStringLiteral("png"), QStringLiteral("New"), QStringLiteral("new.png"), {}, true, 1, {}};
+    imagechoice page{1, QStringLiteral("jpg"), QStringLiteral("York page"), QStringLiteral("york.jpg"), {}, false, 0, {}};
     std::vector<imagechoice> chosen{fresh, page};
     const std::vector<imagechoice> dropped = dropalreadylinked(york, chosen);
     ASSERT_EQ(chosen.size(), 1u);

@@ -125,10 +125,14 @@ TEST_F(CensusLog, AppendsWithCrLfAndReportsUnwritableLog)
     const std::string one = (lines().join(QStringLiteral("\r\n")) + QStringLiteral("\r\n")).toStdString();
     EXPECT_EQ(text, one + one);
 
+    // With the system's reason.
     s.logpath = dir.filePath(QStringLiteral("missing/censuslog.txt"));
+    QFile missing(s.logpath);
+    missing.open(QIODevice::WriteOnly | QIODevice::Append);
     EXPECT_EQ(writelogentry(s, e),
               QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
-                  + QDir::toNativeSeparators(s.logpath));
+                  + QDir::toNativeSeparators(s.logpath) + QStringLiteral(" (") + missing.errorString()
+                  + QStringLiteral(")"));
 }
 
 TEST_F(CensusLog, CheckCreatesMissingLogAndKeepsExisting)

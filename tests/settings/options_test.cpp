@@ -91,7 +91,7 @@ TEST(OptionsDefaults, DefaultSettingsButtonKeepsWhatItDoesNotSet)
     EXPECT_EQ(d.country, "UK");
     EXPECT_EQ(d.certainty, -1);
     EXPECT_EQ(d.logpath, defaultlogpath());
-    EXPECT_EQ(d.backupfolder, programfolder());
+    EXPECT_EQ(d.backupfolder, defaultbackupfolder());
     EXPECT_FALSE(d.alternateseparator);
     EXPECT_EQ(d.alternateseparatorcharacter, "-");
     EXPECT_EQ(d.title, defaulttitletemplate());
@@ -118,7 +118,8 @@ protected:
         store = settingsstore::onfile(dir.filePath("settings.ini"));
         current = defaultsettings();
         current.logpath = dir.filePath("censuslog.txt");
-        current.backupfolder = QDir::toNativeSeparators(dir.path());
+        QDir(dir.path()).mkdir(QStringLiteral("backups"));
+        current.backupfolder = QDir::toNativeSeparators(dir.filePath("backups"));
         form = current;
     }
 
@@ -218,6 +219,9 @@ TEST_F(OptionsSave, EachStopShowsItsMessageAndWritesNothing)
          optionsstop::logfile}, // before the method question
         {[&](settings& f) { f.logpath = dir.filePath("family.GED"); }, {{answer::ok, gedcomlogmessage()}},
          optionsstop::logfile}, // typed by hand: refused as the chooser refuses it
+        {[&](settings& f) { f.logpath = dir.filePath("backups/log.txt"); },
+         {{answer::ok, "is in the backup folder, which holds only backups of family files."}},
+         optionsstop::logfile}, // never among the backups
         {[](settings& f) { f.alternateseparator = true, f.alternateseparatorcharacter.clear(), f.country = "Canada"; },
          {{answer::yes, countrychangequestion()}}, optionsstop::noseparator}, // the window shows its message
         {[&](settings& f) { f.backupfolder = dir.filePath("gone"), f.occage = true; },
@@ -235,6 +239,7 @@ TEST_F(OptionsSave, EachStopShowsItsMessageAndWritesNothing)
         EXPECT_FALSE(written());
     }
     EXPECT_FALSE(QFileInfo::exists(dir.filePath("family.GED")));
+    EXPECT_FALSE(QFileInfo::exists(dir.filePath("backups/log.txt")));
 }
 
 TEST_F(OptionsSave, UntickedSeparatorKeepsAnEmptyCharacter)
@@ -247,11 +252,11 @@ TEST_F(OptionsSave, UntickedSeparatorKeepsAnEmptyCharacter)
 
 TEST_F(OptionsSave, BackupFolderIsStoredWithoutItsTrailingSeparator)
 {
-    form.backupfolder = "  " + QDir::toNativeSeparators(dir.path() + "/") + " ";
+    form.backupfolder = "  " + QDir::toNativeSeparators(dir.filePath("backups") + "/") + " ";
     const optionssave r = save();
     ASSERT_TRUE(r.saved());
-    EXPECT_EQ(r.values.backupfolder, QDir::toNativeSeparators(dir.path()));
-    EXPECT_EQ(store->read("Backup Folder"), QDir::toNativeSeparators(dir.path()));
+    EXPECT_EQ(r.values.backupfolder, QDir::toNativeSeparators(dir.filePath("backups")));
+    EXPECT_EQ(store->read("Backup Folder"), QDir::toNativeSeparators(dir.filePath("backups")));
 }
 
 TEST_F(OptionsSave, EverySettingOfTheFormIsStored)

@@ -95,7 +95,9 @@ private:
     {
         settings s = defaultsettings();
         s.logpath = native(folder + QStringLiteral("/censuslog.txt"));
-        s.backupfolder = native(folder);
+        // The census log is never kept among the backups.
+        QDir().mkpath(folder + QStringLiteral("/start"));
+        s.backupfolder = native(folder + QStringLiteral("/start"));
         return s;
     }
 
@@ -155,9 +157,10 @@ private slots:
                            run.prompts.expect(answer::ok, QStringLiteral("does not exist. "));
                            f.savebut->click();
                            QVERIFY(f.isVisible());
-                           run.prompts.expectfile(files_.path() + QLatin1Char('/'));
+                           const QString start = files_.filepath(QStringLiteral("start"));
+                           run.prompts.expectfile(start + QLatin1Char('/'));
                            f.folderpathbut->click();
-                           QCOMPARE(f.folderpathtxt->text(), native(files_.path() + QLatin1Char('/')));
+                           QCOMPARE(f.folderpathtxt->text(), native(start + QLatin1Char('/')));
                            f.savebut->click();
                            QVERIFY(!f.isVisible());
                        },
@@ -166,7 +169,7 @@ private slots:
         QVERIFY(shown);
         QCOMPARE(s->prompts.unexpected(), 0);
         QVERIFY(!s->w->firststart());
-        QCOMPARE(s->read("Backup Folder"), native(files_.path()));
+        QCOMPARE(s->read("Backup Folder"), native(files_.filepath(QStringLiteral("start"))));
         QCOMPARE(s->read("Occ Age"), QStringLiteral("1"));
     }
 
@@ -309,7 +312,7 @@ private slots:
             s->prompts.expectfile(files_.filepath(QStringLiteral("nothere")));
             s->prompts.expect(answer::ok, QStringLiteral("You are not able to select that location for the backup folder."));
             f.folderpathbut->click();
-            QCOMPARE(f.folderpathtxt->text(), native(files_.path()));
+            QCOMPARE(f.folderpathtxt->text(), native(files_.filepath(QStringLiteral("start"))));
             const QString sub = files_.filepath(QStringLiteral("backups"));
             QVERIFY(QDir().mkpath(sub));
             s->prompts.expectfile(sub + QLatin1Char('/'));

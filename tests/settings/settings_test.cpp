@@ -92,7 +92,7 @@ TEST_F(SettingsTest, NoStoreGivesDefaultsWritesFlagValuesAndAsksForOptions)
     EXPECT_EQ(s.certainty, -1);
     EXPECT_EQ(s.sourcetype, "Census");
     EXPECT_TRUE(s.requestimage);
-    EXPECT_EQ(s.backupfolder, programfolder());
+    EXPECT_EQ(s.backupfolder, defaultbackupfolder());
     EXPECT_TRUE(QDir(programfolder()).exists());
     expectgroupsfrom7default(s);
     EXPECT_EQ(s.count, 0);
@@ -168,7 +168,7 @@ TEST_F(SettingsTest, RejectedValueResetsItsGroupAndAllLaterGroups)
     // "Request Image" follows the method read in group 1
     EXPECT_FALSE(s.requestimage);
     EXPECT_FALSE(s.idonly);
-    EXPECT_EQ(s.backupfolder, programfolder());
+    EXPECT_EQ(s.backupfolder, defaultbackupfolder());
     expectgroupsfrom7default(s);
     EXPECT_TRUE(s.firststart);
     EXPECT_FALSE(l.pathchecksdue);
@@ -183,7 +183,7 @@ TEST_F(SettingsTest, TextValueLengthRules)
         fillexcept("Backup Folder", "C", false);
         const settings s = loadsettings(*store).values;
         EXPECT_TRUE(s.idonly);                     // group 5 read
-        EXPECT_EQ(s.backupfolder, programfolder()); // group 6 reset
+        EXPECT_EQ(s.backupfolder, defaultbackupfolder()); // group 6 reset
         EXPECT_FALSE(s.flaguse);
         EXPECT_TRUE(s.firststart);
     }

@@ -1,5 +1,7 @@
 #include "support/clirun.h"
 
+#include "platform/settingsstore.h"
+
 #include <QDir>
 #include <QJsonDocument>
 #include <QProcess>
@@ -7,9 +9,11 @@
 
 namespace qmtest {
 
-clirun runprogram(const QString& program, const QStringList& args, const QString& home)
+clirun runprogram(const QString& program, const QStringList& args, const QString& home, const QString& workdir)
 {
     QProcess p;
+    if (!workdir.isEmpty())
+        p.setWorkingDirectory(workdir);
     if (!home.isEmpty()) {
         QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
         env.insert(QStringLiteral("HOME"), home);
@@ -45,6 +49,17 @@ qm::settings clitestsettings(const QString& folder)
     s.backupfolder = dir.filePath(QStringLiteral("backups"));
     s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
     return s;
+}
+
+} // namespace qmtest
+
+namespace qmtest {
+
+void writeclisettings(const QString& ini, const qm::settings& s)
+{
+    const auto store = qm::settingsstore::onfile(ini);
+    qm::savesettings(*store, s);
+    qm::saveflagsettings(*store, s);
 }
 
 } // namespace qmtest

@@ -29,17 +29,23 @@ clitextrun astext(const clirun& r);
 
 // Runs `program` with args. With `home`, the user's folders (HOME, data and
 // configuration) lie inside it, so that nothing falls back on the real ones.
-clirun runprogram(const QString& program, const QStringList& args, const QString& home = QString());
+// With `workdir`, the program runs in that folder.
+clirun runprogram(const QString& program, const QStringList& args, const QString& home = QString(),
+                  const QString& workdir = QString());
 
 #ifdef QM_CLI_PATH
-inline clirun runcli(const QStringList& args, const QString& home = QString())
+inline clirun runcli(const QStringList& args, const QString& home = QString(), const QString& workdir = QString())
 {
-    return runprogram(QStringLiteral(QM_CLI_PATH), args, home);
+    return runprogram(QStringLiteral(QM_CLI_PATH), args, home, workdir);
 }
 #endif
 
 // Default settings that keep a test's backups in folder/backups (made here)
 // and its census log in folder/censuslog.txt.
 qm::settings clitestsettings(const QString& folder);
+
+// Writes every value of s that the tool reads into an INI file, so that none
+// of them falls back to its default.
+void writeclisettings(const QString& ini, const qm::settings& s);
 
 } // namespace qmtest

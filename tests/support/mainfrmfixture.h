@@ -14,6 +14,7 @@
 #include <QApplication>
 #include <QComboBox>
 #include <QDialog>
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QLabel>
@@ -47,7 +48,9 @@ struct session {
             qm::settings s = qm::defaultsettings();
             const QString folder = QFileInfo(ini).absolutePath();
             s.logpath = folder + QStringLiteral("/censuslog.txt");
-            s.backupfolder = folder;
+            // The census log is never kept among the backups.
+            s.backupfolder = folder + QStringLiteral("/backups");
+            QDir().mkpath(s.backupfolder);
             qm::savesettings(*store, s);
             qm::saveflagsettings(*store, s);
         }
@@ -100,8 +103,10 @@ public:
             const qm::settings defaults = qm::defaultsettings();
             if (given.logpath == defaults.logpath)
                 given.logpath = filepath(QStringLiteral("censuslog.txt"));
-            if (given.backupfolder == defaults.backupfolder)
-                given.backupfolder = path();
+            if (given.backupfolder == defaults.backupfolder) {
+                given.backupfolder = filepath(QStringLiteral("backups"));
+                QDir().mkpath(given.backupfolder);
+            }
             qm::savesettings(*r->store, given);
             qm::saveflagsettings(*r->store, given);
         }

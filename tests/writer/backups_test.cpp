@@ -13,6 +13,10 @@
 
 #include <gtest/gtest.h>
 
+#include <thread>
+#include <utility>
+#include <vector>
+
 #include <unistd.h>
 
 using namespace qm;
@@ -79,7 +83,7 @@ TEST_F(Backups, FailureGivesMessageAndLeavesNothing)
 {
     const backupresult r = makebackup(family, dir.filePath(QStringLiteral("missing")));
     EXPECT_FALSE(r.ok());
-    EXPECT_EQ(r.error, backupfailedmessage());
+    EXPECT_EQ(r.error, backupfailedmessage() + QStringLiteral(" (No such file or directory)")) << "with the system's reason";
     EXPECT_TRUE(r.error.startsWith(QStringLiteral("There was an error when attempting to back up your family historian file.")));
     EXPECT_FALSE(makebackup(dir.filePath(QStringLiteral("nofile.ged")), folder).ok());
     EXPECT_FALSE(makebackup(family, QStringLiteral(" ")).ok());
@@ -180,4 +184,29 @@ TEST_F(Backups, RemoveOldRenamesOldFormFirst)
     removeoldbackups(prompts, folder);
     EXPECT_EQ(names(), (QStringList{QStringLiteral("Backup  x.ged"), QStringLiteral("QM Backup 2021_03_09_12_00_00.ged")}));
     EXPECT_EQ(prompts.unexpected(), 0);
+}
+
+// Two Quillmarks backing up two family files into one folder in the same
+// second: each takes a name of its own by creating it, none fails, and none
+// removes or overwrites the other's backup.
+TEST_F(Backups, BackupsMadeAtOnceNeverTakeEachOthersName)
+{
+    const QString second = dir.filePath(QStringLiteral("second.ged"));
+    writefile(second, "0 HEAD\r\n1 NOTE the second family\r\n0 TRLR\r\n");
+    constexpr int each = 150;
+    std::vector<backupresult> a, b;
+    std::thread other([&] {
+        for (int i = 0; i < each; ++i)
+            b.push_back(makebackup(second, folder));
+    });
+    for (int i = 0; i < each; ++i)
+        a.push_back(makebackup(family, folder));
+    other.join();
+
+    for (const auto& [made, from] : {std::pair{&a, family}, std::pair{&b, second}})
+        for (const backupresult& r : *made) {
+            ASSERT_TRUE(r.ok()) << r.error.toStdString();
+            EXPECT_EQ(readfile(r.path), readfile(from)) << r.path.toStdString();
+        }
+    EXPECT_EQ(names().size(), 2 * each) << "every backup made is there";
 }

@@ -3,10 +3,12 @@
 
 #include "writer/rewritefile.h"
 
+#include "images/imagechoices.h"
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
 #include "writer/linewriter.h"
 #include "writer/recordwriters.h"
+#include "writer/rewritechecks.h"
 #include "support/censusentries.h"
 
 #include <QLocale>
@@ -301,3 +303,68 @@ TEST_F(RewriteEdges, OccupationDatesChangeOnlyWithAMatchingCensusCitation)
                          "2 SOUR @S1@", "1 CHAN", "2 DATE 04 MAY 2026", "3 TIME 07:08:09", "0 @I2@ INDI", "1 OCCU Carter",
                          "2 DATE 1881", "2 SOUR @S1@", "0 TRLR"}));
 }
+
+// Identifiers other programs write: records are cited as they are named, and
+// an identifier that cannot tell records apart, or a number that is not left,
+// refuses the change before anything is written.
+TEST_F(RewriteEdges, RecordsAreCitedByTheirOwnIdentifiers)
+{
+    const std::string input = "0 HEAD\r\n0 @I1@ INDI\r\n1 NAME Ann /Lee/\r\n0 @S0001@ SOUR\r\n1 TITL Census 1881\r\n"
+                              "0 @O0003@ OBJE\r\n1 FILE p.jpg\r\n0 TRLR\r\n";
+    const auto ix = loadgedcombytes(input, {});
+    settings s;
+    s.fullentry = false;
+    rewriterequest r;
+    r.entry = censusof(QStringLiteral("1"), "Census 1881", "Leeds");
+    r.entry.selection.push_back(chosen(1, 0, "Lee, Ann", "30"));
+    addexistingimage(r.entry.chosenimages, ix->objects.at(0));
+    ASSERT_TRUE(checkidentifiers(*ix, s, r).isEmpty());
+    std::string out;
+    ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
+    EXPECT_NE(out.find("2 SOUR @S0001@\r\n"), std::string::npos) << out;
+    EXPECT_NE(out.find("3 OBJE @O0003@\r\n"), std::string::npos) << out;
+
+    r.mode = rewritemode::attachimages;
+    ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
+    EXPECT_NE(out.find("0 @S0001@ SOUR\r\n1 TITL Census 1881\r\n1 OBJE @O0003@\r\n"), std::string::npos) << out;
+}
+
+struct identifiercase {
+    const char* name;
+    const char* records;  // the family file's records
+    bool fullentry, sharednote;
+    const char* refusal;  // the start of the message
+};
+
+class RewriteIdentifiers : public ::testing::TestWithParam<identifiercase> {};
+
+TEST_P(RewriteIdentifiers, ThatCannotServeAreRefused)
+{
+    const identifiercase& c = GetParam();
+    const auto ix = loadgedcombytes(std::string("0 HEAD\r\n") + c.records + "0 TRLR\r\n", {});
+    settings s;
+    s.fullentry = c.fullentry;
+    s.sharednote = c.sharednote;
+    rewriterequest r;
+    r.entry = censusof(c.fullentry ? QString::number(ix->nextsourceid) : QStringLiteral("1"), "Census", "Leeds");
+    r.entry.selection.push_back(chosen(1, 0, "Lee, Ann", "30"));
+    const QString refusal = checkidentifiers(*ix, s, r);
+    if (*c.refusal == 0)
+        EXPECT_TRUE(refusal.isEmpty()) << refusal.toStdString();
+    else
+        EXPECT_TRUE(refusal.startsWith(QString::fromUtf8(c.refusal))) << refusal.toStdString();
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Files, RewriteIdentifiers,
+    ::testing::Values(
+        identifiercase{"TwoIndividualsOneNumber", "0 @I1@ INDI\r\n0 @I01@ INDI\r\n0 @S1@ SOUR\r\n", true, false,
+                       "The record number 1 of Lee, Ann belongs to two records"},
+        identifiercase{"TwoSourcesOneNumber", "0 @I1@ INDI\r\n0 @S1@ SOUR\r\n0 @S1@ SOUR\r\n", false, false,
+                       "The source number 1 belongs to two records"},
+        identifiercase{"NoSourceNumberLeft", "0 @I1@ INDI\r\n0 @S2147483647@ SOUR\r\n", true, false,
+                       "The family file has no record number left for a new source"},
+        identifiercase{"NoNoteNumberLeft", "0 @I1@ INDI\r\n0 @S1@ SOUR\r\n0 @N2147483647@ NOTE\r\n", false, true,
+                       "The family file has no record number left for a new note"},
+        identifiercase{"AllWell", "0 @I1@ INDI\r\n0 @S1@ SOUR\r\n0 @N7@ NOTE\r\n", false, true, ""}),
+    [](const auto& info) { return std::string(info.param.name); });

@@ -18,6 +18,14 @@
 
 #include <gtest/gtest.h>
 
+#include <cerrno>
+#include <csignal>
+#include <cstring>
+
+#ifdef Q_OS_LINUX
+#include <sys/resource.h>
+#endif
+
 using namespace qm;
 using qmtest::readfile;
 using qmtest::writefile;
@@ -136,6 +144,13 @@ TEST_P(RewriteEncoding, WritesTheFileBackInItsOwnEncoding)
     std::string outlf;
     ASSERT_TRUE(rewritebytes(encoded(lf, c.enc, c.bom), outlf, *ix, settings{}, entry(*ix)).ok);
     EXPECT_TRUE(qmtest::samebytes(out, outlf));
+
+    // A UTF-16 file of an odd length keeps its stray last byte.
+    if (isutf16(c.enc)) {
+        std::string odd;
+        ASSERT_TRUE(rewritebytes(input + '\x5A', odd, *ix, settings{}, entry(*ix)).ok);
+        EXPECT_TRUE(qmtest::samebytes(out + '\x5A', odd));
+    }
 }
 
 INSTANTIATE_TEST_SUITE_P(Encodings, RewriteEncoding,
@@ -173,6 +188,78 @@ TEST(RewriteRefusal, TextTheEncodingCannotHoldIsRefusedBeforeAnythingIsWritten)
     r.entry.place = QStringLiteral("Haworth");
     EXPECT_FALSE(checkencodable(r, settings{}, textencoding::other8bit).isEmpty()); // the occupation Curé
     EXPECT_TRUE(checkencodable(r, settings{}, textencoding::windows1252).isEmpty());
+}
+
+// Control characters never reach the family file; the message names the field.
+struct controlcase {
+    const char* name;
+    void (*put)(censusentry& e);
+    const char* field; // "" when the text is taken
+};
+
+class RewriteControlCharacters : public ::testing::TestWithParam<controlcase> {};
+
+TEST_P(RewriteControlCharacters, AreRefusedNamingTheField)
+{
+    const auto ix = loadgedcombytes(familytext("UTF-8"), {});
+    rewriterequest r = entry(*ix);
+    GetParam().put(r.entry);
+    const QString message = checkencodable(r, settings{}, textencoding::utf8);
+    if (*GetParam().field == 0) {
+        EXPECT_TRUE(message.isEmpty()) << message.toStdString();
+        return;
+    }
+    EXPECT_TRUE(message.startsWith(QStringLiteral("The ") + QString::fromUtf8(GetParam().field)
+                                   + QStringLiteral(" holds a control character (U+")))
+        << message.toStdString();
+    EXPECT_TRUE(message.endsWith(QStringLiteral("Nothing has been changed.")));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Fields, RewriteControlCharacters,
+    ::testing::Values(
+        controlcase{"PlaceEscape", [](censusentry& e) { e.place = QStringLiteral("Leeds\x1b[31m"); }, "place"},
+        controlcase{"OtherNul", [](censusentry& e) { e.other = QStringLiteral("a") + QChar(0) + u'b'; }, "other information"},
+        controlcase{"TitleDelete", [](censusentry& e) { e.title = QStringLiteral("Census\x7f"); }, "title"},
+        controlcase{"SourceTextVerticalTab", [](censusentry& e) { e.sourcetext = QStringLiteral("a\vb"); }, "source text"},
+        controlcase{"NoteFormFeed", [](censusentry& e) { e.notetext = QStringLiteral("a\fb"); }, "note"},
+        controlcase{"OccupationC1", [](censusentry& e) { e.selection[0].occupation = QStringLiteral("Cur\u0085"); },
+                    "occupation of Bronte, Zoe"},
+        controlcase{"PlaceTab", [](censusentry& e) { e.place = QStringLiteral("a\tb"); }, "place"},
+        controlcase{"TabsAndLineBreaksOfTexts",
+                    [](censusentry& e) {
+                        e.sourcetext = QStringLiteral("a\tb\r\nc\nd");
+                        e.notetext = QStringLiteral("x\ty\r\n");
+                    },
+                    ""}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+// A typed text that begins with "@" is written "@@", so that no reader takes
+// it for a pointer to a record.
+TEST(RewriteTypedText, LeadingAtSignIsDoubled)
+{
+    const std::string input = familytext("UTF-8");
+    const auto ix = loadgedcombytes(input, {});
+    rewriterequest r = entry(*ix);
+    r.entry.place = QStringLiteral("@home");
+    r.entry.reference = QStringLiteral("@R1@");
+    r.entry.sourcetext = QStringLiteral("@N1@\r\nx @ y\r\n@S1@");
+    r.entry.notetext = QStringLiteral("@N2@");
+    r.entry.selection[0].occupation = QStringLiteral("@I1@");
+    settings s;
+    s.fullentry = false;
+    s.sourceinnote = true;
+    std::string out;
+    ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
+    for (const char* line : {"2 PLAC @@home\r\n", "3 PAGE @@R1@\r\n", "4 TEXT @@N1@\r\n5 CONT x @ y\r\n5 CONT @@S1@\r\n",
+                             "3 NOTE @@N2@\r\n", "1 OCCU @@I1@\r\n", "2 NOTE @@N1@\r\n"})
+        EXPECT_NE(out.find(line), std::string::npos) << line << "\n" << out;
+
+    s.fullentry = true;
+    r.entry.title = QStringLiteral("@T1@");
+    ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
+    for (const char* line : {"1 TITL @@T1@\r\n", "1 TEXT @@N1@\r\n2 CONT x @ y\r\n2 CONT @@S1@\r\n", "1 NOTE @@N2@\r\n"})
+        EXPECT_NE(out.find(line), std::string::npos) << line << "\n" << out;
 }
 
 TEST(RewriteRefusal, OtherCharacterSetsKeepTheirBytesAndTakeAsciiText)
@@ -236,6 +323,26 @@ TEST_F(RewriteFaults, FilesThatCannotBeOpenedAreReported)
     EXPECT_FALSE(res.ok);
     expectuntouched();
 }
+
+#ifdef Q_OS_LINUX
+// A write the system refuses (here: past the largest file this process may
+// write) is reported in the system's words, never as "Unknown error".
+TEST_F(RewriteFaults, WriteErrorsGiveTheSystemsReason)
+{
+    struct rlimit old;
+    ASSERT_EQ(getrlimit(RLIMIT_FSIZE, &old), 0);
+    const auto oldsignal = std::signal(SIGXFSZ, SIG_IGN);
+    struct rlimit small = old;
+    small.rlim_cur = input.size() + 16; // the new content is longer
+    ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &small), 0);
+    const rewriteresult res = rewritefile(backup, family, *ix, settings{}, entry(*ix));
+    setrlimit(RLIMIT_FSIZE, &old);
+    std::signal(SIGXFSZ, oldsignal);
+    EXPECT_FALSE(res.ok);
+    EXPECT_EQ(res.message, rewritefailuremessage(rewritemode::censusentry, QString::fromLocal8Bit(strerror(EFBIG))));
+    expectuntouched();
+}
+#endif
 
 TEST(RewriteMessages, EachModeHasItsOwnFailureText)
 {

@@ -10,9 +10,18 @@
 
 #include <QDir>
 #include <QFileInfo>
+#include <QLockFile>
+#include <QProcess>
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
+
+#include <functional>
+
+#ifdef Q_OS_UNIX
+#include <sys/stat.h>
+#include <unistd.h>
+#endif
 
 using namespace qm;
 using qmtest::readfile;
@@ -39,6 +48,7 @@ protected:
         setclockfortests(QDateTime());
         setwritefaultfortests(writefault());
         setinputfaultfortests(false);
+        setsavehookfortests({});
     }
 
     void prepare(int filler)
@@ -76,6 +86,7 @@ protected:
     }
 
     QStringList backups() const { return QDir(s.backupfolder).entryList(QDir::Files); }
+    QString lockpath() const { return family + QStringLiteral(".quillmark-lock"); }
     // Nothing but the family file is left beside it (no temporary files).
     QStringList besidefamily() const
     {
@@ -239,3 +250,165 @@ TEST_F(SaveRoad, BackupMadeAheadIsUsedOnlyWhenItHoldsTheFileAsLoaded)
     EXPECT_FALSE(QFileInfo::exists(made.path));
     EXPECT_EQ(backups().size(), 2);
 }
+
+// Another Quillmark saving the same family file: this save waits for nothing
+// and writes nothing, and says what to do.
+TEST_F(SaveRoad, OneSaveOfAFamilyFileAtATimeAcrossQuillmarks)
+{
+    QLockFile other(lockpath());
+    ASSERT_TRUE(other.tryLock(0));
+    saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::refused);
+    EXPECT_TRUE(out.message.startsWith(QStringLiteral("Another Quillmark (process "))) << out.message.toStdString();
+    EXPECT_TRUE(out.message.contains(QDir::toNativeSeparators(lockpath()))) << "names the lock to delete";
+    EXPECT_TRUE(backups().isEmpty());
+    expectuntouched();
+
+    other.unlock();
+    out = saveentry(index, s, entry);
+    EXPECT_TRUE(out.saved()) << out.message.toStdString();
+    EXPECT_FALSE(QFileInfo::exists(lockpath())) << "the lock goes with the save";
+}
+
+TEST_F(SaveRoad, LockLeftByAQuillmarkThatEndedIsTakenOver)
+{
+    // The lock file a process that has ended left behind, as QLockFile writes it.
+    QProcess ended;
+    ended.start(QStringLiteral("sh"), {QStringLiteral("-c"), QStringLiteral("exit 0")});
+    ASSERT_TRUE(ended.waitForStarted());
+    const qint64 pid = ended.processId();
+    ASSERT_TRUE(ended.waitForFinished());
+    {
+        QLockFile model(dir.filePath(QStringLiteral("model.lock")));
+        ASSERT_TRUE(model.tryLock(0));
+        QString text = QString::fromUtf8(readfile(dir.filePath(QStringLiteral("model.lock"))));
+        text = QString::number(pid) + text.mid(text.indexOf(u'\n'));
+        qmtest::writefile(lockpath(), text.toStdString());
+    }
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_TRUE(out.saved()) << out.message.toStdString();
+    EXPECT_FALSE(QFileInfo::exists(lockpath()));
+}
+
+// Another program changes the file at any moment of the save: the change is
+// found, nothing is written over it, and only the file as it left it remains.
+class SaveRoadOutsideChange : public SaveRoad, public ::testing::WithParamInterface<savestep> {};
+
+TEST_P(SaveRoadOutsideChange, IsNeverWrittenOver)
+{
+    const std::string appended = "0 @N9@ NOTE written by another program\r\n";
+    setsavehookfortests([&](savestep step) {
+        if (step != GetParam())
+            return;
+        QFile f(family);
+        ASSERT_TRUE(f.open(QIODevice::Append));
+        f.write(appended.data(), static_cast<qint64>(appended.size()));
+    });
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::changed);
+    EXPECT_TRUE(out.message.endsWith(QStringLiteral("has been modified by another application and will be reloaded.")));
+    EXPECT_EQ(readfile(family), original + appended);
+    EXPECT_TRUE(backups().isEmpty()) << "the backup of a change not made is removed";
+    EXPECT_EQ(besidefamily(), QStringList{QStringLiteral("family.ged")}) << "no temporary file, no lock, no log";
+}
+
+INSTANTIATE_TEST_SUITE_P(EveryStep, SaveRoadOutsideChange,
+                         ::testing::Values(savestep::locked, savestep::backedup, savestep::written),
+                         [](const ::testing::TestParamInfo<savestep>& i) {
+                             return std::string(i.param == savestep::locked     ? "BeforeTheFirstLook"
+                                                : i.param == savestep::backedup ? "WhileTheBackupIsMade"
+                                                                                : "WhileTheNewFileIsWritten");
+                         });
+
+// A census log that cannot be written is reported with the system's reason;
+// the change itself stands.
+struct logfaultcase {
+    const char* name;
+    const char* path;
+};
+
+class SaveRoadLogFault : public SaveRoad, public ::testing::WithParamInterface<logfaultcase> {};
+
+TEST_P(SaveRoadLogFault, IsReportedNotClaimed)
+{
+    if (!QFileInfo::exists(QString::fromLatin1(GetParam().path)))
+        GTEST_SKIP() << GetParam().path << " is not on this system";
+    s.logpath = QString::fromLatin1(GetParam().path);
+    const saveoutcome out = saveentry(index, s, entry);
+    ASSERT_TRUE(out.saved()) << out.message.toStdString();
+    EXPECT_FALSE(out.logwritten);
+    EXPECT_TRUE(out.logerror.startsWith(QStringLiteral("Quillmark was unable to add a log entry for this record to the log file ")
+                                        + QDir::toNativeSeparators(s.logpath) + QStringLiteral(" (")))
+        << out.logerror.toStdString();
+}
+
+INSTANTIATE_TEST_SUITE_P(Logs, SaveRoadLogFault,
+                         ::testing::Values(logfaultcase{"FullDisk", "/dev/full"},
+                                           logfaultcase{"FileThatTakesNoWriting", "/proc/version"}),
+                         [](const auto& i) { return std::string(i.param.name); });
+
+// The census log is never written into a family file or a backup.
+struct logpathcase {
+    const char* name;
+    std::function<QString(const QString& dir, const QString& family)> path;
+    const char* says;
+};
+
+class SaveRoadLogPath : public SaveRoad, public ::testing::WithParamInterface<logpathcase> {};
+
+TEST_P(SaveRoadLogPath, IsRefusedBeforeAnythingIsWritten)
+{
+    const QString log = GetParam().path(dir.path(), family);
+    if (log.isEmpty())
+        GTEST_SKIP() << "no symbolic links here";
+    s.logpath = log;
+    const std::string before = readfile(log);
+    const saveoutcome out = saveentry(index, s, entry);
+    EXPECT_EQ(out.status, savestatus::refused);
+    EXPECT_TRUE(out.message.contains(QString::fromUtf8(GetParam().says))) << out.message.toStdString();
+    EXPECT_TRUE(out.message.endsWith(QStringLiteral("Nothing has been changed.")));
+    EXPECT_EQ(readfile(family), original);
+    EXPECT_EQ(readfile(log), before);
+    EXPECT_TRUE(backups().isEmpty());
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Paths, SaveRoadLogPath,
+    ::testing::Values(
+        logpathcase{"TheFamilyFile", [](const QString&, const QString& f) { return f; }, "is the family file itself"},
+        logpathcase{"TheFamilyFileThroughALink",
+                    [](const QString& d, const QString& f) {
+                        const QString link = QDir(d).filePath(QStringLiteral("log.txt"));
+                        return QFile::link(f, link) ? link : QString();
+                    },
+                    "is the family file itself"},
+        logpathcase{"AnotherGedcomFile",
+                    [](const QString& d, const QString&) { return QDir(d).filePath(QStringLiteral("other.GED")); },
+                    "is a GEDCOM file"},
+        logpathcase{"InTheBackupFolder",
+                    [](const QString& d, const QString&) { return QDir(d).filePath(QStringLiteral("backups/log.txt")); },
+                    "is in the backup folder"}),
+    [](const auto& i) { return std::string(i.param.name); });
+
+#ifdef Q_OS_UNIX
+// A file with a second name keeps it: the new content is copied into the file
+// itself after the backup is on the disk.
+TEST_F(SaveRoad, LinkedFileIsWrittenInPlace)
+{
+    const QString other = dir.filePath(QStringLiteral("other name.ged"));
+    ASSERT_EQ(::link(QFile::encodeName(family).constData(), QFile::encodeName(other).constData()), 0);
+    struct stat before;
+    ASSERT_EQ(::stat(QFile::encodeName(family).constData(), &before), 0);
+    const saveoutcome out = saveentry(index, s, entry);
+    ASSERT_TRUE(out.saved()) << out.message.toStdString();
+    EXPECT_TRUE(out.rewrite.inplace);
+    struct stat after;
+    ASSERT_EQ(::stat(QFile::encodeName(family).constData(), &after), 0);
+    EXPECT_EQ(after.st_ino, before.st_ino);
+    EXPECT_EQ(after.st_nlink, 2u);
+    EXPECT_EQ(readfile(other), readfile(family));
+    EXPECT_NE(readfile(family), original);
+    EXPECT_EQ(readfile(out.backuppath), original);
+    EXPECT_EQ(out.newstamp, stampof(family));
+}
+#endif
