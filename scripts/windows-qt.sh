@@ -65,9 +65,11 @@ wintab_h=$(cat <<'EOF'
 EOF
 )
 
+direct2d_guard='s/^#if QT_CONFIG(directwrite3)$/#if QT_CONFIG(directwrite3) \&\& QT_CONFIG(direct2d)/'
+
 hash() { sha256sum | cut -d' ' -f1; }
 version=$(dpkg-query -W -f='${Version}' qt6-base-dev)    # e.g. 6.4.2+dfsg-10
-source_recipe=$(printf '%s\n' "$version" "${cve_patches[@]}" "$wintab_h" | hash)
+source_recipe=$(printf '%s\n' "$version" "${cve_patches[@]}" "$wintab_h" "$direct2d_guard" | hash)
 recipe=$( { echo "$source_recipe"; printf '%s\n' "${qt_args[@]}"; cat "$here/cmake/mingw-w64-x86_64.cmake"; } | hash)
 
 if [ "$(cat "$prefix/.quillmark-recipe" 2>/dev/null)" = "$recipe" ]; then
@@ -89,24 +91,28 @@ if [ "$(cat "$src/.quillmark-recipe" 2>/dev/null)" != "$source_recipe" ]; then
   cp /usr/include/wine/wine/windows/wintab.h "$src/src/3rdparty/wintab/wine-wintab.h"
   cp /usr/include/wine/wine/windows/pktdef.h "$src/src/3rdparty/wintab/"
   echo "$wintab_h" >"$src/src/3rdparty/wintab/wintab.h"
+  # With Direct2D off Qt Gui has no DirectWrite font database, which the
+  # windows platform plugin would still ask for.
+  sed -i "$direct2d_guard" "$src/src/plugins/platforms/windows/qwindowsintegration.cpp"
+  [ "$(grep -c 'QT_CONFIG(directwrite3) && QT_CONFIG(direct2d)' \
+         "$src/src/plugins/platforms/windows/qwindowsintegration.cpp")" = 2 ]
   echo "$source_recipe" >"$src/.quillmark-recipe"
 fi
 
 launcher=()
 command -v ccache >/dev/null && launcher=(-DQT_USE_CCACHE=ON)
 echo "Windows Qt: building into $prefix (log: $log); most of an hour on 2 cores"
-{
-  # An interrupted build goes on where it stopped; a changed recipe is
-  # configured over the same tree, so only what it changes is built again.
+# An interrupted build goes on where it stopped; a changed recipe is
+# configured over the same tree, so only what it changes is built again.
+build_qt() {
   if [ "$(cat "$build/.quillmark-recipe" 2>/dev/null)" != "$recipe" ]; then
     cmake -S "$src" -B "$build" -G Ninja \
       -DCMAKE_TOOLCHAIN_FILE="$here/cmake/mingw-w64-x86_64.cmake" \
-      -DCMAKE_INSTALL_PREFIX="$prefix" "${launcher[@]}" "${qt_args[@]}"
-    echo "$recipe" >"$build/.quillmark-recipe"
+      -DCMAKE_INSTALL_PREFIX="$prefix" "${launcher[@]}" "${qt_args[@]}" &&
+      echo "$recipe" >"$build/.quillmark-recipe" || return 1
   fi
-  cmake --build "$build" -j "${QM_WINQT_JOBS:-2}"
-  rm -rf "$prefix"
-  cmake --install "$build"
-} >"$log" 2>&1 || { echo "Windows Qt: build failed; the end of $log:" >&2; tail -30 "$log" >&2; exit 1; }
+  cmake --build "$build" -j "${QM_WINQT_JOBS:-2}" && rm -rf "$prefix" && cmake --install "$build"
+}
+build_qt >"$log" 2>&1 || { echo "Windows Qt: build failed; the end of $log:" >&2; tail -30 "$log" >&2; exit 1; }
 echo "$recipe" >"$prefix/.quillmark-recipe"
 echo "Windows Qt: installed, $(du -sh "$prefix" | cut -f1)"
