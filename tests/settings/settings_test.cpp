@@ -113,7 +113,9 @@ TEST_F(SettingsTest, NoStoreGivesDefaultsWritesFlagValuesAndAsksForOptions)
 // can write to, unlike the program's folder.
 TEST(ProgramFolder, IsQuillmarkInTheUsersLocalApplicationData)
 {
-    const QString local = qEnvironmentVariable("LOCALAPPDATA");
+    // (The tests run in QStandardPaths' test mode, which adds a "qttest" folder.)
+    const QString local = qEnvironmentVariable("LOCALAPPDATA")
+        + (QStandardPaths::isTestModeEnabled() ? QStringLiteral("\\qttest") : QString());
     ASSERT_FALSE(local.isEmpty());
     EXPECT_EQ(programfolder().compare(local + QStringLiteral("\\Quillmark"), Qt::CaseInsensitive), 0) << programfolder().toStdString();
     EXPECT_EQ(programfolder().at(1), u':');

@@ -8,7 +8,7 @@ heldfile::heldfile(const QString& path, const char* sharing)
 {
 #ifdef QM_HOLDFILE_PATH
     holder_.start(QStringLiteral(QM_HOLDFILE_PATH), {QDir::toNativeSeparators(path), QString::fromLatin1(sharing)});
-    holding_ = holder_.waitForReadyRead(30000) && holder_.readLine() == "holding\n";
+    holding_ = holder_.waitForReadyRead(30000) && holder_.readLine().trimmed() == "holding";
 #else
     Q_UNUSED(sharing);
     file_.setFileName(path);
