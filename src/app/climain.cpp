@@ -4,6 +4,13 @@
 #include <QCoreApplication>
 
 #include <cstdio>
+#include <cstdlib>
+
+#ifdef Q_OS_WIN
+#include <fcntl.h>
+#include <io.h>
+#include <windows.h>
+#endif
 
 namespace qm {
 
@@ -31,8 +38,32 @@ const std::vector<clicommand>& clicommands()
 
 } // namespace qm
 
+namespace {
+
+#ifdef Q_OS_WIN
+UINT consolecodepage = 0;
+#endif
+
+// The output is UTF-8 with LF line ends on every system, so that scripts and
+// JSON readers get the same bytes everywhere: on Windows standard output and
+// error are switched from text mode (which writes CR LF) to binary, and a
+// console is told to show UTF-8 until the program ends.
+void rawoutput()
+{
+#ifdef Q_OS_WIN
+    _setmode(_fileno(stdout), _O_BINARY);
+    _setmode(_fileno(stderr), _O_BINARY);
+    consolecodepage = GetConsoleOutputCP();
+    if (consolecodepage != 0 && consolecodepage != CP_UTF8 && SetConsoleOutputCP(CP_UTF8))
+        std::atexit([] { SetConsoleOutputCP(consolecodepage); });
+#endif
+}
+
+} // namespace
+
 int main(int argc, char** argv)
 {
+    rawoutput();
     QCoreApplication app(argc, argv);
     QCoreApplication::setApplicationName(QStringLiteral("quillmark-cli"));
     QStringList args = QCoreApplication::arguments();

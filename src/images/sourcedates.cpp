@@ -60,7 +60,7 @@ bool calendardate(const std::string& date)
 void setdate(std::string& out, std::string_view bytes, textencoding enc)
 {
     bytes = trimmed(bytes);
-    if (isascii(bytes)) {
+    if (allascii(bytes)) {
         out.assign(bytes);
         for (char& c : out)
             if (c >= 'a' && c <= 'z')

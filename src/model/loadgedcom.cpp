@@ -174,7 +174,7 @@ private:
     // the value is that text as it stands (ASCII, nothing trimmed), else a copy.
     std::string_view placetext(std::string_view v)
     {
-        return !lastplace_.empty() && lastplace_.size() == v.size() && isascii(v) ? lastplace_ : text(v);
+        return !lastplace_.empty() && lastplace_.size() == v.size() && allascii(v) ? lastplace_ : text(v);
     }
     std::string_view lookupplace(std::string_view raw, int32_t& groupout);
     void startrecord(std::string_view s);
@@ -237,7 +237,7 @@ private:
 
 std::string_view loader::text(std::string_view raw)
 {
-    if (isascii(raw))
+    if (allascii(raw))
         return ix_.arena.store(raw);
     conv_.clear();
     appendutf8(raw, enc_, conv_);
@@ -501,7 +501,7 @@ void loader::setname(std::string_view s)
     }
     std::string& n = conv_;
     n.clear();
-    const bool ascii = isascii(value);
+    const bool ascii = allascii(value);
     const auto append = [&](std::string_view part) {
         if (ascii)
             n.append(part);
@@ -530,7 +530,7 @@ void loader::flagline(std::string_view s)
     if (space == std::string_view::npos)
         return;
     const auto convert = [this](std::string_view raw, std::string& out) {
-        if (isascii(raw)) {
+        if (allascii(raw)) {
             out.assign(raw);
         } else {
             out.clear();

@@ -9,7 +9,7 @@ namespace qm {
 
 std::string placekey(std::string_view name)
 {
-    if (isascii(name)) {
+    if (allascii(name)) {
         std::string key(name);
         for (char& c : key)
             if (c >= 'A' && c <= 'Z')

@@ -132,7 +132,7 @@ int unicodetocp1252(char32_t cp)
 
 void appendutf8(std::string_view bytes, textencoding enc, std::string& out)
 {
-    if (isascii(bytes)) {
+    if (allascii(bytes)) {
         out.append(bytes);
         return;
     }
@@ -164,7 +164,7 @@ std::string toutf8(std::string_view bytes, textencoding enc)
 
 bool fromutf8(std::string_view utf8, textencoding enc, std::string& out, char32_t* bad)
 {
-    if (isascii(utf8)) {
+    if (allascii(utf8)) {
         out.append(utf8);
         return true;
     }

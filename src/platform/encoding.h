@@ -34,7 +34,7 @@ textencoding encodingforchar(std::string_view charvalue);
 
 // Whether every byte is below 0x80; eight bytes at a time, since the loader
 // asks this of nearly every value it reads.
-inline bool isascii(std::string_view s)
+inline bool allascii(std::string_view s)
 {
     const char* p = s.data();
     size_t n = s.size();

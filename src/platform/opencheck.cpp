@@ -18,6 +18,15 @@ const QSet<QString>& runnable()
                               "ps2", "psc1", "psm1", "psd1", "msc", "msh", "reg", "inf", "scf", "gadget", "dll", "sys",
                               "ocx", "application", "appref-ms", "settingcontent-ms", "library-ms", "search-ms",
                               "xbap", "xll", "chm", "hlp", "jnlp", "iso", "img", "vhd", "vhdx",
+                              // Windows: Office macros and databases, installers, packages and other
+                              // types Windows itself treats as unsafe to open from a mail
+                              "ade", "adp", "mad", "maf", "mag", "mam", "maq", "mar", "mas", "mat", "mau", "mav",
+                              "maw", "mda", "mdb", "mde", "mdt", "mdw", "mdz", "appx", "appxbundle", "msix",
+                              "msixbundle", "msu", "cab", "diagcab", "appcontent-ms", "searchconnector-ms", "bas",
+                              "grp", "hpj", "htc", "ins", "isp", "its", "mcf", "msh1", "msh2", "mshxml", "msh1xml",
+                              "msh2xml", "ops", "osd", "plg", "prf", "prg", "printerexport", "ps2xml", "psc2",
+                              "psdm1", "sct", "shb", "shs", "theme", "udl", "vbp", "vsmacros", "vsw", "webpnp",
+                              "website", "wsb", "xnk", "cer", "crt", "der",
                               // Unix and macOS
                               "sh", "bash", "zsh", "csh", "tcsh", "ksh", "fish", "command", "tool", "desktop", "app",
                               "action", "workflow", "scpt", "applescript", "pkg", "mpkg", "dmg", "so", "dylib", "run",
@@ -35,13 +44,16 @@ const QSet<QString>& runnable()
 
 bool runnablename(const QString& name)
 {
-    QString n = name;
-    while (!n.isEmpty() && (n.back() == u'.' || n.back() == u' '))
-        n.chop(1);
-    const qsizetype dot = n.lastIndexOf(u'.');
-    if (dot < 0)
-        return false;
-    return runnable().contains(n.mid(dot + 1).toLower());
+    // "name:stream" and "name::$DATA" name a stream of an NTFS file, and
+    // Windows opens "tool.exe::$DATA" as tool.exe: every part counts.
+    for (QString n : name.split(u':')) {
+        while (!n.isEmpty() && (n.back() == u'.' || n.back() == u' '))
+            n.chop(1);
+        const qsizetype dot = n.lastIndexOf(u'.');
+        if (dot >= 0 && runnable().contains(n.mid(dot + 1).toLower()))
+            return true;
+    }
+    return false;
 }
 
 QString refuseopen(const QString& path)

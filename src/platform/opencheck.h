@@ -13,7 +13,8 @@ QString refuseopen(const QString& path);
 
 // Whether a file name ends in an extension of programs, scripts, installers or
 // shortcuts on any of the systems Quillmark runs on (letter case ignored;
-// trailing dots and spaces, which Windows drops, are passed over).
+// trailing dots and spaces, which Windows drops, are passed over; the name of
+// an NTFS stream, after a colon, counts as well).
 bool runnablename(const QString& name);
 
 } // namespace qm

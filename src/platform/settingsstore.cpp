@@ -13,8 +13,15 @@ QString keyof(const QString& group, const QString& name)
 
 std::unique_ptr<settingsstore> settingsstore::native()
 {
+#ifdef Q_OS_WIN
+    // The key itself: a store opened with the organisation name alone keeps its
+    // values one level down, under Software\Quillmark\OrganizationDefaults.
+    return std::make_unique<settingsstore>(std::make_unique<QSettings>(
+        QStringLiteral("HKEY_CURRENT_USER\\Software\\Quillmark"), QSettings::NativeFormat));
+#else
     return std::make_unique<settingsstore>(
         std::make_unique<QSettings>(QSettings::NativeFormat, QSettings::UserScope, QStringLiteral("Quillmark")));
+#endif
 }
 
 std::unique_ptr<settingsstore> settingsstore::onfile(const QString& path)

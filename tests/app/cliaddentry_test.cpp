@@ -2,6 +2,7 @@
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
 #include "support/clirun.h"
+#include "support/heldfile.h"
 #include "support/testfiles.h"
 
 #include <QDir>
@@ -12,6 +13,8 @@
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
+
+#include <iostream>
 
 using qmtest::readfile;
 using qmtest::writefile;
@@ -129,6 +132,42 @@ TEST_F(CliAddEntry, CitesExistingSourceWithBirthDetails)
     EXPECT_NE(now.find("1 NAME Ann /Smith/\r\n1 BIRT\r\n2 DATE CAL 22 MAR 1851\r\n2 SOUR"), std::string::npos)
         << "an empty birth place gives no PLAC line";
     EXPECT_EQ(now.find("0 @S3@"), std::string::npos) << "no new source when citing one";
+}
+
+// Family Historian keeps its family file open while it runs, sharing it with
+// or without leave to delete or rename it. A save then either replaces the
+// file whole or fails with the message after which the program closes and
+// leaves the file byte for byte as it was; never anything in between.
+TEST_F(CliAddEntry, FileHeldOpenByAnotherProgramIsReplacedWholeOrNotAtAll)
+{
+    const std::string entry = R"({"year": 1851, "place": "Leeds, Yorkshire", "reference": "HO107/2320", )" + household
+        + "}";
+    for (const char* sharing : {"no-share-delete", "share-delete"}) {
+        SCOPED_TRACE(sharing);
+        writefile(file, family);
+        run r;
+        {
+            const qmtest::heldfile held(file, sharing);
+            ASSERT_TRUE(held.holding());
+            r = addentry(entry);
+            EXPECT_EQ(readfile(file).size() == family.size(), r.status != 0) << "seen while still held";
+        }
+        const std::string now = readfile(file);
+        if (r.status == 0) {
+            EXPECT_NE(now.find("1 NAME John /Smith/\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"), std::string::npos) << now;
+            EXPECT_NE(now.find("0 @S3@ SOUR\r\n"), std::string::npos);
+            EXPECT_TRUE(now.ends_with("0 TRLR\r\n")) << "the whole new file";
+        } else {
+            EXPECT_EQ(r.status, 2);
+            EXPECT_EQ(now, family);
+            EXPECT_TRUE(r.err.starts_with("quillmark-cli: An error occurred (")) << r.err;
+            EXPECT_NE(r.err.find("): Census entry not added"), std::string::npos) << r.err;
+        }
+        std::cout << "[          ] held with " << sharing << ": " << (r.status == 0 ? "saved" : r.err) << "\n";
+        const QStringList left = QDir(dir.path()).entryList(QDir::Files | QDir::Hidden);
+        EXPECT_EQ(left.filter(QStringLiteral("family")), QStringList{QStringLiteral("family.ged")})
+            << "no temporary file left beside the family file: " << left.join(u' ').toStdString();
+    }
 }
 
 // The form's own checks are tested on the form; here, that the entry's fields reach them.

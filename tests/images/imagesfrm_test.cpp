@@ -203,6 +203,32 @@ private slots:
         QCOMPARE(chosen.size(), size_t(1));
     }
 
+    // A "_FILE" path as Family Historian writes it on Windows (drive letter,
+    // backslashes) is read back as it stands and previewed from there; the
+    // same file chosen again with forward slashes is known as the same image.
+    void windowspathreadbackandpreviewed()
+    {
+        const QString picture = QDir::toNativeSeparators(png(QStringLiteral("scan 1881.png"), 6, 8));
+#ifdef Q_OS_WIN
+        QVERIFY(picture.at(1) == u':' && picture.contains(u'\\') && !picture.contains(u'/'));
+#endif
+        const QString file = files_.filepath(QStringLiteral("windowspath.ged"));
+        writefile(file, "0 HEAD\r\n1 CHAR UTF-8\r\n0 @O1@ OBJE\r\n1 FORM png\r\n1 TITL Leeds CENSUS 1881\r\n1 _FILE "
+                            + picture.toStdString() + "\r\n0 TRLR\r\n");
+        const auto ix = load(file);
+        QVERIFY(ix);
+        QCOMPARE(qs(ix->objects.at(0).file), picture);
+        scriptedprompts p;
+        std::vector<imagechoice> chosen;
+        currentimagesfrm f(*ix, p, chosen);
+        child<QListWidget>(&f, QStringLiteral("imageslst"))->setCurrentRow(0);
+        QCOMPARE(child<QLineEdit>(&f, QStringLiteral("Imageinfotxt2"))->text(), picture);
+        const auto* preview = child<imagepreview>(&f, QStringLiteral("imagepreview"));
+        QCOMPARE(preview->last(), imagepreview::outcome::shown);
+        QCOMPARE(preview->picture().size(), QSize(6, 8));
+        QVERIFY(refusenewimage(QDir::fromNativeSeparators(picture), chosen, *ix).contains(QLatin1String("already loaded")));
+    }
+
     // New images: titles offered, numbers after unlinking, refusals, rename.
     void newimages()
     {

@@ -45,6 +45,14 @@ TEST_F(OpenCheck, ProgramsScriptsAndShortcutsAreRefusedByTypeEvenWhenAbsent)
     }
     EXPECT_FALSE(runnablename(QStringLiteral("exe")));
     EXPECT_FALSE(runnablename(QStringLiteral("photo.exe.png")));
+    // More that Windows runs or installs; names of NTFS streams, which the
+    // file system cannot hold as files, checked by name only.
+    for (const char* name : {"x.msu", "x.appx", "x.msix", "x.sct", "x.shs", "x.mde", "x.diagcab", "x.theme",
+                             "tool.exe::$DATA", "tool.EXE:", "photo.jpg:hidden.exe", "photo.jpg:x.ps1:$DATA"}) {
+        EXPECT_TRUE(runnablename(QString::fromLatin1(name))) << name;
+        EXPECT_NE(refuseopen(dir.filePath(QString::fromLatin1(name))), QString()) << name;
+    }
+    EXPECT_FALSE(runnablename(QStringLiteral("C:\\scans:1881.png")));
 }
 
 TEST_F(OpenCheck, OnlyExistingRegularFiles)

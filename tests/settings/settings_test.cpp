@@ -3,6 +3,7 @@
 #include "platform/settingsstore.h"
 
 #include <QDir>
+#include <QFileInfo>
 #include <QSettings>
 #include <QStandardPaths>
 #include <QTemporaryDir>
@@ -105,6 +106,24 @@ TEST_F(SettingsTest, NoStoreGivesDefaultsWritesFlagValuesAndAsksForOptions)
     EXPECT_EQ(store->read("Flag Check"), QString("0"));
     EXPECT_FALSE(store->read("Full Entry").has_value());
 }
+
+#ifdef Q_OS_WIN
+// The census log and the backups go to the user's own local application data
+// folder, named the Windows way (drive letter, backslashes), which the user
+// can write to, unlike the program's folder.
+TEST(ProgramFolder, IsQuillmarkInTheUsersLocalApplicationData)
+{
+    // (The tests run in QStandardPaths' test mode, which adds a "qttest" folder.)
+    const QString local = qEnvironmentVariable("LOCALAPPDATA")
+        + (QStandardPaths::isTestModeEnabled() ? QStringLiteral("\\qttest") : QString());
+    ASSERT_FALSE(local.isEmpty());
+    EXPECT_EQ(programfolder().compare(local + QStringLiteral("\\Quillmark"), Qt::CaseInsensitive), 0) << programfolder().toStdString();
+    EXPECT_EQ(programfolder().at(1), u':');
+    EXPECT_FALSE(programfolder().contains(u'/'));
+    EXPECT_EQ(defaultlogpath(), programfolder() + QStringLiteral("\\censuslog.txt"));
+    EXPECT_TRUE(QFileInfo(programfolder()).isWritable());
+}
+#endif
 
 TEST_F(SettingsTest, CompleteStoreIsReadWithConversions)
 {

@@ -4,6 +4,7 @@
 #include "platform/filetime.h"
 #include "platform/scriptedprompts.h"
 #include "settings/settings.h"
+#include "support/readonlyfolder.h"
 #include "support/testfiles.h"
 
 #include <QDir>
@@ -110,16 +111,12 @@ TEST_F(Backups, FolderCheck)
 
 TEST_F(Backups, ReadOnlyFolderCannotBeWrittenTo)
 {
-    QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::ExeOwner);
-    if (QFile probe(QDir(folder).filePath(QStringLiteral("p"))); probe.open(QIODevice::WriteOnly)) {
-        probe.remove();
-        QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
-        GTEST_SKIP() << "running with rights that ignore folder permissions";
-    }
+    const qmtest::readonlyfolder readonly(folder);
+    if (!readonly.ineffective().isEmpty())
+        GTEST_SKIP() << readonly.ineffective().toStdString();
     prompts.expect(answer::ok, QStringLiteral("can not be written to. ") + folder);
     EXPECT_TRUE(checkbackupfolder(prompts, folder));
     EXPECT_EQ(prompts.history().at(0).m.kind, icon::critical);
-    QFile::setPermissions(folder, QFileDevice::ReadOwner | QFileDevice::WriteOwner | QFileDevice::ExeOwner);
 }
 
 TEST_F(Backups, CheckPathsStopsAtLogProblem)
