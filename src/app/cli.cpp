@@ -1,7 +1,6 @@
 #include "app/cli.h"
 
 #include "flags/flagalloc.h"
-#include "flags/flagtable.h"
 #include "platform/settingsstore.h"
 
 #include <QDir>
@@ -81,23 +80,23 @@ bool takesettingsoption(QStringList& args, QString* path, QString* error)
     return true;
 }
 
-std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error)
+std::unique_ptr<clifile> opensettings(const QString& inipath, QString* error)
 {
-    auto s = std::make_unique<clisettings>();
+    std::unique_ptr<settingsstore> store;
     if (inipath.isEmpty()) {
-        s->store = settingsstore::native();
+        store = settingsstore::native();
     } else {
         const QFileInfo info(inipath);
         if (!info.isFile() || !info.isReadable()) {
             *error = QStringLiteral("the settings file %1 does not exist or cannot be read").arg(inipath);
             return nullptr;
         }
-        s->store = settingsstore::onfile(inipath);
+        store = settingsstore::onfile(inipath);
         // An empty file asks for the defaults; anything else must hold settings
         // (values, or only census flag definitions).
         const bool empty = QFile(inipath).size() == 0;
-        if (!s->store->readable()
-            || (!empty && !s->store->holdsany(settingnames()) && !s->store->groupexists(QStringLiteral("Flags")))) {
+        if (!store->readable()
+            || (!empty && !store->holdsany(settingnames()) && !store->groupexists(QStringLiteral("Flags")))) {
             *error = QStringLiteral("the settings file %1 cannot be read as Quillmark settings: it holds none of "
                                     "their values (see docs/cli.md)")
                          .arg(QDir::toNativeSeparators(inipath));
@@ -107,8 +106,8 @@ std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error
             cliwarn(QStringLiteral("the settings file %1 is empty: every setting takes its default")
                         .arg(QDir::toNativeSeparators(inipath)));
     }
-    const settingsload loaded = loadsettings(*s->store);
-    s->values = loaded.values;
+    auto s = std::make_unique<clifile>(std::move(store));
+    const settingsload loaded = s->file.readsettings();
     if (!inipath.isEmpty() && !loaded.defaulted.isEmpty() && loaded.defaulted.size() < settingnames().size())
         cliwarn(QStringLiteral("the settings file %1 lacks these values or holds them in a form not accepted, so "
                                "they take their defaults: %2")
@@ -181,40 +180,34 @@ bool clisaved(const saveoutcome& out)
     return true;
 }
 
-loadresult loadfamily(const QString& path, const clisettings& s)
+readoutcome loadfamily(clifile& f, const QString& path)
 {
-    flagtable flagdefs;
-    if (!loadflagdefs(*s.store, flagdefs))
-        cliwarn(flagloaderrormessage());
-    loadresult r = loadgedcom(path, flagdefs);
-    if (r.index && !r.index->hashead) {
-        r.index.reset();
-        r.error = QStringLiteral("%1 is not a GEDCOM family file: it has no \"0 HEAD\" line")
-                      .arg(QDir::toNativeSeparators(path));
-    }
+    const readoutcome r = f.file.load(path, true);
+    f.loadms = r.ms;
+    if (!r.flagerror.isEmpty())
+        cliwarn(r.flagerror);
     return r;
 }
 
-std::unique_ptr<clifamily> openfamily(const QStringList& files, const QString& usage, const QString& inipath)
+std::unique_ptr<clifile> openfamily(const QStringList& files, const QString& usage, const QString& inipath)
 {
     if (files.size() != 1) {
         clifail(usage);
         return nullptr;
     }
     const QString& path = files.front();
-    auto f = std::make_unique<clifamily>();
     QString error = checkfamilypath(path);
+    std::unique_ptr<clifile> f;
     if (error.isEmpty())
-        f->settings = opensettings(inipath, &error);
-    if (f->settings) {
-        f->loaded = loadfamily(path, *f->settings);
-        error = f->loaded.error;
+        f = opensettings(inipath, &error);
+    if (f) {
+        const readoutcome r = loadfamily(*f, path);
+        if (r.ok)
+            return f;
+        error = r.error;
     }
-    if (!f->loaded.index) {
-        clifail(error);
-        return nullptr;
-    }
-    return f;
+    clifail(error);
+    return nullptr;
 }
 
 void printline(const QString& text)

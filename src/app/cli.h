@@ -6,9 +6,8 @@
 // arguments after its name. It returns the process's exit status: 0 when done,
 // 2 when it could not be (after one line on standard error).
 
-#include "model/loadgedcom.h"
 #include "platform/settingsstore.h"
-#include "settings/settings.h"
+#include "writer/openfile.h"
 #include "writer/saveroad.h"
 
 #include <QJsonObject>
@@ -58,15 +57,19 @@ QStringList takeoperands(QStringList& args);
 // message) when the option has no value.
 bool takesettingsoption(QStringList& args, QString* path, QString* error);
 
-// The user's settings store, or the INI file named by --settings, which must
-// exist and read as settings (a file holding none of the values is refused).
-// Values the file lacks or holds in a form not accepted take their defaults,
-// after a warning on standard error naming them.
-struct clisettings {
+// The family file a command works on, over the user's settings store or the
+// INI file named by --settings, which must exist and read as settings (a file
+// holding none of the values is refused). Values the file lacks or holds in a
+// form not accepted take their defaults, after a warning on standard error
+// naming them. Nothing is read from the family file yet (loadfamily).
+struct clifile {
+    explicit clifile(std::unique_ptr<settingsstore> s) : store(std::move(s)), file(*store) {}
     std::unique_ptr<settingsstore> store;
-    settings values;
+    openfile file;
+    double loadms = 0; // time the last read took
+    const settings& values() const { return file.currentsettings(); }
 };
-std::unique_ptr<clisettings> opensettings(const QString& inipath, QString* error);
+std::unique_ptr<clifile> opensettings(const QString& inipath, QString* error);
 
 // "unknown option A (see quillmark-cli --help)" for the first argument that
 // looks like an option ("-" alone names standard input); "" when none does.
@@ -90,20 +93,15 @@ QString checkfamilypath(const QString& path);
 // not be written); false after the reason on standard error.
 bool clisaved(const saveoutcome& out);
 
-// Loads the family file with the census flags of the settings store (a
-// warning when those cannot be read). Without index, and with the message in
-// error, when the file cannot be loaded or has no "0 HEAD" line.
-loadresult loadfamily(const QString& path, const clisettings& s);
+// Reads the family file with the census flags of the settings store (a
+// warning when those cannot be read). Not ok, with the message in error, when
+// the file cannot be read or has no "0 HEAD" line.
+readoutcome loadfamily(clifile& f, const QString& path);
 
-// What a command that reads one family file works on.
-struct clifamily {
-    std::unique_ptr<clisettings> settings;
-    loadresult loaded; // its index is set
-};
-// The one family file of `files`, checked (checkfamilypath) and loaded
+// The one family file of `files`, checked (checkfamilypath) and read
 // (loadfamily) with the settings of `inipath` (opensettings). Null, after one
 // line on standard error (`usage` when files are not one), when it cannot be.
-std::unique_ptr<clifamily> openfamily(const QStringList& files, const QString& usage, const QString& inipath);
+std::unique_ptr<clifile> openfamily(const QStringList& files, const QString& usage, const QString& inipath);
 
 // One line of text, or one JSON object on one line, on standard output.
 void printline(const QString& text);

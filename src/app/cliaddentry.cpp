@@ -4,7 +4,7 @@
 #include "app/cli.h"
 
 #include "app/clientry.h"
-#include "model/loadgedcom.h"
+#include "model/gedcomindex.h"
 #include "writer/saveroad.h"
 
 #include <QDir>
@@ -66,22 +66,22 @@ int cliaddentry(QStringList args)
     if (!readentry(ef.readAll(), e, error))
         return clifail(error);
 
-    const auto cs = opensettings(inipath, &error);
-    if (!cs)
+    const auto f = opensettings(inipath, &error);
+    if (!f)
         return clifail(error);
-    const settings& s = cs->values;
+    const settings& s = f->values();
 
     // The backup copy is made while the file loads: the copy is mostly the
     // kernel's and the disk's work, the load the processor's. The save road
     // takes it only if the file is still as loaded.
     std::future<backupresult> early =
         std::async(std::launch::async, [&path, folder = s.backupfolder] { return makebackup(path, folder); });
-    loadresult loaded = loadfamily(path, *cs);
+    const readoutcome loaded = loadfamily(*f, path);
     const backupresult made = early.get();
     backupguard guard{made.path};
-    if (!loaded.index)
+    if (!loaded.ok)
         return clifail(loaded.error);
-    const gedcomindex& ix = *loaded.index;
+    const gedcomindex& ix = *f->file.index();
 
     censusentry entry;
     error = makeentry(e, ix, s, entry);
@@ -89,7 +89,10 @@ int cliaddentry(QStringList args)
         return clifail(error);
 
     guard.path.clear(); // the save road uses the backup or removes it
-    const saveoutcome out = saveentry(ix, s, entry, &made);
+    rewriterequest request;
+    request.mode = rewritemode::censusentry;
+    request.entry = entry;
+    const saveoutcome out = f->file.save(request, &made);
     if (!clisaved(out))
         return clifailure;
 
@@ -101,7 +104,7 @@ int cliaddentry(QStringList args)
     result.insert(QStringLiteral("images"), static_cast<int>(entry.chosenimages.size()));
     printjson(result);
     // The process ends here: taking a large index apart would only cost time.
-    (void)loaded.index.release();
+    f->file.abandonindex();
     return 0;
 }
 

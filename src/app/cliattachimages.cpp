@@ -113,9 +113,7 @@ int cliattachimages(QStringList args)
     const auto f = openfamily(args, usage, inipath);
     if (!f)
         return clifailure;
-    const settings& s = f->settings->values;
-    loadresult& loaded = f->loaded;
-    gedcomindex& ix = *loaded.index;
+    gedcomindex& ix = *f->file.index();
 
     int32_t sourcepos = -1;
     for (size_t i = 0; i < ix.sources.size() && sourcepos < 0; ++i)
@@ -170,7 +168,7 @@ int cliattachimages(QStringList args)
     rq.entry.sourceid = QString::number(sourceid);
     rq.entry.title = title;
     rq.entry.chosenimages = chosen;
-    const saveoutcome out = savechange(ix, s, rq);
+    const saveoutcome out = f->file.save(rq);
     if (!clisaved(out))
         return clifailure;
 
@@ -184,7 +182,7 @@ int cliattachimages(QStringList args)
     result.insert(QStringLiteral("linked_objects"), objects);
     result.insert(QStringLiteral("log"), out.logwritten);
     printjson(result);
-    (void)loaded.index.release();
+    f->file.abandonindex();
     return 0;
 }
 

@@ -3,7 +3,7 @@
 // changes as its "Make Suggested Changes" button does.
 #include "app/cli.h"
 
-#include "model/loadgedcom.h"
+#include "model/gedcomindex.h"
 #include "tools/datecheck.h"
 
 #include <QDir>
@@ -51,11 +51,9 @@ int clidatecheck(QStringList args)
     const auto f = openfamily(files, usage(), inipath);
     if (!f)
         return clifailure;
-    const clisettings* s = f->settings.get();
     if (country.isEmpty())
-        country = s->values.country;
-    loadresult& r = f->loaded;
-    const gedcomindex& ix = *r.index;
+        country = f->values().country;
+    const gedcomindex& ix = *f->file.index();
 
     datecheckstate check(ix);
     check.choosecountry(country);
@@ -65,11 +63,11 @@ int clidatecheck(QStringList args)
     printlist(othercountrycaption(check.country()), lists.other);
     std::fflush(stdout);
     if (!apply || !lists.canchange) {
-        (void)r.index.release(); // the system takes the memory back faster
+        f->file.abandonindex(); // the system takes the memory back faster
         return 0;
     }
 
-    const saveoutcome out = makedatechanges(ix, s->values, check.changes());
+    const saveoutcome out = makedatechanges(f->file, check.changes());
     if (!clisaved(out))
         return clifailure;
     printline(QStringLiteral("Changed %1 census event dates and %2 occupation dates")
@@ -77,7 +75,7 @@ int clidatecheck(QStringList args)
                   .arg(out.rewrite.occdateschanged));
     printline(QStringLiteral("Backup: ") + QDir::toNativeSeparators(out.backuppath));
     std::fflush(stdout);
-    (void)r.index.release();
+    f->file.abandonindex();
     return 0;
 }
 

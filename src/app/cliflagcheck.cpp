@@ -3,6 +3,7 @@
 #include "app/cli.h"
 
 #include "flags/flagcheck.h"
+#include "model/gedcomindex.h"
 #include "model/loadgedcom.h"
 #include "platform/encoding.h"
 #include "writer/saveroad.h"
@@ -53,8 +54,7 @@ int cliflagcheck(QStringList args)
     const auto f = openfamily(files, usage(), inipath);
     if (!f)
         return clifailure;
-    const clisettings* s = f->settings.get();
-    gedcomindex& ix = *f->loaded.index;
+    gedcomindex& ix = *f->file.index();
 
     // The country question is answered from --country-for, or the check fails naming the event.
     QString unanswered;
@@ -78,7 +78,7 @@ int cliflagcheck(QStringList args)
         }
         return {static_cast<int>(at), false};
     };
-    const flagcheckresult check = checkflags(ix, true, s->values.country, ask);
+    const flagcheckresult check = checkflags(ix, true, f->values().country, ask);
     if (check.cancelled)
         return clifail(unanswered);
 
@@ -95,7 +95,7 @@ int cliflagcheck(QStringList args)
     rewriterequest request;
     request.mode = rewritemode::flagchanges;
     request.flagchanges = check.changes;
-    const saveoutcome out = savechange(ix, s->values, request);
+    const saveoutcome out = f->file.save(request);
     if (!clisaved(out))
         return clifailure;
     printline(QStringLiteral("Backup: ") + QDir::toNativeSeparators(out.backuppath));

@@ -1,7 +1,7 @@
 // quillmark-cli stats: loads a family file and prints what the index holds.
 #include "app/cli.h"
 
-#include "model/loadgedcom.h"
+#include "model/gedcomindex.h"
 
 
 #include <cstdio>
@@ -22,8 +22,7 @@ int clistats(QStringList args)
         args, QStringLiteral("stats needs one family file: quillmark-cli stats FILE [--settings S.ini]"), inipath);
     if (!f)
         return clifailure;
-    loadresult& r = f->loaded;
-    const gedcomindex& ix = *r.index;
+    const gedcomindex& ix = *f->file.index();
 
     jsonobject j;
     j.add("individuals", static_cast<int64_t>(ix.people.size()));
@@ -37,13 +36,13 @@ int clistats(QStringList args)
     j.add("maxobjectid", static_cast<int64_t>(ix.maxobjectid));
     j.add("maxnoteid", static_cast<int64_t>(ix.maxnoteid));
     j.add("encoding", QString::fromLatin1(encodingname(ix.encoding)));
-    j.add("load_ms", r.ms);
+    j.add("load_ms", f->loadms);
     const std::string out = j.text() + "\n";
     std::fwrite(out.data(), 1, out.size(), stdout);
     std::fflush(stdout);
     // The process ends here: freeing a big index block by block would only
     // add to the time, the system takes the memory back at once.
-    (void)r.index.release();
+    f->file.abandonindex();
     return 0;
 }
 

@@ -68,8 +68,8 @@ void mainfrm::about()
 // The donation reminder after the 10th, the 20th and every 50th saved entry.
 void mainfrm::milestone()
 {
-    if (ismilestone(settings_.count))
-        donatefrm(prompts_, settings_.count, this).exec();
+    if (ismilestone(file_.currentsettings().count))
+        donatefrm(prompts_, file_.currentsettings().count, this).exec();
 }
 
 } // namespace qm

@@ -46,8 +46,10 @@ QString doesnotexist()
 } // namespace
 
 mainfrm::mainfrm(prompts& p, settingsstore& store, QWidget* parent)
-    : QMainWindow(parent), prompts_(p), store_(store)
+    : QMainWindow(parent), prompts_(p), file_(store, &p)
 {
+    idle_.emplace(file_);
+    file_.onread([this] { afterload(); });
     setObjectName(QStringLiteral("mainfrm"));
     setWindowTitle(versiontitle());
     buildform();
@@ -179,7 +181,7 @@ void mainfrm::buildform()
         connect(p->fixeddatetxt, &QLineEdit::textEdited, this, &mainfrm::datechanged);
         p->fixeddatetxt->installEventFilter(this);
         new placecompleter(p->locationtxt, [this]() -> const std::vector<placerec>* {
-            return index_ ? &index_->places : nullptr;
+            return file_.index() ? &file_.index()->places : nullptr;
         });
         for (QLineEdit* e : {p->locationtxt, p->addresstxt, p->othertxt, p->referencetxt}) {
             if (e && m == 0)
@@ -250,7 +252,7 @@ void mainfrm::placewindow()
     size = size.expandedTo(sizeHint()).expandedTo(QSize(1280, 760));
     resize(size.boundedTo(room));
 
-    const placement p = readplacement(store_);
+    const placement p = readplacement(file_.store());
     QPoint at = pos();
     QSize s = this->size();
     if (p.top)
@@ -295,10 +297,10 @@ std::optional<QString> mainfrm::askforfile(bool)
 bool mainfrm::start(const QStringList& arguments)
 {
     placewindow();
-    recent_.read(store_);
+    recent_.read(file_.store());
     showrecentfiles();
-    defaultfile_ = store_.read(defaultfilename).value_or(QString()).trimmed();
-    gedcomfolder_ = store_.read(gedcomfoldername).value_or(QString()).trimmed();
+    defaultfile_ = file_.store().read(defaultfilename).value_or(QString()).trimmed();
+    gedcomfolder_ = file_.store().read(gedcomfoldername).value_or(QString()).trimmed();
 
     std::optional<QString> named = commandlinefile(arguments);
     QString file;
@@ -325,37 +327,34 @@ bool mainfrm::start(const QStringList& arguments)
             prompts_.tell(doesnotexist());
         if (fromdefault || defaultfile_.isEmpty()) {
             defaultfile_.clear();
-            store_.write(defaultfilename, QString());
+            file_.store().write(defaultfilename, QString());
         }
     }
-    gedcomfile_ = file;
     rememberfile(file, false);
-    watchfile_ = false;
 
-    const settingsload loaded = loadsettings(store_);
-    settings_ = loaded.values;
-    settitleandpanel();
-    startoptions();
-    loadfile();
-    if (settings_.flagcheck)
+    file_.readsettings();
+    settitleandpanel(file);
+    startoptions(file);
+    file_.load(file);
+    if (file_.currentsettings().flagcheck)
         silentflagcheck();
     clearentry();
-    watchfile_ = true;
+    idle_.reset();
     return true;
 }
 
 void mainfrm::rememberfile(const QString& path, bool fromopen)
 {
-    if (askdefaultfile(defaultfile_, fromopen, settings_.fileopendefault) &&
+    if (askdefaultfile(defaultfile_, fromopen, file_.currentsettings().fileopendefault) &&
         prompts_.yes(QStringLiteral("Do you want to open this file by default whenever you use Quillmark?"),
                      icon::question)) {
         defaultfile_ = path;
-        store_.write(defaultfilename, path);
+        file_.store().write(defaultfilename, path);
     }
     const QString folder = folderof(path);
     if (!folder.isEmpty()) {
         gedcomfolder_ = folder;
-        store_.write(gedcomfoldername, folder);
+        file_.store().write(gedcomfoldername, folder);
     }
     recent_.remember(path);
     showrecentfiles();
@@ -363,7 +362,7 @@ void mainfrm::rememberfile(const QString& path, bool fromopen)
 
 void mainfrm::showrecentfiles()
 {
-    recent_.write(store_);
+    recent_.write(file_.store());
     bool any = false;
     for (int i = 0; i < recentfiles::slotcount; ++i) {
         QAction* a = RecentFilesmen_[static_cast<size_t>(i)];
@@ -376,42 +375,20 @@ void mainfrm::showrecentfiles()
     recentseparator_->setVisible(any);
 }
 
-void mainfrm::settitleandpanel()
+void mainfrm::settitleandpanel(const QString& path)
 {
-    setWindowTitle(windowtitle(gedcomfile_));
-    sourcemode_ = settings_.fullentry ? 0 : 1;
+    setWindowTitle(windowtitle(path));
+    sourcemode_ = file_.currentsettings().fullentry ? 0 : 1;
     panels_->setCurrentIndex(sourcemode_);
     rows_.toprow = std::min(rows_.toprow, rows_.selectioncount);
     fillyears();
-    viewlogmen_->setEnabled(settings_.keeplog);
-    attachbut_->setEnabled(settings_.fullentry);
-}
-
-bool mainfrm::loadfile()
-{
-    flagtable defs;
-    if (!loadflagdefs(store_, defs))
-        prompts_.tell(flagloaderrormessage());
-    loadresult r;
-    {
-        busycursor busy(prompts_);
-        r = loadgedcom(gedcomfile_, defs);
-    }
-    if (!r.index) {
-        prompts_.tell(r.error, icon::exclamation);
-        if (!index_)
-            index_ = std::make_unique<gedcomindex>();
-        afterload();
-        return false;
-    }
-    index_ = std::move(r.index);
-    afterload();
-    return true;
+    viewlogmen_->setEnabled(file_.currentsettings().keeplog);
+    attachbut_->setEnabled(file_.currentsettings().fullentry);
 }
 
 void mainfrm::afterload()
 {
-    const gedcomindex& x = *index_;
+    const gedcomindex& x = *file_.index();
     // Existing census sources, by title.
     std::vector<sourceitem> sources = censussourcelist(x);
     QCollator collator;
@@ -429,17 +406,17 @@ void mainfrm::afterload()
 
     household_->family->clear();
     household_->people->clear();
-    if (x.people.empty() && QFileInfo::exists(gedcomfile_)) {
+    if (x.people.empty() && QFileInfo::exists(file_.path())) {
         prompts_.tell(nopeoplemessage());
-        if (gedcomfile_ == defaultfile_) {
+        if (file_.path() == defaultfile_) {
             defaultfile_.clear();
-            store_.write(defaultfilename, QString());
+            file_.store().write(defaultfilename, QString());
         }
     }
     QCheckBox* all = household_->allpeoplechk;
     if (peoplelistshown(x)) {
         busycursor busy(prompts_);
-        household_->people->setpeople(index_.get(), sortedpeople(x, settings_.idonly), settings_.idonly);
+        household_->people->setpeople(file_.index(), sortedpeople(x, file_.currentsettings().idonly), file_.currentsettings().idonly);
         household_->showpeoplelist(true);
         all->setChecked(true);
         all->setEnabled(false);
@@ -459,7 +436,7 @@ void mainfrm::openfamilyfile(const QString& path)
                                      "you are currently entering. Are you sure you want to do this?"),
                       icon::exclamation, answer::no))
         return;
-    watchfile_ = false;
+    const pausewatch paused = file_.pause();
     QString chosen;
     if (path != QLatin1String("-1")) {
         if (!QFileInfo(path).isFile()) {
@@ -468,17 +445,14 @@ void mainfrm::openfamilyfile(const QString& path)
                              icon::exclamation, answer::no, QStringLiteral("Open Recent File")))
                 recent_.remove(path);
             showrecentfiles();
-            watchfile_ = true;
             return;
         }
         chosen = path;
     } else {
         for (;;) {
             const std::optional<QString> f = askforfile(false);
-            if (!f) {
-                watchfile_ = true;
+            if (!f)
                 return;
-            }
             if (QFileInfo(*f).isFile()) {
                 chosen = *f;
                 break;
@@ -486,21 +460,18 @@ void mainfrm::openfamilyfile(const QString& path)
             prompts_.tell(doesnotexist());
         }
     }
-    const QString previous = gedcomfile_;
-    gedcomfile_ = chosen;
-    rememberfile(gedcomfile_, true);
+    const QString previous = file_.path();
+    rememberfile(chosen, true);
     rows_.clear();
-    settitleandpanel();
-    if (!loadfile() && !previous.isEmpty() && index_ && !index_->gedcomfile.isEmpty()) {
+    settitleandpanel(chosen);
+    if (!file_.load(chosen).ok && !previous.isEmpty() && !file_.index()->gedcomfile.isEmpty()) {
         // The file could not be read: the one read before stays open.
-        gedcomfile_ = index_->gedcomfile;
-        settitleandpanel();
+        settitleandpanel(file_.path());
         afterload();
-    } else if (settings_.flagcheck) {
+    } else if (file_.currentsettings().flagcheck) {
         silentflagcheck();
     }
     clearentry();
-    watchfile_ = true;
 }
 
 void mainfrm::closeEvent(QCloseEvent* event)
@@ -515,10 +486,10 @@ void mainfrm::closeEvent(QCloseEvent* event)
     const double dpi = logicalDpiX() > 0 ? logicalDpiX() : 96;
     const QRect g = normalGeometry().isValid() ? normalGeometry() : geometry();
     const QPoint at = isMaximized() ? g.topLeft() : pos();
-    writeplacement(store_, isMaximized(), pixelstotwips(at.y(), dpi), pixelstotwips(at.x(), dpi),
+    writeplacement(file_.store(), isMaximized(), pixelstotwips(at.y(), dpi), pixelstotwips(at.x(), dpi),
                    pixelstotwips(g.width(), dpi), pixelstotwips(g.height(), dpi), panel()->divider());
-    store_.sync();
-    watchfile_ = false;
+    file_.store().sync();
+    idle_.emplace(file_);
     event->accept();
 }
 
@@ -549,20 +520,18 @@ void mainfrm::clearall()
 void mainfrm::runtool(const std::function<void()>& open)
 {
     reloadneeded_ = false;
-    watchfile_ = false;
+    const pausewatch paused = file_.pause();
     open();
     repaint();
     if (reloadneeded_)
         reload();
     reloadneeded_ = false;
-    watchfile_ = true;
 }
 
 void mainfrm::removebackups()
 {
-    watchfile_ = false;
-    removeoldbackups(prompts_, settings_.backupfolder);
-    watchfile_ = true;
+    const pausewatch paused = file_.pause();
+    removeoldbackups(prompts_, file_.currentsettings().backupfolder);
 }
 
 void mainfrm::fillyears()
@@ -572,8 +541,8 @@ void mainfrm::fillyears()
     p->fixeddatetxt->setEnabled(false);
     const QSignalBlocker block(p->yearcom);
     p->yearcom->clear();
-    p->CensusYearLab->setText(censusyearcaption(settings_.country));
-    p->yearcom->addItems(qm::fillyears(settings_.country));
+    p->CensusYearLab->setText(censusyearcaption(file_.currentsettings().country));
+    p->yearcom->addItems(qm::fillyears(file_.currentsettings().country));
     p->yearcom->setCurrentIndex(-1);
 }
 
@@ -584,10 +553,10 @@ void mainfrm::yearchosen(int item)
         return;
     censuschoice c;
     c.yeartext = p->yearcom->currentText().trimmed();
-    c.country = settings_.country;
-    c.autoreference = settings_.autoreference;
-    c.fullentry = settings_.fullentry;
-    QLineEdit* ref = settings_.fullentry ? p->referencetxt : p->wherewithinsourcetxt;
+    c.country = file_.currentsettings().country;
+    c.autoreference = file_.currentsettings().autoreference;
+    c.fullentry = file_.currentsettings().fullentry;
+    QLineEdit* ref = file_.currentsettings().fullentry ? p->referencetxt : p->wherewithinsourcetxt;
     c.referencetext = ref ? ref->text() : QString();
     c.lastrefprefix = lastrefprefix_;
     const censusfound f = findcensus(c);
@@ -602,7 +571,7 @@ void mainfrm::yearchosen(int item)
     p->fixeddatetxt->setEnabled(true);
     datechanged();
 
-    if (index_ && peoplelistshown(*index_)) {
+    if (file_.index() && peoplelistshown(*file_.index())) {
         QCheckBox* all = household_->allpeoplechk;
         all->setEnabled(true);
         const bool was = all->isChecked();
@@ -621,9 +590,9 @@ void mainfrm::refreshtitle()
     entrypanel* p = panel_[0];
     if (sourcemode_ != 0)
         return;
-    p->titletxt->setText(maketitle(settings_.title, p->yearcom->currentText().trimmed(), p->fixeddatetxt->text(),
+    p->titletxt->setText(maketitle(file_.currentsettings().title, p->yearcom->currentText().trimmed(), p->fixeddatetxt->text(),
                                    p->locationtxt->text(), p->addresstxt->text(), p->othertxt->text(),
-                                   p->referencetxt->text().trimmed(), settings_.country));
+                                   p->referencetxt->text().trimmed(), file_.currentsettings().country));
     p->titletxt->setCursorPosition(0);
 }
 
@@ -643,7 +612,7 @@ bool mainfrm::censusdateok(bool normalise)
 {
     entrypanel* p = panel();
     const censusdef* def =
-        lookupcensus(settings_.country, p->yearcom->currentIndex() >= 0 ? p->yearcom->currentText().toInt() : -1);
+        lookupcensus(file_.currentsettings().country, p->yearcom->currentIndex() >= 0 ? p->yearcom->currentText().toInt() : -1);
     const datecheck d = validdate(p->fixeddatetxt->text(), def ? def->date : QString());
     if (d.isdate && normalise && d.newtext)
         p->fixeddatetxt->setText(*d.newtext);

@@ -1,20 +1,23 @@
 #pragma once
 // The main window: the family file open, the census entry form, the household
-// being put together and the menus. It owns the whole working state of the
-// program (index, settings, household); the prompts and the settings store are
-// handed in by main() (tests hand in scripted prompts and an INI store).
+// being put together and the menus. The family file, its index, the settings
+// and the watch for outside changes are the window's openfile (file_); the
+// prompts and the settings store are handed in by main() (tests hand in
+// scripted prompts and an INI store).
 
 #include "app/recentfiles.h"
 #include "census/selection.h"
 #include "model/gedcomindex.h"
 #include "settings/settings.h"
 #include "writer/censusentry.h"
+#include "writer/openfile.h"
 
 #include <QMainWindow>
 
 #include <array>
 #include <functional>
 #include <memory>
+#include <optional>
 
 class QAction;
 class QLabel;
@@ -43,13 +46,14 @@ public:
     // Shows the window as it was placed (maximised when it was closed so).
     void showplaced();
 
-    const gedcomindex* index() const { return index_.get(); }
+    const openfile& file() const { return file_; }
+    const gedcomindex* index() const { return file_.index(); }
     const householdrows& household() const { return rows_; }
-    const settings& currentsettings() const { return settings_; }
+    const settings& currentsettings() const { return file_.currentsettings(); }
     const recentfiles& recent() const { return recent_; }
-    QString gedcomfile() const { return gedcomfile_; }
-    bool firststart() const { return settings_.firststart; }
-    bool watching() const { return watchfile_; }
+    QString gedcomfile() const { return file_.path(); }
+    bool firststart() const { return file_.currentsettings().firststart; }
+    bool watching() const { return file_.watching(); }
     entrypanel* panel() const; // the panel of the current source mode
 
 public slots:
@@ -72,15 +76,16 @@ private:
     void placewindow();
     void rememberfile(const QString& path, bool fromopen);
     void showrecentfiles();
-    void settitleandpanel();
-    bool loadfile();
+    // The title names `path`: the file about to be read, or the one open.
+    void settitleandpanel(const QString& path);
+    // Refills the lists from the index after every read (an openfile listener).
     void afterload();
     void editmenuopening();
     void clearall();
 
     // The menus' tools and dialogs, each defined in its feature's folder.
     // A tool that may rewrite the family file runs with the watch for outside
-    // changes off, and the file is read again afterwards when reloadneeded_ is set.
+    // changes paused, and the file is read again afterwards when reloadneeded_ is set.
     void runtool(const std::function<void()>& open);
     void removebackups();      // mainfrm.cpp
     void viewlog();            // log/logmenu_ui.cpp
@@ -93,7 +98,7 @@ private:
     void showoptions();        // settings/optionsmenu_ui.cpp
     // At start, once the settings are read: the options dialog when the
     // settings are incomplete or their paths fail the checks (same file).
-    void startoptions();
+    void startoptions(const QString& path);
     void donate();             // app/helpmenu_ui.cpp
     void about();              // app/helpmenu_ui.cpp
     void helpkeys();           // app/helpmenu_ui.cpp: F1
@@ -153,11 +158,11 @@ private:
     void pushrows();
 
     prompts& prompts_;
-    settingsstore& store_;
+    openfile file_;
+    // The watch is off until start() has opened the first file, and again
+    // once the window is closing.
+    std::optional<pausewatch> idle_;
 
-    settings settings_;
-    std::unique_ptr<gedcomindex> index_;
-    QString gedcomfile_;
     QString defaultfile_;
     QString gedcomfolder_;
     recentfiles recent_;
@@ -167,7 +172,6 @@ private:
     bool maximise_ = false;
 
     householdrows rows_;
-    bool watchfile_ = false;
     bool checking_ = false;
     bool reloading_ = false;
     QString gonetold_; // the family file the user was told is no longer there

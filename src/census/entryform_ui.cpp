@@ -64,12 +64,12 @@ void mainfrm::connectform()
 void mainfrm::sourcechosen(int item)
 {
     entrypanel* p = panel_[1];
-    if (item < 0 || sourcemode_ != 1 || !index_)
+    if (item < 0 || sourcemode_ != 1 || !file_.index())
         return;
     const int position = p->sourcecom->itemData(item).toInt();
-    if (position < 0 || static_cast<size_t>(position) >= index_->sources.size())
+    if (position < 0 || static_cast<size_t>(position) >= file_.index()->sources.size())
         return;
-    const sourcerec& source = index_->sources[static_cast<size_t>(position)];
+    const sourcerec& source = file_.index()->sources[static_cast<size_t>(position)];
     p->sourceidlab->setText(QString::number(source.id));
     const QString title = qs(source.title);
     for (int y = 0; y < p->yearcom->count(); ++y) {
@@ -102,13 +102,13 @@ std::vector<selectionrec> mainfrm::currentselection() const
     std::vector<selectionrec> out(rows_.selection.begin(),
                                   rows_.selection.begin() + std::min<size_t>(rows_.selection.size(),
                                                                              static_cast<size_t>(rows_.selectioncount)));
-    if (!index_)
+    if (!file_.index())
         return out;
     // Details given before the row was deleted and chosen again still count.
     for (selectionrec& r : out) {
-        if (r.birthedited || r.personindex < 0 || static_cast<size_t>(r.personindex) >= index_->people.size())
+        if (r.birthedited || r.personindex < 0 || static_cast<size_t>(r.personindex) >= file_.index()->people.size())
             continue;
-        const personrec& person = index_->people[static_cast<size_t>(r.personindex)];
+        const personrec& person = file_.index()->people[static_cast<size_t>(r.personindex)];
         if (person.id == r.id && person.birthedited) {
             r.birthedited = true;
             r.birthdate = qs(person.birthdate);
@@ -120,32 +120,32 @@ std::vector<selectionrec> mainfrm::currentselection() const
 
 void mainfrm::askbirthdetails(const QString& entrydate)
 {
-    if (!index_)
+    if (!file_.index())
         return;
     const std::vector<selectionrec> current = currentselection();
     for (size_t i = 0; i < current.size(); ++i) {
         selectionrec& row = rows_.selection[i];
         row = current[i];
-        switch (checkbirth(row, *index_)) {
+        switch (checkbirth(row, *file_.index())) {
         case birthcheck::none:
             break;
         case birthcheck::idmismatch:
             prompts_.tell(idmismatchmessage());
             break;
         case birthcheck::ask: {
-            const std::optional<birthdetails> d = birthfrm::ask(row, entrydate, index_->places, prompts_, this,
+            const std::optional<birthdetails> d = birthfrm::ask(row, entrydate, file_.index()->places, prompts_, this,
                                                                 [this] { prompts_.showhelp(30); });
             if (!d)
                 break;
             d->applyto(row);
             // Kept with the individual until the file is read again, so that
             // the individual is not asked twice.
-            personrec& person = index_->people[static_cast<size_t>(row.personindex)];
+            personrec& person = file_.index()->people[static_cast<size_t>(row.personindex)];
             person.birthedited = true;
-            person.birthdate = index_->arena.store(u8(d->birthdate));
-            person.birthplace = index_->arena.store(u8(d->birthplace));
+            person.birthdate = file_.index()->arena.store(u8(d->birthdate));
+            person.birthplace = file_.index()->arena.store(u8(d->birthplace));
             if (!d->birthplace.isEmpty())
-                insertplace(*index_, u8(d->birthplace));
+                insertplace(*file_.index(), u8(d->birthplace));
             break;
         }
         }
@@ -154,7 +154,7 @@ void mainfrm::askbirthdetails(const QString& entrydate)
 
 void mainfrm::autotextclicked()
 {
-    if (!index_ || !checkages())
+    if (!file_.index() || !checkages())
         return;
     entrypanel* p = panel();
     const QString censusdate = p->fixeddatetxt->text();
@@ -169,7 +169,7 @@ void mainfrm::autotextclicked()
     storerows();
     askbirthdetails(censusdate);
     p->texttxt->setPlainText(
-        withlf(autotext(currentselection(), *index_, censusdate, settings_.country, settings_)));
+        withlf(autotext(currentselection(), *file_.index(), censusdate, file_.currentsettings().country, file_.currentsettings())));
 }
 
 entryform mainfrm::currentform() const
@@ -179,7 +179,7 @@ entryform mainfrm::currentform() const
     f.fullentry = sourcemode_ == 0;
     if (p->yearcom->currentIndex() >= 0) {
         f.yeartext = p->yearcom->currentText().trimmed();
-        if (const censusdef* def = lookupcensus(settings_.country, f.yeartext.toInt()))
+        if (const censusdef* def = lookupcensus(file_.currentsettings().country, f.yeartext.toInt()))
             f.officialdate = def->date;
     }
     f.datetext = p->fixeddatetxt->text();
@@ -212,7 +212,7 @@ void mainfrm::saveentry()
 {
     // Pending clicks are let through below: a second click on Save must not
     // start a second save of the same entry.
-    if (!index_ || saving_)
+    if (!file_.index() || saving_)
         return;
     saving_ = true;
     const struct done {
@@ -226,7 +226,7 @@ void mainfrm::saveentry()
 
     entrypanel* p = panel();
     entryform form = currentform();
-    const entrycheck check = validateentry(form, settings_, &prompts_);
+    const entrycheck check = validateentry(form, file_.currentsettings(), &prompts_);
     if (check.datechanged) {
         // The date as written into the file; the title follows it.
         p->fixeddatetxt->setText(check.entrydate);
@@ -261,33 +261,34 @@ void mainfrm::saveentry()
 
     repaint();
     // The place typed is offered by the place completion from now on.
-    insertplace(*index_, u8(form.place.trimmed()));
-    watchfile_ = false;
+    insertplace(*file_.index(), u8(form.place.trimmed()));
+    std::optional<pausewatch> paused;
+    paused.emplace(file_);
 
-    if (settings_.birthdate)
+    if (file_.currentsettings().birthdate)
         askbirthdetails(entrydate);
 
     std::vector<imagechoice> chosenimages;
-    if (form.fullentry ? settings_.requestimage : settings_.requestimages2) {
-        if (!chooseentryimages(chosenimages)) {
-            watchfile_ = true;
+    if (form.fullentry ? file_.currentsettings().requestimage : file_.currentsettings().requestimages2) {
+        if (!chooseentryimages(chosenimages))
             return;
-        }
     }
 
     busycursor busy(prompts_);
     repaint();
-    if (filechanged(*index_)) {
-        prompts_.tell(changedonsavemessage(index_->gedcomfile, !chosenimages.empty()));
+    if (file_.changed()) {
+        prompts_.tell(changedonsavemessage(file_.index()->gedcomfile, !chosenimages.empty()));
         reload();
-        watchfile_ = true;
         return;
     }
-    watchfile_ = true;
+    paused.reset();
 
     censusentry entry = gatherentry(form, entrydate);
     entry.chosenimages = chosenimages;
-    const saveoutcome out = qm::saveentry(*index_, settings_, entry);
+    rewriterequest request;
+    request.mode = rewritemode::censusentry;
+    request.entry = std::move(entry);
+    const saveoutcome out = file_.save(request);
     switch (tellsaveoutcome(prompts_, out)) {
     case aftersave::saved:
         break;
@@ -302,11 +303,12 @@ void mainfrm::saveentry()
         return;
     }
 
-    watchfile_ = false;
-    loadfile();
-    clearentry();
-    household_->allpeoplelst->clearSelection();
-    watchfile_ = true;
+    {
+        const pausewatch reading = file_.pause();
+        file_.reload();
+        clearentry();
+        household_->allpeoplelst->clearSelection();
+    }
     raisecount();
     milestone();
     panel()->yearcom->setFocus();
@@ -314,15 +316,15 @@ void mainfrm::saveentry()
 
 void mainfrm::raisecount()
 {
-    ++settings_.count;
-    store_.write(QStringLiteral("Count"), QString::number(settings_.count));
-    store_.sync();
+    ++file_.currentsettings().count;
+    file_.store().write(QStringLiteral("Count"), QString::number(file_.currentsettings().count));
+    file_.store().sync();
 }
 
 void mainfrm::endprogram()
 {
     ending_ = true;
-    watchfile_ = false;
+    idle_.emplace(file_);
     close();
     // Only a running event loop can be left (tests drive the window without one).
     if (QThread::currentThread()->loopLevel() > 0)

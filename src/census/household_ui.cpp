@@ -36,23 +36,23 @@ void mainfrm::pushrows()
 void mainfrm::fillallpeople()
 {
     busycursor busy(prompts_);
-    if (index_)
-        household_->people->setpeople(index_.get(), sortedpeople(*index_, settings_.idonly), settings_.idonly);
+    if (file_.index())
+        household_->people->setpeople(file_.index(), sortedpeople(*file_.index(), file_.currentsettings().idonly), file_.currentsettings().idonly);
     household_->setpeoplecaption(QStringLiteral("All Individuals:"));
 }
 
 void mainfrm::fillalivepeople()
 {
-    if (!index_)
+    if (!file_.index())
         return;
     busycursor busy(prompts_);
     entrypanel* p = panel();
     const std::optional<QDate> day = recognisedate(p->fixeddatetxt->text());
     if (!day)
         return;
-    const alivelist alive = couldbealive(*index_, *day, localedateorder());
-    household_->people->setpeople(index_.get(), sortbylabel(*index_, alive.people, settings_.idonly),
-                                  settings_.idonly);
+    const alivelist alive = couldbealive(*file_.index(), *day, localedateorder());
+    household_->people->setpeople(file_.index(), sortbylabel(*file_.index(), alive.people, file_.currentsettings().idonly),
+                                  file_.currentsettings().idonly);
     household_->setpeoplecaption(QStringLiteral("Individuals in ") + p->yearcom->currentText().trimmed() +
                                  QLatin1Char(':'));
     if (alive.toomany)
@@ -64,12 +64,12 @@ void mainfrm::fillalivepeople()
 
 void mainfrm::fillfamily(int32_t k)
 {
-    if (!index_ || k < 0 || static_cast<size_t>(k) >= index_->people.size())
+    if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size())
         return;
     busycursor busy(prompts_);
-    household_->family->setentries(immediatefamily(*index_, k, settings_.idonly));
+    household_->family->setentries(immediatefamily(*file_.index(), k, file_.currentsettings().idonly));
     household_->setfamilycaption(QStringLiteral("Immediate Family of ") +
-                                 qs(index_->people[static_cast<size_t>(k)].name) + QLatin1Char(':'));
+                                 qs(file_.index()->people[static_cast<size_t>(k)].name) + QLatin1Char(':'));
 }
 
 void mainfrm::showallclicked()
@@ -139,12 +139,12 @@ void mainfrm::showrows(int t)
 
 void mainfrm::selectperson(int32_t k)
 {
-    if (!index_ || k < 0 || static_cast<size_t>(k) >= index_->people.size())
+    if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size())
         return;
     if (!checkages())
         return;
     storerows();
-    const personrec& person = index_->people[static_cast<size_t>(k)];
+    const personrec& person = file_.index()->people[static_cast<size_t>(k)];
     if (rows_.has(person.id)) {
         prompts_.tell(QStringLiteral("This individual has already been selected"));
         return;
@@ -209,12 +209,12 @@ void mainfrm::deleterow(int r)
 
 void mainfrm::inforow(int r)
 {
-    if (!index_)
+    if (!file_.index())
         return;
     pullrows();
     const int32_t id = rows_.rows[static_cast<size_t>(r)].id.toInt();
-    for (size_t k = 0; k < index_->people.size(); ++k) {
-        if (index_->people[k].id == id) {
+    for (size_t k = 0; k < file_.index()->people.size(); ++k) {
+        if (file_.index()->people[k].id == id) {
             showpersoninfo(static_cast<int32_t>(k));
             return;
         }
@@ -223,11 +223,11 @@ void mainfrm::inforow(int r)
 
 void mainfrm::showpersoninfo(int32_t k)
 {
-    if (!index_ || k < 0 || static_cast<size_t>(k) >= index_->people.size()) {
+    if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size()) {
         infolab_->clear();
         return;
     }
-    infolab_->setText(personinfo(index_->people[static_cast<size_t>(k)], panel()->fixeddatetxt->text()));
+    infolab_->setText(personinfo(file_.index()->people[static_cast<size_t>(k)], panel()->fixeddatetxt->text()));
 }
 
 void mainfrm::clearentry()
@@ -236,7 +236,7 @@ void mainfrm::clearentry()
     findresult_ = -1;
     pushrows();
     for (entrypanel* p : panel_)
-        p->clearfields(p->mode == 0 && settings_.fullentry);
+        p->clearfields(p->mode == 0 && file_.currentsettings().fullentry);
     infolab_->clear();
     household_->setpeoplecaption(QStringLiteral("All Individuals"));
     Autosourcebut_->setEnabled(false);
@@ -253,19 +253,21 @@ void mainfrm::findclicked()
     } else {
         findresult_ = -1;
     }
-    watchfile_ = false;
-    fromfind_ = false;
-    const int32_t chosen = runfind(findresult_);
-    // The file may have changed while Find was open: it is looked at now, and
-    // the individual chosen found again by record number after a reload (not
-    // in another file opened instead of one that has gone).
-    const int32_t chosenid = chosen >= 0 ? index_->people[static_cast<size_t>(chosen)].id : -1;
-    const QString file = gedcomfile_;
-    watchfile_ = true;
+    int32_t chosenid = -1;
+    {
+        const pausewatch paused = file_.pause();
+        fromfind_ = false;
+        const int32_t chosen = runfind(findresult_);
+        // The file may have changed while Find was open: it is looked at now, and
+        // the individual chosen found again by record number after a reload (not
+        // in another file opened instead of one that has gone).
+        chosenid = chosen >= 0 ? file_.index()->people[static_cast<size_t>(chosen)].id : -1;
+    }
+    const QString file = file_.path();
     checkonactivate();
     findresult_ = -1;
-    for (size_t k = 0; chosenid >= 0 && gedcomfile_ == file && k < index_->people.size() && findresult_ < 0; ++k)
-        if (index_->people[k].id == chosenid)
+    for (size_t k = 0; chosenid >= 0 && file_.path() == file && k < file_.index()->people.size() && findresult_ < 0; ++k)
+        if (file_.index()->people[k].id == chosenid)
             findresult_ = static_cast<int32_t>(k);
     if (findresult_ != -1)
         peopleclicked(-1);
@@ -275,13 +277,13 @@ void mainfrm::findclicked()
 
 void mainfrm::checkonactivate()
 {
-    if (!index_ || index_->people.empty() || checking_ || !watchfile_)
+    if (!file_.index() || file_.index()->people.empty() || checking_ || !file_.watching())
         return;
     checking_ = true;
     repaint();
     QApplication::processEvents();
-    const QString& path = index_->gedcomfile;
-    if (!QFileInfo::exists(path)) {
+    const QString path = file_.index()->gedcomfile;
+    if (file_.missing()) {
         // Reloading could only fail: the user is told once, and may open another file.
         const bool told = gonetold_ == path;
         gonetold_ = path;
@@ -291,8 +293,8 @@ void mainfrm::checkonactivate()
         return;
     }
     gonetold_.clear();
-    if (filechanged(*index_)) {
-        prompts_.tell(changedmessage(index_->gedcomfile));
+    if (file_.changed()) {
+        prompts_.tell(changedmessage(path));
         checking_ = false;
         reload();
         return;
@@ -304,12 +306,9 @@ void mainfrm::reload()
 {
     reloading_ = true;
     storerows();
-    const bool watched = watchfile_;
-    watchfile_ = false;
-    loadfile();
-    watchfile_ = watched;
+    file_.reload();
     if (censusdateok(false)) {
-        if (index_ && peoplelistshown(*index_))
+        if (file_.index() && peoplelistshown(*file_.index()))
             household_->allpeoplechk->setEnabled(true);
         else
             fillalivepeople();
@@ -322,8 +321,8 @@ void mainfrm::reload()
     }
     for (selectionrec& s : rows_.selection)
         s.found = false;
-    for (size_t k = 0; k < index_->people.size(); ++k) {
-        const personrec& p = index_->people[k];
+    for (size_t k = 0; k < file_.index()->people.size(); ++k) {
+        const personrec& p = file_.index()->people[k];
         for (int i = 0; i < rows_.selectioncount; ++i) {
             selectionrec& s = rows_.selection[static_cast<size_t>(i)];
             if (!s.found && s.id == p.id) {

@@ -14,19 +14,18 @@ namespace qm {
 // again when it was rewritten (or changed outside the program).
 void mainfrm::silentflagcheck()
 {
-    if (!index_ || index_->people.empty())
+    if (!file_.index() || file_.index()->people.empty())
         return;
     bool outofstep = false;
     {
         busycursor busy(prompts_);
-        outofstep = flagsoutofstep(*index_);
+        outofstep = flagsoutofstep(*file_.index());
     }
     if (!outofstep)
         return;
     prompts_.tell(flagsoutofsyncmessage());
-    const bool watched = watchfile_;
-    watchfile_ = false;
-    const flagcheckend end = flagcheckfrm::open(*index_, settings_, store_, prompts_, this);
+    const pausewatch paused = file_.pause();
+    const flagcheckend end = flagcheckfrm::open(*file_.index(), file_.currentsettings(), file_.store(), prompts_, this);
     if (end == flagcheckend::fatal) {
         endprogram();
         // At start the event loop is not running yet: leave it as soon as it does.
@@ -35,8 +34,7 @@ void mainfrm::silentflagcheck()
         return;
     }
     if (end == flagcheckend::reload)
-        loadfile();
-    watchfile_ = watched;
+        file_.reload();
 }
 
 } // namespace qm

@@ -10,15 +10,15 @@ namespace qm {
 // when that rewrite failed.
 void mainfrm::censusflags()
 {
-    if (!index_)
+    if (!file_.index())
         return;
     bool fatal = false;
     runtool([this, &fatal] {
         flagfrm* owner = nullptr;
         flagfrm d(
-            *index_, settings_, store_, prompts_,
+            *file_.index(), file_.currentsettings(), file_.store(), prompts_,
             [this, &fatal, &owner] {
-                const flagcheckend end = flagcheckfrm::open(*index_, settings_, store_, prompts_, owner);
+                const flagcheckend end = flagcheckfrm::open(*file_.index(), file_.currentsettings(), file_.store(), prompts_, owner);
                 fatal = end == flagcheckend::fatal;
                 return end != flagcheckend::unchanged;
             },

@@ -9,7 +9,7 @@ namespace qm {
 void mainfrm::attachimages()
 {
     // Nothing to attach to while no family file could be read.
-    if (!index_ || index_->gedcomfile.isEmpty())
+    if (!file_.index() || file_.index()->gedcomfile.isEmpty())
         return;
     bool fatal = false;
     runtool([this, &fatal] {
@@ -19,12 +19,12 @@ void mainfrm::attachimages()
             r.sourcetitle = title;
             r.imagedate = date;
             r.sourcebase = title.trimmed();
-            r.fullentry = settings_.fullentry;
+            r.fullentry = file_.currentsettings().fullentry;
             std::vector<imagechoice> chosen;
-            imagesfrm::choose(r, *index_, settings_, store_, prompts_, chosen, parent);
+            imagesfrm::choose(r, *file_.index(), file_.currentsettings(), file_.store(), prompts_, chosen, parent);
             return chosen;
         };
-        Attachimagesfrm d(*index_, settings_, prompts_, chooser, this);
+        Attachimagesfrm d(*file_.index(), file_.currentsettings(), prompts_, chooser, this);
         d.exec();
         fatal = d.fatal();
         // Images attached, or the file changed outside: read it again.

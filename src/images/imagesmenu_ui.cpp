@@ -14,7 +14,7 @@ namespace qm {
 bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
 {
     chosen.clear();
-    if (!index_)
+    if (!file_.index())
         return true;
     const entrypanel* p = panel();
     imagerequest r;
@@ -31,7 +31,7 @@ bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
         r.sourcebase = p->sourcecom->currentText().trimmed() + QStringLiteral(" (") + where + QStringLiteral(")");
         r.referencebase = where;
     }
-    return imagesfrm::choose(r, *index_, settings_, store_, prompts_, chosen, this);
+    return imagesfrm::choose(r, *file_.index(), file_.currentsettings(), file_.store(), prompts_, chosen, this);
 }
 
 } // namespace qm

@@ -8,12 +8,12 @@ namespace qm {
 // "View Log..." and "Clear Log File".
 void mainfrm::viewlog()
 {
-    logfrm::view(settings_.logpath, prompts_, this);
+    logfrm::view(file_.currentsettings().logpath, prompts_, this);
 }
 
 void mainfrm::clearlogfile()
 {
-    clearlog(prompts_, settings_.logpath);
+    clearlog(prompts_, file_.currentsettings().logpath);
 }
 
 } // namespace qm

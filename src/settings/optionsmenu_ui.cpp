@@ -15,19 +15,19 @@ namespace qm {
 void mainfrm::showoptions()
 {
     runtool([this] {
-        optionsfrm f(prompts_, store_, settings_, [this] { donate(); }, this);
+        optionsfrm f(prompts_, file_.store(), file_.currentsettings(), [this] { donate(); }, this);
         if (f.exec() != QDialog::Accepted)
             return;
-        settings_ = f.saved();
+        file_.usesettings(f.saved());
         if (f.reloadneeded()) {
             clearentry();
-            settitleandpanel();
+            settitleandpanel(file_.path());
             reloadneeded_ = true;
         } else {
-            viewlogmen_->setEnabled(settings_.keeplog);
-            attachbut_->setEnabled(settings_.fullentry);
+            viewlogmen_->setEnabled(file_.currentsettings().keeplog);
+            attachbut_->setEnabled(file_.currentsettings().fullentry);
         }
-        if (settings_.fullentry && !panel_[0]->titletxt->text().isEmpty())
+        if (file_.currentsettings().fullentry && !panel_[0]->titletxt->text().isEmpty())
             refreshtitle();
     });
 }
@@ -35,17 +35,17 @@ void mainfrm::showoptions()
 // At start, once the settings are read: incomplete settings, or paths that
 // fail their checks, are put right in the options dialog before the file is
 // loaded. It cannot be cancelled while the settings are incomplete.
-void mainfrm::startoptions()
+void mainfrm::startoptions(const QString& path)
 {
-    if (!settings_.firststart && checkpaths(prompts_, settings_))
-        settings_.firststart = true;
-    if (!settings_.firststart)
+    if (!file_.currentsettings().firststart && checkpaths(prompts_, file_.currentsettings()))
+        file_.currentsettings().firststart = true;
+    if (!file_.currentsettings().firststart)
         return;
-    optionsfrm f(prompts_, store_, settings_, [this] { donate(); }, this);
+    optionsfrm f(prompts_, file_.store(), file_.currentsettings(), [this] { donate(); }, this);
     if (f.exec() != QDialog::Accepted)
         return;
-    settings_ = f.saved();
-    settitleandpanel();
+    file_.usesettings(f.saved());
+    settitleandpanel(path);
 }
 
 } // namespace qm

@@ -6,6 +6,7 @@
 #include "model/labelorder.h"
 #include "platform/encoding.h"
 #include "settings/settings.h"
+#include "writer/openfile.h"
 
 #include <QDir>
 
@@ -397,12 +398,24 @@ rewriterequest datechangerequest(const std::vector<datechange>& changes)
     return rq;
 }
 
+namespace {
+// Another program's change stops the changes with a message of their own.
+saveoutcome withdatesmessage(saveoutcome out, const QString& gedcomfile)
+{
+    if (out.status == savestatus::changed)
+        out.message = datesnotchangedmessage(gedcomfile);
+    return out;
+}
+} // namespace
+
 saveoutcome makedatechanges(const gedcomindex& index, const settings& s, const std::vector<datechange>& changes)
 {
-    saveoutcome out = savechange(index, s, datechangerequest(changes));
-    if (out.status == savestatus::changed)
-        out.message = datesnotchangedmessage(index.gedcomfile);
-    return out;
+    return withdatesmessage(savechange(index, s, datechangerequest(changes)), index.gedcomfile);
+}
+
+saveoutcome makedatechanges(openfile& file, const std::vector<datechange>& changes)
+{
+    return withdatesmessage(file.save(datechangerequest(changes)), file.index()->gedcomfile);
 }
 
 QString makechangesquestion()

@@ -24,6 +24,7 @@
 namespace qm {
 
 struct gedcomindex;
+class openfile;
 struct settings;
 
 // censusrow of an unrecognised date for which no census can be proposed, and
@@ -125,6 +126,7 @@ private:
 rewriterequest datechangerequest(const std::vector<datechange>& changes);
 // Writes the accepted replacements through the save road.
 saveoutcome makedatechanges(const gedcomindex& index, const settings& s, const std::vector<datechange>& changes);
+saveoutcome makedatechanges(openfile& file, const std::vector<datechange>& changes);
 
 // Question asked before the changes are made.
 QString makechangesquestion();

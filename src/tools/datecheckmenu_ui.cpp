@@ -8,11 +8,11 @@ namespace qm {
 // failed rewrite ends the program.
 void mainfrm::censusdatecheck()
 {
-    if (!index_)
+    if (!file_.index())
         return;
     bool fatal = false;
     runtool([this, &fatal] {
-        Datecheckfrm dialog(prompts_, *index_, settings_, this);
+        Datecheckfrm dialog(prompts_, *file_.index(), file_.currentsettings(), this);
         dialog.exec();
         fatal = dialog.fatal();
         reloadneeded_ = dialog.reloadneeded() && !fatal;

@@ -13,22 +13,22 @@ namespace qm {
 // fromfind_ when the immediate family is to be rebuilt around it.
 int32_t mainfrm::runfind(int32_t start)
 {
-    if (!index_)
+    if (!file_.index())
         return -1;
     std::vector<listentry> entries;
     {
         busycursor busy(prompts_);
         std::vector<listentry> mainlist;
         // Above 32,000 individuals the dialog offers what the people list holds.
-        if (!peoplelistshown(*index_)) {
+        if (!peoplelistshown(*file_.index())) {
             const peoplelistmodel* people = household_->people;
             mainlist.reserve(static_cast<size_t>(people->rowCount()));
             for (int r = 0; r < people->rowCount(); ++r)
                 mainlist.push_back({people->textat(r), people->personat(r)});
         }
-        entries = findlist(*index_, settings_.idonly, std::move(mainlist));
+        entries = findlist(*file_.index(), file_.currentsettings().idonly, std::move(mainlist));
     }
-    findfrm dialog(*index_, std::move(entries), start, prompts_, this);
+    findfrm dialog(*file_.index(), std::move(entries), start, prompts_, this);
     if (dialog.exec() != QDialog::Accepted)
         return -1;
     fromfind_ = dialog.refocus();
