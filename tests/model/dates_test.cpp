@@ -87,6 +87,7 @@ TEST(Formatgedcomdate, StampsAndMonths)
 {
     EXPECT_EQ(formatgedcomdate(d(2026, 12, 4)), "04 DEC 2026");
     EXPECT_EQ(formatgedcomdate(d(1851, 3, 30)), "30 MAR 1851");
+    EXPECT_EQ(formatgedcomdate(d(987, 12, 31)), "31 DEC 0987");
     EXPECT_EQ(formatgedcomdate(QDate()), "");
     EXPECT_EQ(formatgedcomtime(QTime(9, 5, 7)), "09:05:07");
     EXPECT_EQ(englishmonth(9), "SEP");

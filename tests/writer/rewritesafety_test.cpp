@@ -277,31 +277,19 @@ TEST(RewriteRefusal, OtherCharacterSetsKeepTheirBytesAndTakeAsciiText)
 
 TEST_F(RewriteFaults, FailuresLeaveTheFamilyFileAsItWas)
 {
+    // (A file that cannot be created or replaced: SaveRoadFault.)
     const rewriterequest r = entry(*ix);
-    const QString expected =
-        QStringLiteral("An error occurred (Permission denied): Census entry not added and program will close when you press OK");
-
-    setwritefaultfortests({.failopen = true});
-    rewriteresult res = rewritefile(backup, family, *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    EXPECT_FALSE(res.refused);
-    EXPECT_EQ(res.message, expected);
-    expectuntouched();
-
+    rewriteresult res;
     const auto size = static_cast<int64_t>(expectedtext("UTF-8").size());
     for (int64_t after : {int64_t(0), int64_t(1), int64_t(40), size / 2, size - 1}) {
         setwritefaultfortests({.failafterbytes = after});
         res = rewritefile(backup, family, *ix, settings{}, r);
         EXPECT_FALSE(res.ok) << after;
+        EXPECT_FALSE(res.refused);
         EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (No space left on device): Census entry")))
             << res.message.toStdString();
         expectuntouched();
     }
-
-    setwritefaultfortests({.failcommit = true});
-    res = rewritefile(backup, family, *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    expectuntouched();
 
     // The same run without a fault goes through, also reading the family file itself.
     setwritefaultfortests({});
@@ -313,14 +301,10 @@ TEST_F(RewriteFaults, FailuresLeaveTheFamilyFileAsItWas)
 TEST_F(RewriteFaults, FilesThatCannotBeOpenedAreReported)
 {
     const rewriterequest r = entry(*ix);
-    rewriteresult res = rewritefile(dir.filePath(QStringLiteral("missing.ged")), family, *ix, settings{}, r);
+    const rewriteresult res = rewritefile(dir.filePath(QStringLiteral("missing.ged")), family, *ix, settings{}, r);
     EXPECT_FALSE(res.ok);
     EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (")));
     EXPECT_TRUE(res.message.endsWith(QStringLiteral("): Census entry not added and program will close when you press OK")));
-    expectuntouched();
-
-    res = rewritefile(backup, dir.filePath(QStringLiteral("no such folder/family.ged")), *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
     expectuntouched();
 }
 
