@@ -36,11 +36,3 @@ TEST(Encoding, RefusesWhatTheFileCannotHold)
     EXPECT_EQ(unencodable(QStringLiteral("Caf\u00e9"), textencoding::windows1252), 0u);
     EXPECT_EQ(unencodable(QStringLiteral("\u0141\u00f3d\u017a"), textencoding::windows1252), U'\u0141');
 }
-
-TEST(Encoding, CharacterSetNames)
-{
-    EXPECT_EQ(encodingforchar("UTF-8"), textencoding::utf8);
-    EXPECT_EQ(encodingforchar("ANSI"), textencoding::windows1252);
-    EXPECT_EQ(encodingforchar("ANSEL"), textencoding::other8bit);
-    EXPECT_STREQ(encodingname(textencoding::utf16be), "utf-16");
-}
