@@ -251,31 +251,6 @@ TEST_F(RewriteEdges, FlagsAreChangedInTheirOwnBlockWhereverItStands)
               join({{"1 _FLGS", "2 __C1881 Census 1881", "2 __C1891 Census 1891"}, stamp}));
 }
 
-TEST_F(RewriteEdges, OccupationDatesChangeOnlyWithAMatchingCensusCitation)
-{
-    const std::string input = "0 HEAD\r\n"
-                              "0 @I1@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n2 SOUR @S1@\r\n"
-                              "1 OCCU Weaver\r\n2 DATE 1881\r\n2 PLAC Leeds\r\n2 SOUR @S2@\r\n" // other source: kept
-                              "1 OCCU Spinner\r\n2 DATE 1881\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"    // changed
-                              "0 @I2@ INDI\r\n1 OCCU Carter\r\n2 DATE 1881\r\n2 SOUR @S1@\r\n"  // no census event
-                              "0 TRLR\r\n";
-    rewriterequest r;
-    r.mode = rewritemode::censusdates;
-    datechange d;
-    d.founddate = QStringLiteral("1881");
-    d.newdate = QStringLiteral("3 APR 1881");
-    r.datechanges = {d};
-    const run x = rewrite(input, settings{}, r);
-    ASSERT_TRUE(x.result.ok);
-    EXPECT_EQ(x.result.censusdateschanged, 1);
-    EXPECT_EQ(x.result.occdateschanged, 1);
-    EXPECT_EQ(x.out, (std::vector<std::string>{
-                         "0 HEAD", "0 @I1@ INDI", "1 CENS", "2 DATE 3 APR 1881", "2 SOUR @S1@", "1 OCCU Weaver",
-                         "2 DATE 1881", "2 PLAC Leeds", "2 SOUR @S2@", "1 OCCU Spinner", "2 DATE 3 APR 1881", "2 NOTE x",
-                         "2 SOUR @S1@", "1 CHAN", "2 DATE 04 MAY 2026", "3 TIME 07:08:09", "0 @I2@ INDI", "1 OCCU Carter",
-                         "2 DATE 1881", "2 SOUR @S1@", "0 TRLR"}));
-}
-
 // Identifiers other programs write: records are cited as they are named, and
 // an identifier that cannot tell records apart, or a number that is not left,
 // refuses the change before anything is written.
