@@ -298,16 +298,6 @@ TEST_F(RewriteFaults, FailuresLeaveTheFamilyFileAsItWas)
     EXPECT_EQ(readfile(family), expectedtext("UTF-8"));
 }
 
-TEST_F(RewriteFaults, FilesThatCannotBeOpenedAreReported)
-{
-    const rewriterequest r = entry(*ix);
-    const rewriteresult res = rewritefile(dir.filePath(QStringLiteral("missing.ged")), family, *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (")));
-    EXPECT_TRUE(res.message.endsWith(QStringLiteral("): Census entry not added and program will close when you press OK")));
-    expectuntouched();
-}
-
 #ifdef Q_OS_LINUX
 // A write the system refuses (here: past the largest file this process may
 // write) is reported in the system's words, never as "Unknown error".
