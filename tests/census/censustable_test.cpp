@@ -28,7 +28,7 @@ TEST(Censustable, TheThirtyThreeCensusesInTheirFixedOrder)
     EXPECT_EQ(table.join(u'\n').toStdString(), rows.join(u'\n').toStdString());
 }
 
-TEST(Censustable, YearListsPerCountry)
+TEST(Censustable, YearListsAndLookupsTakeTheCountrysRows)
 {
     EXPECT_EQ(fillyears(u"UK"_s), QStringList({"1841", "1851", "1861", "1871", "1881", "1891", "1901"}));
     QStringList usa;
@@ -42,10 +42,7 @@ TEST(Censustable, YearListsPerCountry)
     EXPECT_TRUE(fillyears(u"uk"_s).isEmpty());
     EXPECT_TRUE(fillyears(u""_s).isEmpty());
     EXPECT_EQ(censusyearcaption(u"Canada"_s), "Canada Census Year:");
-}
 
-TEST(Censustable, LookupTakesTheCountrysRow)
-{
     EXPECT_EQ(findcensusrow(u"UK"_s, 1901), 6);
     EXPECT_EQ(findcensusrow(u"Ireland"_s, 1901), 22);
     EXPECT_EQ(findcensusrow(u"Canada"_s, 1901), 31);

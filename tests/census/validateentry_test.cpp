@@ -40,14 +40,6 @@ protected:
 
 } // namespace
 
-TEST_F(ValidateEntry, AcceptsCompleteEntry)
-{
-    const entrycheck c = check();
-    EXPECT_TRUE(c.ok) << c.message.toStdString();
-    EXPECT_EQ(c.entrydate, QStringLiteral("3 APR 1881"));
-    EXPECT_FALSE(c.datechanged);
-}
-
 TEST_F(ValidateEntry, ChecksInTheirOrder)
 {
     // Everything wrong at once: each fix reveals the next check's message.
@@ -95,10 +87,15 @@ TEST_F(ValidateEntry, TitleAndWhereWithinSourceLengths)
     EXPECT_TRUE(check().ok);
 }
 
-TEST_F(ValidateEntry, DateIsNormalised)
+TEST_F(ValidateEntry, AcceptsCompleteEntryAndNormalisesItsDate)
 {
+    entrycheck c = check();
+    EXPECT_TRUE(c.ok) << c.message.toStdString();
+    EXPECT_EQ(c.entrydate, QStringLiteral("3 APR 1881"));
+    EXPECT_FALSE(c.datechanged);
+
     f.datetext = QStringLiteral("4 apr 1881");
-    const entrycheck c = check();
+    c = check();
     ASSERT_TRUE(c.ok);
     EXPECT_EQ(c.entrydate, QStringLiteral("04 APR 1881"));
     EXPECT_TRUE(c.datechanged);

@@ -262,19 +262,6 @@ protected:
     }
 };
 
-TEST_F(FlagRewrite, RemovingTheLastFlagDropsItsHeader)
-{
-    const std::string input = family(indi(1, "Mary /Smith/", flags({"__CENSUS_1881 Census 1881"}) + "1 SEX F\r\n") +
-                                     indi(2, "Tom /Smith/", "1 SEX M\r\n"));
-    const std::string out = apply(input);
-    EXPECT_EQ(out.find("_FLGS"), std::string::npos) << out;
-    EXPECT_EQ(out.find("__CENSUS_1881"), std::string::npos) << out;
-    EXPECT_NE(out.find("1 NAME Mary /Smith/\r\n1 SEX F\r\n1 CHAN\r\n2 DATE 06 DEC 2026\r\n"), std::string::npos)
-        << out;
-    EXPECT_NE(out.find("0 @I2@ INDI\r\n1 NAME Tom /Smith/\r\n1 SEX M\r\n0 TRLR"), std::string::npos) << out;
-    EXPECT_FALSE(flagsoutofstep(*load(out)));
-}
-
 TEST_F(FlagRewrite, AddsAndRemovalsLeaveTheFileInStep)
 {
     const std::string input = family(

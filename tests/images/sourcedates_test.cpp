@@ -58,52 +58,35 @@ std::string event(const char* tag, const char* date, int source)
 
 } // namespace
 
+// A source's census date is the one date every census event citing it shares.
 TEST(SourceDates, OneDateSharedByEveryCitationIsTheCensusDate)
 {
-    const indexed x = withdates(person(1, event("CENS", "3 APR 1881", 1)) + person(2, event("CENS", "3 apr 1881 ", 1)));
-    EXPECT_EQ(x.source(1).censusdate, "3 APR 1881");
-    EXPECT_FALSE(x.source(1).censusdatesought);
-    EXPECT_EQ(sourcedatetext(x.source(1)), "3 APR 1881");
-    // Never cited: nothing known.
-    EXPECT_EQ(x.source(2).censusdate, "");
-    EXPECT_EQ(sourcedatetext(x.source(2)), "Unknown");
-}
-
-TEST(SourceDates, DifferingOrQualifiedDatesAreUnknown)
-{
-    const indexed x = withdates(person(1, event("CENS", "3 APR 1881", 1) + event("CENS", "ABT 1881", 2))
-                                + person(2, event("CENS", "4 APR 1881", 1) + event("CENS", "3 APR 1881", 2)));
-    EXPECT_TRUE(x.source(1).censusdatesought);
-    EXPECT_EQ(sourcedatetext(x.source(1)), "Unknown");
-    // The qualified date came first: a later plain one does not settle it.
-    EXPECT_TRUE(x.source(2).censusdatesought);
-    EXPECT_EQ(sourcedatetext(x.source(2)), "Unknown");
-
-    const indexed year = withdates(person(1, event("CENS", "1881", 1)));
-    EXPECT_EQ(sourcedatetext(year.source(1)), "Unknown");
-}
-
-TEST(SourceDates, BirthEventsCitingACensusSourceArePassedOver)
-{
-    const std::string birth = event("BIRT", "12 MAY 1850", 1);
-    const std::string census = event("CENS", "3 APR 1881", 1);
-    EXPECT_EQ(sourcedatetext(withdates(person(1, birth + census)).source(1)), "3 APR 1881");
-    EXPECT_EQ(sourcedatetext(withdates(person(1, census + birth)).source(1)), "3 APR 1881");
-    // Other sources take a birth event's date like any other.
-    EXPECT_EQ(sourcedatetext(withdates(person(1, event("BIRT", "12 MAY 1850", 3))).source(3)), "12 MAY 1850");
-}
-
-TEST(SourceDates, CitationsWithoutADateOfTheirEventAreIgnored)
-{
-    // The citation comes before the event's date; change stamps never count;
-    // a new record ends the event before it.
-    const indexed x = withdates(person(1, "1 CENS\r\n2 SOUR @S1@\r\n2 DATE 4 APR 1881\r\n"
-                                          "1 CHAN\r\n2 DATE 9 MAY 2022\r\n2 SOUR @S1@\r\n"
-                                          "1 RESI\r\n2 DATE 3 APR 1881\r\n")
-                                + "0 @I2@ INDI\r\n2 SOUR @S1@\r\n"
-                                + person(3, "  1 CENS\r\n\t2 DATE 3 APR 1881\r\n  2 SOUR @S1@\r\n"));
-    EXPECT_EQ(x.source(1).censusdate, "3 APR 1881");
-    EXPECT_FALSE(x.source(1).censusdatesought);
+    const std::string census = event("CENS", "3 APR 1881", 1), birth = event("BIRT", "12 MAY 1850", 1);
+    const struct {
+        std::string individuals;
+        int32_t source;
+        const char* date;
+    } cases[] = {
+        {person(1, census) + person(2, event("CENS", "3 apr 1881 ", 1)), 1, "3 APR 1881"},
+        {person(1, census), 2, "Unknown"}, // never cited
+        {person(1, census) + person(2, event("CENS", "4 APR 1881", 1)), 1, "Unknown"},
+        // A qualified date first: a later plain one does not settle it.
+        {person(1, event("CENS", "ABT 1881", 1)) + person(2, census), 1, "Unknown"},
+        {person(1, event("CENS", "1881", 1)), 1, "Unknown"},
+        // Birth events citing a census source are passed over; other sources
+        // take a birth's date like any other.
+        {person(1, birth + census), 1, "3 APR 1881"},
+        {person(1, census + birth), 1, "3 APR 1881"},
+        {person(1, event("BIRT", "12 MAY 1850", 3)), 3, "12 MAY 1850"},
+        // A citation before its event's date, or in a change stamp, or in a
+        // record of its own, counts for nothing; indented lines are read.
+        {person(1, "1 CENS\r\n2 SOUR @S1@\r\n2 DATE 4 APR 1881\r\n1 CHAN\r\n2 DATE 9 MAY 2022\r\n2 SOUR @S1@\r\n"
+                   "1 RESI\r\n2 DATE 3 APR 1881\r\n")
+             + "0 @I2@ INDI\r\n2 SOUR @S1@\r\n" + person(3, "  1 CENS\r\n\t2 DATE 3 APR 1881\r\n  2 SOUR @S1@\r\n"),
+         1, "3 APR 1881"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(sourcedatetext(withdates(c.individuals).source(c.source)), QString::fromLatin1(c.date)) << c.individuals;
 }
 
 TEST(SourceDates, SettledSourcesKeepTheirDates)

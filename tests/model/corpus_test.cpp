@@ -75,32 +75,3 @@ TEST(CorpusLoad, EveryFileLoadsWithItsIndividuals)
             EXPECT_LT(qm::placekey(r.index->places[i - 1].name), qm::placekey(r.index->places[i].name));
     }
 }
-
-TEST(CorpusLoad, KnownFiles)
-{
-    if (qmtest::corpusdir().isEmpty())
-        GTEST_SKIP() << "the shared corpus folder is absent";
-    const QString dir = qmtest::corpusdir();
-    // Torture test: ANSEL read as Windows-1252, CR line ends; of its 15
-    // individuals 7 have identifiers "@I...@" (the others are "@PERSON...@").
-    const qm::loadresult t = qm::loadgedcom(dir + QStringLiteral("/torture/TGC551.ged"), {});
-    ASSERT_TRUE(t.index);
-    EXPECT_EQ(t.index->people.size(), 7u);
-    EXPECT_EQ(t.index->people[0].id, 14);
-    EXPECT_EQ(t.index->encoding, qm::textencoding::other8bit);
-    // The same file in UTF-16 both ways round and in UTF-8 gives the same people.
-    const auto be = qm::loadgedcom(dir + QStringLiteral("/encodings/willis-unicode-bigendian.ged"), {});
-    const auto le = qm::loadgedcom(dir + QStringLiteral("/encodings/willis-unicode-littleendian.ged"), {});
-    ASSERT_TRUE(be.index && le.index);
-    EXPECT_EQ(be.index->encoding, qm::textencoding::utf16be);
-    EXPECT_EQ(le.index->encoding, qm::textencoding::utf16le);
-    ASSERT_EQ(be.index->people.size(), le.index->people.size());
-    ASSERT_GT(be.index->people.size(), 0u);
-    for (size_t i = 0; i < be.index->people.size(); ++i)
-        ASSERT_EQ(be.index->people[i].name, le.index->people[i].name);
-    // Indented lines are recognised.
-    const auto geni = qm::loadgedcom(dir + QStringLiteral("/edge/geni-indented-issue166.ged"), {});
-    ASSERT_TRUE(geni.index);
-    ASSERT_EQ(geni.index->people.size(), 5u);
-    EXPECT_NE(geni.index->people[0].name, "<no name>");
-}

@@ -87,6 +87,7 @@ TEST(Formatgedcomdate, StampsAndMonths)
 {
     EXPECT_EQ(formatgedcomdate(d(2026, 12, 4)), "04 DEC 2026");
     EXPECT_EQ(formatgedcomdate(d(1851, 3, 30)), "30 MAR 1851");
+    EXPECT_EQ(formatgedcomdate(d(987, 12, 31)), "31 DEC 0987");
     EXPECT_EQ(formatgedcomdate(QDate()), "");
     EXPECT_EQ(formatgedcomtime(QTime(9, 5, 7)), "09:05:07");
     EXPECT_EQ(englishmonth(9), "SEP");
@@ -131,6 +132,14 @@ TEST(Datephrase, PhrasesAndAges)
         {"EST 3 MAR 1851", census1881, "on 3 Mar 1851 (estimated)", "30 (estimated)"},
         {"CAL MAR 1851", none, "in Mar 1851 (calculated)", ""},
         {"ABT", census1881, "in (approx.)", ""},
+        // Words of two or more characters not starting with a digit are
+        // capitalised; single characters and numbers are lower case. Split at
+        // single spaces, twelve words at most: the last keeps the rest.
+        {"@#DJULIAN@ 3 mar 1751", none, "in @#djulian@ 3 Mar 1751", ""},
+        {"3 MAR 1851 A", none, "on 3 Mar 1851 a", ""},
+        {"1851 and 1852", none, "in 1851 and 1852", ""},
+        {"3  MAR", none, "on 3  Mar", ""},
+        {"A B C D E F G H I J K LL MM", none, "in a b c d e f g h i j k Ll mm", ""},
     };
     for (const auto& c : cases) {
         const auto r = datephrase(QString::fromLatin1(c.text), c.census, dateorder::dmy);
@@ -178,19 +187,6 @@ TEST(Datephrase, YearsAloneAgreeWithThePhrase)
         }
     }
     EXPECT_EQ(dateyears(u"ABT 1851", census1881, dateorder::dmy).latestyear, 1851);
-}
-
-TEST(Datephrase, WordStyles)
-{
-    // Words of two or more characters not starting with a digit are
-    // capitalised; single characters and numbers are lower case.
-    EXPECT_EQ(datephrase(u"@#DJULIAN@ 3 mar 1751", std::nullopt, dateorder::dmy).phrase, "in @#djulian@ 3 Mar 1751");
-    EXPECT_EQ(datephrase(u"3 MAR 1851 A", std::nullopt, dateorder::dmy).phrase, "on 3 Mar 1851 a");
-    EXPECT_EQ(datephrase(u"1851 and 1852", std::nullopt, dateorder::dmy).phrase, "in 1851 and 1852");
-    // Split at single spaces, twelve words at most: the last keeps the rest.
-    EXPECT_EQ(datephrase(u"3  MAR", std::nullopt, dateorder::dmy).phrase, "on 3  Mar");
-    EXPECT_EQ(datephrase(u"A B C D E F G H I J K LL MM", std::nullopt, dateorder::dmy).phrase,
-              "in a b c d e f g h i j k Ll mm");
 }
 
 TEST(Personinfo, TheLineForAnIndividual)

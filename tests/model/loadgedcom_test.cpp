@@ -214,23 +214,6 @@ TEST(LoadGedcom, PlacesFoldNonAsciiLetters)
     EXPECT_EQ(findplace(*ix, "z\xC3\xBCRICH"), 1);
 }
 
-TEST(LoadGedcom, SortAndCountPlaces)
-{
-    gedcomindex ix;
-    for (const char* n : {"york", "Leeds", "bath", "LEEDS", "York", "Bath"})
-        ix.places.push_back({ix.arena.store(n), 1});
-    sortplaces(ix, 0, 2);
-    EXPECT_EQ(sv(ix.places[0].name), "bath");
-    EXPECT_EQ(sv(ix.places[2].name), "york");
-    countplaces(ix);
-    ASSERT_EQ(ix.places.size(), 3u);
-    EXPECT_EQ(sv(ix.places[0].name), "bath");
-    EXPECT_EQ(ix.places[0].count, 2);
-    EXPECT_EQ(sv(ix.places[1].name), "Leeds");
-    EXPECT_EQ(ix.places[1].count, 2);
-    EXPECT_EQ(placekey("Leeds"), "leeds");
-}
-
 TEST(LoadGedcom, PeopleListOrderAndLimit)
 {
     auto ix = load(ged("0 @I1@ INDI\n1 NAME Zoe /smith/\n0 @I2@ INDI\n1 NAME Al /Brown/\n"

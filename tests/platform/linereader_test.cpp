@@ -95,30 +95,6 @@ TEST(LineReader, FindsTheCharacterSet)
     EXPECT_EQ(bom.lines[0], "0 HEAD");
 }
 
-TEST(LineReader, DecodesUtf16)
-{
-    const std::u16string text = u"0 HEAD\r\n1 NAME J\u00f6rg /M\u00fcller/\r\n";
-    std::string le("\xFF\xFE", 2), be("\xFE\xFF", 2), nobom;
-    for (char16_t c : text) {
-        le += static_cast<char>(c & 0xFF);
-        le += static_cast<char>(c >> 8);
-        be += static_cast<char>(c >> 8);
-        be += static_cast<char>(c & 0xFF);
-        nobom += static_cast<char>(c & 0xFF);
-        nobom += static_cast<char>(c >> 8);
-    }
-    for (const auto& [bytes, enc, bom] : {std::tuple{le, textencoding::utf16le, true},
-                                          std::tuple{be, textencoding::utf16be, true},
-                                          std::tuple{nobom, textencoding::utf16le, false}}) {
-        const auto r = readall(bytes);
-        EXPECT_EQ(r.enc, enc);
-        EXPECT_EQ(r.bom, bom);
-        ASSERT_EQ(r.lines.size(), 2u);
-        EXPECT_EQ(r.lines[1], "1 NAME J\xC3\xB6rg /M\xC3\xBCller/");
-        EXPECT_EQ(r.ends[1], "\r\n");
-    }
-}
-
 TEST(LineReader, RunsOfCrLfLinesMatchLineByLine)
 {
     // Mostly CR LF lines, with lines that stop a run (a "0" or a blank first,

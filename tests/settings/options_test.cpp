@@ -139,6 +139,7 @@ TEST_F(OptionsSave, UnchangedFormSavesWithoutQuestionsAndClearsFirstStart)
     form.sourcetype = "  Census Return ";
     form.title = " {YEAR} {PLACE} ";
     form.logpath = "  " + current.logpath + " ";
+    form.backupfolder = "  " + QDir::toNativeSeparators(dir.filePath("backups") + "/") + " ";
     const optionssave r = save();
     ASSERT_TRUE(r.saved());
     EXPECT_FALSE(r.reloadneeded);
@@ -150,18 +151,25 @@ TEST_F(OptionsSave, UnchangedFormSavesWithoutQuestionsAndClearsFirstStart)
     EXPECT_TRUE(prompts.history().empty());
     EXPECT_EQ(store->read("Source Type"), "Census Return");
     EXPECT_EQ(store->read("Log Path"), current.logpath);
+    EXPECT_EQ(r.values.backupfolder, current.backupfolder) << "without its trailing separator";
+    EXPECT_EQ(store->read("Backup Folder"), current.backupfolder);
     EXPECT_TRUE(written());
 }
 
-TEST_F(OptionsSave, WithoutKeepLogTheLogFileIsNeitherCreatedNorChecked)
+// Without "Keep Log" the log file is neither created nor checked; an unticked
+// separator keeps an empty character.
+TEST_F(OptionsSave, UntickedBoxesLeaveTheirValuesUnchecked)
 {
     form.keeplog = false;
     form.logpath = dir.filePath("no such folder/log.txt");
+    form.alternateseparator = false;
+    form.alternateseparatorcharacter.clear();
     const optionssave r = save();
     ASSERT_TRUE(r.saved());
     EXPECT_FALSE(r.values.keeplog);
     EXPECT_FALSE(QFileInfo::exists(dir.filePath("no such folder")));
     EXPECT_EQ(store->read("Keep Log"), "0");
+    EXPECT_EQ(store->read("Alternate Separator Character"), "");
 }
 
 // Each change that needs the file read again is asked about, No stops the save;
@@ -240,23 +248,6 @@ TEST_F(OptionsSave, EachStopShowsItsMessageAndWritesNothing)
     }
     EXPECT_FALSE(QFileInfo::exists(dir.filePath("family.GED")));
     EXPECT_FALSE(QFileInfo::exists(dir.filePath("backups/log.txt")));
-}
-
-TEST_F(OptionsSave, UntickedSeparatorKeepsAnEmptyCharacter)
-{
-    form.alternateseparator = false;
-    form.alternateseparatorcharacter.clear();
-    ASSERT_TRUE(save().saved());
-    EXPECT_EQ(store->read("Alternate Separator Character"), "");
-}
-
-TEST_F(OptionsSave, BackupFolderIsStoredWithoutItsTrailingSeparator)
-{
-    form.backupfolder = "  " + QDir::toNativeSeparators(dir.filePath("backups") + "/") + " ";
-    const optionssave r = save();
-    ASSERT_TRUE(r.saved());
-    EXPECT_EQ(r.values.backupfolder, QDir::toNativeSeparators(dir.filePath("backups")));
-    EXPECT_EQ(store->read("Backup Folder"), QDir::toNativeSeparators(dir.filePath("backups")));
 }
 
 TEST_F(OptionsSave, EverySettingOfTheFormIsStored)

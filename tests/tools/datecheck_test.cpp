@@ -262,7 +262,8 @@ TEST(DateCheck, Details)
 }
 
 // The accepted replacements written to the file, with the occupation dates
-// that cite the census event's source.
+// that cite the census event's source (whatever lines come between), and
+// only those of an individual with that census event.
 TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
 {
     QTemporaryDir dir;
@@ -272,12 +273,13 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
                       "0 HEAD\r\n1 CHAR ANSI\r\n"
                       "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
                       "1 CENS\r\n2 DATE ABT 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
-                      "1 OCCU Weaver\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
+                      "1 OCCU Weaver\r\n2 DATE ABT 1851\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"
                       "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
                       "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
                       "1 CENS\r\n2 DATE ABT 1650\r\n"
                       "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
                       "0 @I3@ INDI\r\n1 CENS\r\n2 DATE ABT 1851 \r\n"
+                      "0 @I4@ INDI\r\n1 OCCU Miner\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
                       "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE ABT 1851\r\n"
                       "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
     loadresult r = loadgedcom(path, flagtable{});
@@ -302,7 +304,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
               "0 HEAD\r\n1 CHAR ANSI\r\n"
               "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
               "1 CENS\r\n2 DATE 30 MAR 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
-              "1 OCCU Weaver\r\n2 DATE 30 MAR 1851\r\n2 SOUR @S1@\r\n"
+              "1 OCCU Weaver\r\n2 DATE 30 MAR 1851\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"
               "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
               "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
               "1 CENS\r\n2 DATE ABT 1650\r\n"
@@ -310,6 +312,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
               "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
               "0 @I3@ INDI\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
               "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
+              "0 @I4@ INDI\r\n1 OCCU Miner\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
               "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
               "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
               "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");

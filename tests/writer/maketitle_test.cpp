@@ -4,54 +4,38 @@
 
 using qm::maketitle;
 
-namespace {
-const QString deftemplate = QStringLiteral("Census {YEAR} {PLACE} {REF} ({OTHER})");
-
-QString title(const QString& templ, const QString& other = QStringLiteral("John Smith"))
+TEST(MakeTitle, PlaceholdersBracketsAndSpaces)
 {
-    return maketitle(templ, QStringLiteral("1851"), QStringLiteral("30 MAR 1851"),
-                     QStringLiteral("Warrington, Lancashire"), QStringLiteral("43 Knutsford Road"), other,
-                     QStringLiteral("HO107/2204/151"), QStringLiteral("UK"));
-}
-} // namespace
+    const QString deftemplate = QStringLiteral("Census {YEAR} {PLACE} {REF} ({OTHER})");
+    const auto title = [](const QString& templ, const QString& other) {
+        return maketitle(templ, QStringLiteral("1851"), QStringLiteral("30 MAR 1851"),
+                         QStringLiteral("Warrington, Lancashire"), QStringLiteral("43 Knutsford Road"), other,
+                         QStringLiteral("HO107/2204/151"), QStringLiteral("UK"));
+    };
+    const struct {
+        QString templ;
+        const char* other;
+        const char* title;
+    } cases[] = {
+        {deftemplate, "John Smith", "Census 1851 Warrington, Lancashire HO107/2204/151 (John Smith)"},
+        {QStringLiteral("{COUNTRY} {DATE} {ADDR}"), "", "UK 30 MAR 1851 43 Knutsford Road"},
+        // An empty {OTHER} leaves no brackets but keeps the space before them.
+        {deftemplate, "", "Census 1851 Warrington, Lancashire HO107/2204/151 "},
+        {QStringLiteral("{year} {YEAR}"), "", "{year} 1851"}, // case counts
+        // Nested empty brackets go and spaces collapse; removing brackets can
+        // bring spaces together again.
+        {QStringLiteral("A (({OTHER}))    B"), "", "A B"},
+        {QStringLiteral("A ( ) B"), "", "A ( ) B"},
+        {QStringLiteral("A () () B"), "", "A B"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(title(c.templ, QString::fromLatin1(c.other)), QString::fromLatin1(c.title)) << c.templ.toStdString();
 
-TEST(MakeTitle, DefaultTemplateFillsEveryPlaceholder)
-{
-    EXPECT_EQ(title(deftemplate), QStringLiteral("Census 1851 Warrington, Lancashire HO107/2204/151 (John Smith)"));
-    EXPECT_EQ(title(QStringLiteral("{COUNTRY} {DATE} {ADDR}")), QStringLiteral("UK 30 MAR 1851 43 Knutsford Road"));
-}
-
-TEST(MakeTitle, EmptyOtherLeavesNoBracketsButKeepsTrailingSpace)
-{
-    EXPECT_EQ(title(deftemplate, QString()), QStringLiteral("Census 1851 Warrington, Lancashire HO107/2204/151 "));
-}
-
-TEST(MakeTitle, AllEmptyGivesNoTitle)
-{
     EXPECT_EQ(maketitle(QStringLiteral("{YEAR}({OTHER})"), {}, {}, {}, {}, {}, {}, {}), QStringLiteral("{No Title}"));
     EXPECT_EQ(maketitle(QString(), {}, {}, {}, {}, {}, {}, {}), QStringLiteral("{No Title}"));
-}
-
-TEST(MakeTitle, PlaceholdersAreCaseSensitive)
-{
-    EXPECT_EQ(title(QStringLiteral("{year} {YEAR}")), QStringLiteral("{year} 1851"));
-}
-
-TEST(MakeTitle, NestedEmptyBracketsAndSpacesCollapse)
-{
-    EXPECT_EQ(title(QStringLiteral("A (({OTHER}))    B"), QString()), QStringLiteral("A B"));
-    // Removing brackets can bring spaces together again.
-    EXPECT_EQ(title(QStringLiteral("A ( ) B"), QString()), QStringLiteral("A ( ) B"));
-    EXPECT_EQ(title(QStringLiteral("A () () B"), QString()), QStringLiteral("A B"));
-}
-
-TEST(MakeTitle, ValueHoldingLaterPlaceholderIsReplacedToo)
-{
-    EXPECT_EQ(maketitle(QStringLiteral("{PLACE}"), {}, {}, QStringLiteral("at {REF}"), {}, {},
-                        QStringLiteral("RG9/1"), {}),
+    // A value holding a later placeholder is replaced too; an earlier one stays as typed.
+    EXPECT_EQ(maketitle(QStringLiteral("{PLACE}"), {}, {}, QStringLiteral("at {REF}"), {}, {}, QStringLiteral("RG9/1"), {}),
               QStringLiteral("at RG9/1"));
-    // An earlier placeholder in a later value stays as typed.
-    EXPECT_EQ(maketitle(QStringLiteral("{REF}"), QStringLiteral("1851"), {}, {}, {}, {},
-                        QStringLiteral("{YEAR}"), {}),
+    EXPECT_EQ(maketitle(QStringLiteral("{REF}"), QStringLiteral("1851"), {}, {}, {}, {}, QStringLiteral("{YEAR}"), {}),
               QStringLiteral("{YEAR}"));
 }

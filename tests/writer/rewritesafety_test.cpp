@@ -1,6 +1,6 @@
-// Safe writing of the family file: encodings kept, unencodable text refused
-// before anything is written, and a failure at any step leaving the file
-// byte for byte as it was.
+// Safe writing of the family file: encodings kept, and unencodable text
+// refused before anything is written. (A failure at any step leaving the
+// file byte for byte as it was: saveroad_test.cpp.)
 
 #include "writer/rewritefile.h"
 
@@ -17,14 +17,6 @@
 #include <QTemporaryDir>
 
 #include <gtest/gtest.h>
-
-#include <cerrno>
-#include <csignal>
-#include <cstring>
-
-#ifdef Q_OS_LINUX
-#include <sys/resource.h>
-#endif
 
 using namespace qm;
 using qmtest::readfile;
@@ -91,37 +83,6 @@ class RewriteEncoding : public ::testing::TestWithParam<encodingcase> {
 protected:
     void SetUp() override { setclockfortests(fixedclock); }
     void TearDown() override { setclockfortests(QDateTime()); }
-};
-
-class RewriteFaults : public ::testing::Test {
-protected:
-    void SetUp() override
-    {
-        setclockfortests(fixedclock);
-        input = familytext("UTF-8");
-        family = dir.filePath(QStringLiteral("family.ged"));
-        backup = dir.filePath(QStringLiteral("QM Backup 20261204130509.ged"));
-        writefile(family, input);
-        writefile(backup, input);
-        ix = loadgedcombytes(input, {});
-    }
-    void TearDown() override
-    {
-        setwritefaultfortests({});
-        setclockfortests(QDateTime());
-    }
-    // The family file as it was, and nothing else left in its folder.
-    void expectuntouched()
-    {
-        EXPECT_EQ(readfile(family), input);
-        EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files | QDir::Hidden).size(), 2)
-            << QDir(dir.path()).entryList(QDir::Files | QDir::Hidden).join(QLatin1Char(' ')).toStdString();
-    }
-
-    QTemporaryDir dir;
-    std::string input;
-    QString family, backup;
-    std::unique_ptr<gedcomindex> ix;
 };
 
 } // namespace
@@ -274,75 +235,6 @@ TEST(RewriteRefusal, OtherCharacterSetsKeepTheirBytesAndTakeAsciiText)
     ASSERT_TRUE(rewritebytes(input, out, *ix, settings{}, r).ok);
     EXPECT_NE(out.find("1 NAME Ren\xE2""e /Doe/\r\n1 CENS\r\n"), std::string::npos);
 }
-
-TEST_F(RewriteFaults, FailuresLeaveTheFamilyFileAsItWas)
-{
-    const rewriterequest r = entry(*ix);
-    const QString expected =
-        QStringLiteral("An error occurred (Permission denied): Census entry not added and program will close when you press OK");
-
-    setwritefaultfortests({.failopen = true});
-    rewriteresult res = rewritefile(backup, family, *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    EXPECT_FALSE(res.refused);
-    EXPECT_EQ(res.message, expected);
-    expectuntouched();
-
-    const auto size = static_cast<int64_t>(expectedtext("UTF-8").size());
-    for (int64_t after : {int64_t(0), int64_t(1), int64_t(40), size / 2, size - 1}) {
-        setwritefaultfortests({.failafterbytes = after});
-        res = rewritefile(backup, family, *ix, settings{}, r);
-        EXPECT_FALSE(res.ok) << after;
-        EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (No space left on device): Census entry")))
-            << res.message.toStdString();
-        expectuntouched();
-    }
-
-    setwritefaultfortests({.failcommit = true});
-    res = rewritefile(backup, family, *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    expectuntouched();
-
-    // The same run without a fault goes through, also reading the family file itself.
-    setwritefaultfortests({});
-    res = rewritefile(family, family, *ix, settings{}, r);
-    EXPECT_TRUE(res.ok) << res.message.toStdString();
-    EXPECT_EQ(readfile(family), expectedtext("UTF-8"));
-}
-
-TEST_F(RewriteFaults, FilesThatCannotBeOpenedAreReported)
-{
-    const rewriterequest r = entry(*ix);
-    rewriteresult res = rewritefile(dir.filePath(QStringLiteral("missing.ged")), family, *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    EXPECT_TRUE(res.message.startsWith(QStringLiteral("An error occurred (")));
-    EXPECT_TRUE(res.message.endsWith(QStringLiteral("): Census entry not added and program will close when you press OK")));
-    expectuntouched();
-
-    res = rewritefile(backup, dir.filePath(QStringLiteral("no such folder/family.ged")), *ix, settings{}, r);
-    EXPECT_FALSE(res.ok);
-    expectuntouched();
-}
-
-#ifdef Q_OS_LINUX
-// A write the system refuses (here: past the largest file this process may
-// write) is reported in the system's words, never as "Unknown error".
-TEST_F(RewriteFaults, WriteErrorsGiveTheSystemsReason)
-{
-    struct rlimit old;
-    ASSERT_EQ(getrlimit(RLIMIT_FSIZE, &old), 0);
-    const auto oldsignal = std::signal(SIGXFSZ, SIG_IGN);
-    struct rlimit small = old;
-    small.rlim_cur = input.size() + 16; // the new content is longer
-    ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &small), 0);
-    const rewriteresult res = rewritefile(backup, family, *ix, settings{}, entry(*ix));
-    setrlimit(RLIMIT_FSIZE, &old);
-    std::signal(SIGXFSZ, oldsignal);
-    EXPECT_FALSE(res.ok);
-    EXPECT_EQ(res.message, rewritefailuremessage(rewritemode::censusentry, QString::fromLocal8Bit(strerror(EFBIG))));
-    expectuntouched();
-}
-#endif
 
 TEST(RewriteMessages, EachModeHasItsOwnFailureText)
 {
