@@ -11,6 +11,7 @@
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
+#include "tools/coveragefrm.h"
 #include "writer/backups.h"
 #include "writer/maketitle.h"
 
@@ -127,6 +128,7 @@ void mainfrm::buildmenus()
     attachbut_ = item(tools, "attachbut", QStringLiteral("&Attach Images to Existing Sources..."));
     item(tools, "datecheckmen", QStringLiteral("Census Date Check..."));
     item(tools, "flagsmen", QStringLiteral("Census Flags..."));
+    item(tools, "coveragemen", QStringLiteral("Census C&overage..."));
     tools->addSeparator();
     item(tools, "optionsmen", QStringLiteral("&Options..."));
 
@@ -149,6 +151,7 @@ void mainfrm::buildmenus()
     on("attachbut", &mainfrm::attachimages);
     on("datecheckmen", &mainfrm::censusdatecheck);
     on("flagsmen", &mainfrm::censusflags);
+    on("coveragemen", &mainfrm::opencoverage);
     on("optionsmen", &mainfrm::showoptions);
     on("donatemen", &mainfrm::donate);
     on("aboutmen", &mainfrm::about);
@@ -411,6 +414,8 @@ bool mainfrm::loadfile()
 
 void mainfrm::afterload()
 {
+    if (coverage_)
+        coverage_->setindex(*index_, settings_); // first: the grid must not read the index it had
     const gedcomindex& x = *index_;
     // Existing census sources, by title.
     std::vector<sourceitem> sources = censussourcelist(x);
