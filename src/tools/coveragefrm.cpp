@@ -194,7 +194,7 @@ QVariant coveragemodel::headerData(int section, Qt::Orientation orientation, int
 
 coveragefrm::coveragefrm(const gedcomindex& index, const settings& s, prompts& p, transcribefn transcribe,
                          QWidget* parent)
-    : QDialog(parent), index_(&index), settings_(s), prompts_(p), transcribe_(std::move(transcribe))
+    : QDialog(parent), index_(&index), settings_(&s), prompts_(p), transcribe_(std::move(transcribe))
 {
     setObjectName(QStringLiteral("coveragefrm"));
     setWindowTitle(QStringLiteral("Census Coverage"));
@@ -205,7 +205,7 @@ coveragefrm::coveragefrm(const gedcomindex& index, const settings& s, prompts& p
     busycursor busy(prompts_);
     {
         const QSignalBlocker block(countrycom_);
-        countrycom_->setCurrentIndex(static_cast<int>(std::max<qsizetype>(0, countries().indexOf(settings_.country))));
+        countrycom_->setCurrentIndex(static_cast<int>(std::max<qsizetype>(0, countries().indexOf(settings_->country))));
     }
     compute();
     grid_->setFocus();
@@ -337,7 +337,7 @@ void coveragefrm::setindex(const gedcomindex& index, const settings& s)
     const int column = grid_->currentIndex().column();
     model_->setrows(nullptr, nullptr, {});
     index_ = &index;
-    settings_ = s;
+    settings_ = &s;
     relativeof_ = -1;
     int32_t found = -1;
     for (size_t j = 0; j < index.people.size(); ++j) {
@@ -366,7 +366,8 @@ void coveragefrm::setindex(const gedcomindex& index, const settings& s)
 void coveragefrm::compute()
 {
     model_->setrows(nullptr, nullptr, {});
-    coverage_ = computecoverage(*index_, countrycom_->currentText(), settings_.residence);
+    residence_ = settings_->residence;
+    coverage_ = computecoverage(*index_, countrycom_->currentText(), residence_);
     order();
 }
 
@@ -459,10 +460,10 @@ void coveragefrm::transcribecurrent()
     if (k < 0 || census < 0
         || coverage_.cell(static_cast<size_t>(k), static_cast<size_t>(census)) != coveragecell::missing)
         return;
-    if (coverage_.country != settings_.country) {
+    if (coverage_.country != settings_->country) {
         prompts_.tell(QStringLiteral("Census entries are made for the census country chosen in Options (%1). To "
                                      "transcribe a census of %2, choose %2 as the census country in Options first.")
-                          .arg(settings_.country, coverage_.country));
+                          .arg(settings_->country, coverage_.country));
         return;
     }
     if (transcribe_)
@@ -493,6 +494,15 @@ void coveragefrm::exportcsv()
         prompts_.tell(QStringLiteral("The census coverage could not be written to %1: %2")
                           .arg(QDir::toNativeSeparators(*path), f.errorString()),
                       icon::exclamation);
+}
+
+void coveragefrm::changeEvent(QEvent* event)
+{
+    // Back from the options, whose "Residence" may have changed without the
+    // file being read again.
+    if (event->type() == QEvent::ActivationChange && settings_->residence != residence_)
+        setindex(*index_, *settings_);
+    QDialog::changeEvent(event);
 }
 
 bool coveragefrm::eventFilter(QObject* watched, QEvent* event)

@@ -76,9 +76,11 @@ public:
     using transcribefn = std::function<void(int32_t person, int year)>;
 
     // The index must stay alive until setindex() gives another or the window
-    // is gone. `s` is copied: its country is the one the grid opens on and the
-    // only one whose censuses can be transcribed, its "Residence" decides
-    // whether residence facts are census entries.
+    // is gone; the settings until the window is gone (they are read as they
+    // are when needed). Their country is the one the grid opens on and the
+    // only one whose censuses can be transcribed; their "Residence" decides
+    // whether residence facts are census entries (a change is seen when the
+    // window is next activated).
     coveragefrm(const gedcomindex& index, const settings& s, prompts& p, transcribefn transcribe,
                 QWidget* parent = nullptr);
 
@@ -90,6 +92,7 @@ public:
     const coveragemodel& model() const { return *model_; }
 
 protected:
+    void changeEvent(QEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
@@ -103,7 +106,8 @@ private:
     void exportcsv();
 
     const gedcomindex* index_;
-    settings settings_;
+    const settings* settings_;
+    bool residence_ = false; // the "Residence" the coverage was worked out with
     prompts& prompts_;
     transcribefn transcribe_;
     censuscoverage coverage_;

@@ -210,6 +210,32 @@ private slots:
         QCOMPARE(asker.unexpected(), 0);
     }
 
+    // The settings are read as they stand: "Residence" turned on in the
+    // options makes a residence fact the census entry once the window is
+    // active again; the census country decides what can be transcribed.
+    void settingsastheystand()
+    {
+        const auto x = loadgedcombytes("0 HEAD\r\n0 @I1@ INDI\r\n1 NAME Ann /Lee/\r\n1 BIRT\r\n2 DATE 1850\r\n"
+                                       "1 RESI\r\n2 DATE 3 APR 1881\r\n2 PLAC Leeds, England\r\n0 TRLR\r\n",
+                                       flagtable{});
+        scriptedprompts asker;
+        settings s = defaultsettings();
+        int asked = 0;
+        coveragefrm d(*x, s, asker, [&](int32_t, int) { ++asked; });
+        d.show();
+        QCOMPARE(celltext(d, *x, 1, "1881"), QStringLiteral("\u2718 missing"));
+        s.residence = true;
+        QEvent activated(QEvent::ActivationChange);
+        QApplication::sendEvent(&d, &activated);
+        QCOMPARE(celltext(d, *x, 1, "1881"), QStringLiteral("\u2714 recorded"));
+        s.country = QStringLiteral("Ireland");
+        asker.expect(answer::ok, QStringLiteral("census country chosen in Options (Ireland)"));
+        gotocell(d, *x, 1, "1891");
+        QTest::keyClick(grid(&d), Qt::Key_Return);
+        QCOMPARE(asked, 0);
+        QCOMPARE(asker.unexpected(), 0);
+    }
+
     // From the Tools menu to a saved entry: Enter on William Ashworth's
     // missing 1881 census gives up the unsaved 1871 household (asked), puts
     // 1881 and William in the form with his family; the entry saved, the grid
