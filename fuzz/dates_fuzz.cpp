@@ -3,6 +3,7 @@
 // recognised date is valid and reads back the same once written the GEDCOM
 // way; the census date check accepts exactly what the recogniser does.
 #include "model/dates.h"
+#include "model/dayrange.h"
 
 #include "fuzzcheck.h"
 
@@ -17,6 +18,9 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     if (size > 4096)
         return 0;
     const QString text = QString::fromUtf8(reinterpret_cast<const char*>(data), static_cast<qsizetype>(size));
+    const qm::dayrange days = qm::readdayrange(std::string_view(reinterpret_cast<const char*>(data), size));
+    check(!days.valid || days.first <= days.last);
+    check(!days.period || (days.valid && days.first <= days.fromlast && days.tofirst <= days.last));
     const std::optional<QDate> census = qm::recognisedate(u"3 APR 1881", qm::dateorder::dmy);
     for (const qm::dateorder order : {qm::dateorder::dmy, qm::dateorder::mdy, qm::dateorder::ymd}) {
         const std::optional<QDate> d = qm::recognisedate(text, order);

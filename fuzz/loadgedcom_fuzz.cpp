@@ -1,6 +1,8 @@
 // Feeds arbitrary bytes to the loader and checks what it promises about any
-// input: it returns an index whose texts and tables hang together.
+// input: it returns an index whose texts and tables hang together, which the
+// census coverage reads without harm.
 #include "model/loadgedcom.h"
+#include "tools/coverage.h"
 
 #include "fuzzcheck.h"
 
@@ -43,6 +45,10 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
         check(order.size() == ix->people.size());
     }
     (void)qm::censussourcelist(*ix);
+    // The census coverage reads every date and place of every individual.
+    const qm::censuscoverage c = qm::computecoverage(*ix, size % 3 == 0 ? QStringLiteral("USA") : QStringLiteral("UK"),
+                                                     size % 2 == 0, qm::dateorder::dmy);
+    check(c.cells.size() == ix->people.size() * c.columns());
     if (!ix->people.empty())
         qm::insertplace(*ix, ix->people.front().name);
     return 0;

@@ -115,6 +115,25 @@ std::unique_ptr<clifile> opensettings(const QString& inipath, QString* error)
     return s;
 }
 
+bool takeoptionvalue(QStringList& args, qsizetype i, const QString& name, QString& value, QString& error)
+{
+    if (args[i] == name) {
+        if (i + 1 >= args.size()) {
+            error = QStringLiteral("%1 needs a value").arg(name);
+            return true;
+        }
+        value = args[i + 1];
+        args.remove(i, 2);
+        return true;
+    }
+    if (args[i].startsWith(name + u'=')) {
+        value = args[i].mid(name.size() + 1);
+        args.remove(i);
+        return true;
+    }
+    return false;
+}
+
 QString unknownoption(const QStringList& args)
 {
     for (const QString& a : args)
@@ -157,6 +176,13 @@ QString censuscountry(const QString& text)
         if (text.trimmed().compare(c, Qt::CaseInsensitive) == 0)
             return c;
     return QString();
+}
+
+QString takecountry(const QString& given, QString* country)
+{
+    *country = censuscountry(given);
+    return country->isEmpty() ? QStringLiteral("--country %1: give one of UK, USA, Ireland, Canada").arg(given)
+                              : QString();
 }
 
 QString checkfamilypath(const QString& path)
@@ -253,21 +279,26 @@ void jsonobject::add(const char* k, double value)
 void jsonobject::add(const char* k, const QString& value)
 {
     key(k);
-    out_ += '"';
-    for (const char c : value.toStdString()) {
+    appendjsontext(out_, value.toStdString());
+}
+
+void appendjsontext(std::string& out, std::string_view utf8)
+{
+    out += '"';
+    for (const char c : utf8) {
         const auto u = static_cast<unsigned char>(c);
         if (c == '"' || c == '\\') {
-            out_ += '\\';
-            out_ += c;
+            out += '\\';
+            out += c;
         } else if (u < 0x20) {
             char buf[8];
             std::snprintf(buf, sizeof buf, "\\u%04x", u);
-            out_ += buf;
+            out += buf;
         } else {
-            out_ += c;
+            out += c;
         }
     }
-    out_ += '"';
+    out += '"';
 }
 
 } // namespace qm

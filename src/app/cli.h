@@ -18,6 +18,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace qm {
@@ -38,6 +39,7 @@ int cliaddentry(QStringList args);
 int clidatecheck(QStringList args);
 int cliflagcheck(QStringList args);
 int cliattachimages(QStringList args);
+int clicoverage(QStringList args);
 
 // Exit status of a command that could not do its work.
 constexpr int clifailure = 2;
@@ -71,6 +73,10 @@ struct clifile {
 };
 std::unique_ptr<clifile> opensettings(const QString& inipath, QString* error);
 
+// Takes the value of "--name VALUE" or "--name=VALUE" at args[i] out of args;
+// false when args[i] is not that option. A missing value sets error.
+bool takeoptionvalue(QStringList& args, qsizetype i, const QString& name, QString& value, QString& error);
+
 // "unknown option A (see quillmark-cli --help)" for the first argument that
 // looks like an option ("-" alone names standard input); "" when none does.
 QString unknownoption(const QStringList& args);
@@ -85,6 +91,9 @@ QString readapplyargs(const QStringList& args, const QString& name, const QStrin
 // One of the census countries (flagcountries()) named by text, in any letter
 // case and with spaces around it, in its own spelling; "" when none is.
 QString censuscountry(const QString& text);
+
+// Reads the value of --country into country: "" or the message refusing it.
+QString takecountry(const QString& given, QString* country);
 
 // "" when path names a file, else "PATH: no such file" or "PATH is a folder ...".
 QString checkfamilypath(const QString& path);
@@ -106,6 +115,10 @@ std::unique_ptr<clifile> openfamily(const QStringList& files, const QString& usa
 // One line of text, or one JSON object on one line, on standard output.
 void printline(const QString& text);
 void printjson(const QJsonObject& object);
+
+// Appends utf8 to out as a JSON string, in quotes, with quotes, backslashes
+// and control characters escaped.
+void appendjsontext(std::string& out, std::string_view utf8);
 
 // A JSON object written field by field on one line.
 class jsonobject {

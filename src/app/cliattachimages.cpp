@@ -40,27 +40,6 @@ struct wanted {
     int32_t objectid = 0;
 };
 
-// Takes the value of "--name VALUE" or "--name=VALUE" at args[i]; false when
-// args[i] is not that option. A missing value is an error.
-bool takevalue(QStringList& args, qsizetype i, const QString& name, QString& value, QString& error)
-{
-    if (args[i] == name) {
-        if (i + 1 >= args.size()) {
-            error = QStringLiteral("%1 needs a value").arg(name);
-            return true;
-        }
-        value = args[i + 1];
-        args.remove(i, 2);
-        return true;
-    }
-    if (args[i].startsWith(name + u'=')) {
-        value = args[i].mid(name.size() + 1);
-        args.remove(i);
-        return true;
-    }
-    return false;
-}
-
 } // namespace
 
 int cliattachimages(QStringList args)
@@ -72,9 +51,9 @@ int cliattachimages(QStringList args)
     std::vector<wanted> asked;
     for (qsizetype i = 0; i < args.size();) {
         QString value;
-        if (takevalue(args, i, QStringLiteral("--source"), value, error)) {
+        if (takeoptionvalue(args, i, QStringLiteral("--source"), value, error)) {
             sourcetext = value;
-        } else if (takevalue(args, i, QStringLiteral("--image"), value, error)) {
+        } else if (takeoptionvalue(args, i, QStringLiteral("--image"), value, error)) {
             wanted w;
             w.isnew = true;
             w.path = value;
@@ -85,7 +64,7 @@ int cliattachimages(QStringList args)
                 w.title = value.mid(eq + 1).trimmed();
             }
             asked.push_back(w);
-        } else if (takevalue(args, i, QStringLiteral("--object"), value, error)) {
+        } else if (takeoptionvalue(args, i, QStringLiteral("--object"), value, error)) {
             wanted w;
             w.objectid = recordnumber(value, u'O');
             if (w.objectid == 0)

@@ -38,13 +38,9 @@ int clidatecheck(QStringList args)
     bool apply = false;
     QString country;
     QStringList files;
-    const auto takecountry = [&country](const QString& given) {
-        country = censuscountry(given);
-        return country.isEmpty() ? QStringLiteral("--country %1: give one of UK, USA, Ireland, Canada").arg(given)
-                                 : QString();
-    };
     error = readapplyargs(args, QStringLiteral("--country"),
-                          QStringLiteral("--country needs one of UK, USA, Ireland, Canada"), takecountry, &apply, &files);
+                          QStringLiteral("--country needs one of UK, USA, Ireland, Canada"),
+                          [&country](const QString& given) { return takecountry(given, &country); }, &apply, &files);
     if (!error.isEmpty())
         return clifail(error);
     files += operands;

@@ -32,6 +32,9 @@ const std::vector<clicommand>& clicommands()
         {"date-check", "FILE [--country C] [--apply] [--settings S.ini]",
          "list the census event dates as the Census Date Check dialog does; --apply makes the suggested changes",
          clidatecheck},
+        {"coverage", "FILE [--country C] [--year Y] [--missing-only] [--format csv|json] [--settings S.ini]",
+         "for every individual and census of the country: recorded, not alive, uncertain, elsewhere or missing",
+         clicoverage},
     };
     return commands;
 }

@@ -25,6 +25,7 @@ const std::vector<helptopic>& helptopics()
         {35, QStringLiteral("census-date-check.html"), QStringLiteral("Census Date Check")},
         {45, QStringLiteral("census-flags.html"), QStringLiteral("Census Flags and Census Flag Date")},
         {55, QStringLiteral("flag-check.html"), QStringLiteral("Flag Check")},
+        {60, QStringLiteral("census-coverage.html"), QStringLiteral("Census Coverage")},
     };
     return topics;
 }

@@ -11,6 +11,7 @@
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
+#include "tools/coveragefrm.h"
 #include "writer/backups.h"
 #include "writer/maketitle.h"
 
@@ -129,6 +130,7 @@ void mainfrm::buildmenus()
     attachbut_ = item(tools, "attachbut", QStringLiteral("&Attach Images to Existing Sources..."));
     item(tools, "datecheckmen", QStringLiteral("Census Date Check..."));
     item(tools, "flagsmen", QStringLiteral("Census Flags..."));
+    item(tools, "coveragemen", QStringLiteral("Census C&overage..."));
     tools->addSeparator();
     item(tools, "optionsmen", QStringLiteral("&Options..."));
 
@@ -151,6 +153,7 @@ void mainfrm::buildmenus()
     on("attachbut", &mainfrm::attachimages);
     on("datecheckmen", &mainfrm::censusdatecheck);
     on("flagsmen", &mainfrm::censusflags);
+    on("coveragemen", &mainfrm::opencoverage);
     on("optionsmen", &mainfrm::showoptions);
     on("donatemen", &mainfrm::donate);
     on("aboutmen", &mainfrm::about);
@@ -388,6 +391,8 @@ void mainfrm::settitleandpanel(const QString& path)
 
 void mainfrm::afterload()
 {
+    if (coverage_)
+        coverage_->setindex(*file_.index(), file_.currentsettings()); // first: the grid must not read the index it had
     const gedcomindex& x = *file_.index();
     // Existing census sources, by title.
     std::vector<sourceitem> sources = censussourcelist(x);

@@ -13,6 +13,7 @@
 #include "writer/openfile.h"
 
 #include <QMainWindow>
+#include <QPointer>
 
 #include <array>
 #include <functional>
@@ -26,6 +27,7 @@ class QStackedWidget;
 
 namespace qm {
 
+class coveragefrm;
 struct censusentry;
 struct entryform;
 class entrypanel;
@@ -95,6 +97,10 @@ private:
     void censusflags();        // flags/flagsmenu_ui.cpp
     // After each load when "Flag Check" is on (flags/flagcheckmenu_ui.cpp).
     void silentflagcheck();
+    // Census Coverage (app/coveragemenu_ui.cpp): the grid stays open and is
+    // given every index read; a missing cell chosen in it starts its entry.
+    void opencoverage();
+    void transcribegap(int32_t k, int year);
     void showoptions();        // settings/optionsmenu_ui.cpp
     // At start, once the settings are read: the options dialog when the
     // settings are incomplete or their paths fail the checks (same file).
@@ -180,6 +186,7 @@ private:
     bool reloadneeded_ = false; // a tool rewrote the file (or found it changed): read it again
     bool ending_ = false; // closing after a failed rewrite: no questions
     bool saving_ = false; // a save is running (a second click waits its turn)
+    QPointer<coveragefrm> coverage_; // the Census Coverage window while open
 
     // controls
     QStackedWidget* panels_ = nullptr;

@@ -36,6 +36,14 @@ struct censusrec {
     int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
 };
 
+// One "1 RESI" fact of an individual: where the individual lived on a day or
+// during a period (saved census entries are residence facts when the setting
+// "Residence" is on).
+struct residencerec {
+    std::string_view date;  // "2 DATE" value (a later one replaces an earlier)
+    std::string_view place; // "2 PLAC" value
+};
+
 // One individual ("0 @I...").
 struct personrec {
     int32_t id = 0;
@@ -53,6 +61,7 @@ struct personrec {
     indexlist<int32_t> sourceids; // every "2 SOUR @" citation of the record, in file order
     indexlist<int32_t> flagids;   // flags held: positions in the index's flag table
     indexlist<censusrec> census;  // "1 CENS" events, in file order
+    indexlist<residencerec> residences; // "1 RESI" facts, in file order
 
     int32_t citecount() const { return static_cast<int32_t>(sourceids.size()); }
 };

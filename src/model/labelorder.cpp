@@ -5,19 +5,38 @@
 
 namespace qm {
 
-QString labelkey(const QString& label)
+namespace {
+
+bool plain(const QString& folded)
 {
-    const QString folded = label.toCaseFolded();
-    const bool plain = std::all_of(folded.begin(), folded.end(), [](QChar c) { return c.unicode() < 0x80; });
-    if (plain)
-        return folded;
+    return std::all_of(folded.begin(), folded.end(), [](QChar c) { return c.unicode() < 0x80; });
+}
+
+QString withoutaccents(const QString& folded)
+{
     QString base;
     base.reserve(folded.size());
     for (QChar c : folded.normalized(QString::NormalizationForm_D))
         if (c.category() != QChar::Mark_NonSpacing)
             base += c;
+    return base;
+}
+
+} // namespace
+
+QString labelkey(const QString& label)
+{
+    const QString folded = label.toCaseFolded();
+    if (plain(folded))
+        return folded;
     // A label without accents sorts before the same letters with them.
-    return base + QChar(u'\0') + folded;
+    return withoutaccents(folded) + QChar(u'\0') + folded;
+}
+
+QString namesearchkey(const QString& text)
+{
+    const QString folded = text.toCaseFolded();
+    return plain(folded) ? folded : withoutaccents(folded);
 }
 
 std::vector<size_t> labelorder(size_t n, const std::function<QString(size_t)>& label)

@@ -18,6 +18,9 @@ namespace qm {
 
 // The key a label is ordered by: keys compare as plain strings.
 QString labelkey(const QString& label);
+// A text case-folded with its accents set aside ("Ébert" -> "ebert"): the
+// form in which a name search compares names.
+QString namesearchkey(const QString& text);
 
 // The positions 0 .. n-1 in the order of their labels, label(i) giving the
 // label of position i; equal labels keep the order of their positions.

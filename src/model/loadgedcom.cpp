@@ -206,13 +206,14 @@ private:
     int32_t highestsource = 0;
     bool namepending = false, birthpending = false, deathpending = false;
     bool inbirthdate = false, inbirthplace = false, indeath = false;
-    bool inflags = false, incensus = false, titlepending = false;
+    bool inflags = false, incensus = false, inresidence = false, titlepending = false;
 
     // The current individual's lists, gathered here and moved into the arena
     // at the end of the record, each as one piece of its exact size.
     std::vector<int32_t> fams_, sourceids_, flagids_;
     std::vector<int32_t> objectids_; // of the current source
     std::vector<censusrec> census_;
+    std::vector<residencerec> residences_;
     std::vector<int32_t> censuscites_;      // citations of all its census events, in order
     std::vector<size_t> censuscitestart_;   // where each event's citations start
 
@@ -332,7 +333,7 @@ void loader::startrecord(std::string_view s)
 {
     endrecord();
     namepending = birthpending = deathpending = false;
-    inbirthdate = inbirthplace = indeath = inflags = incensus = titlepending = false;
+    inbirthdate = inbirthplace = indeath = inflags = incensus = inresidence = titlepending = false;
     kind_ = kind::none;
     if (s.size() < 4 || !startswith(s, "0 @")) {
         if (startswith(s, "0 HEAD"))
@@ -424,6 +425,7 @@ void loader::endrecord()
     putlist(p.fams, fams_);
     putlist(p.sourceids, sourceids_);
     putlist(p.flagids, flagids_);
+    putlist(p.residences, residences_);
     if (!census_.empty()) {
         censuscitestart_.push_back(censuscites_.size());
         for (size_t i = 0; i < census_.size(); ++i) {
@@ -563,6 +565,7 @@ void loader::personline(std::string_view s)
 {
     personrec& p = person();
     if (s[0] == '1') {
+        inresidence = false;
         if (namepending && startswith(s, "1 NAME")) {
             if (s.size() > 7)
                 setname(s);
@@ -591,6 +594,9 @@ void loader::personline(std::string_view s)
                 census_.emplace_back();
                 censuscitestart_.push_back(censuscites_.size());
                 ++ix_.censusevents;
+            } else if (startswith(s, "1 RESI")) {
+                inresidence = true;
+                residences_.emplace_back();
             }
         }
         return;
@@ -616,6 +622,18 @@ void loader::personline(std::string_view s)
         if (startswith(s, "2 AGE")) {
             if (s.size() > 6)
                 lastcensus().age = text(s.substr(6));
+            return;
+        }
+    }
+    if (inresidence) {
+        if (startswith(s, "2 DATE")) {
+            if (s.size() > 7)
+                residences_.back().date = text(s.substr(7));
+            return;
+        }
+        if (startswith(s, "2 PLAC")) {
+            if (s.size() > 7)
+                residences_.back().place = placetext(s.substr(7));
             return;
         }
     }

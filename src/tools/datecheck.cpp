@@ -245,17 +245,36 @@ int nearestcensus(const QDate& d, const QString& country)
     return best;
 }
 
+namespace {
+
+// The census proposed for an unrecognised date, or noproposal.
+int proposedcensus(const QString& founddate, const QString& country, dateorder order)
+{
+    const auto day = proposaldate(founddate, order);
+    return day ? nearestcensus(*day, country) : noproposal;
+}
+
+} // namespace
+
+int censusofdate(std::string_view date, const QString& country, dateorder order)
+{
+    date = eventdate(date);
+    if (date.empty())
+        return noproposal;
+    if (const int row = officialrow(date, rowsofcountry(country).first); row != noproposal)
+        return row;
+    return proposedcensus(qs(date), country, order);
+}
+
 void proposecensusdates(std::vector<datechange>& changes, const QString& country, dateorder order)
 {
     for (datechange& d : changes) {
         if (d.datekind != 0)
             continue;
-        d.censusrow = noproposal;
         d.newdate.clear();
-        if (const auto day = proposaldate(d.founddate, order)) {
-            d.censusrow = nearestcensus(*day, country);
+        d.censusrow = proposedcensus(d.founddate, country, order);
+        if (d.censusrow != noproposal)
             d.newdate = rowdef(d.censusrow).date;
-        }
     }
 }
 

@@ -19,6 +19,7 @@
 
 #include <cstdint>
 #include <optional>
+#include <string_view>
 #include <vector>
 
 namespace qm {
@@ -63,6 +64,11 @@ std::optional<QDate> proposaldate(const QString& founddate, dateorder order);
 // The census (row) whose day is fewest days from d, rows walked from the
 // country's first row round the table; the first met wins a tie.
 int nearestcensus(const QDate& d, const QString& country);
+// The census (row) whose official day a census event date is, exactly as the
+// analysis finds it (from the country's first row round the table), else the
+// census proposed for it; noproposal when neither. The date is read without
+// the spaces that may end its line.
+int censusofdate(std::string_view date, const QString& country, dateorder order);
 // Fills the proposal of every unrecognised date.
 void proposecensusdates(std::vector<datechange>& changes, const QString& country, dateorder order);
 

@@ -147,6 +147,24 @@ TEST(LoadGedcom, CensusEventsAndCitations)
     EXPECT_EQ(ix->censusevents, 3);
 }
 
+TEST(LoadGedcom, ResidenceFacts)
+{
+    // Their date and place; a residence's citations are the record's, not a census event's.
+    auto ix = load(ged("0 @I1@ INDI\n1 RESI\n2 DATE 3 APR 1881\n2 PLAC Leeds\n2 SOUR @S4@\n1 CENS\n2 DATE 1891\n"
+                       "1 RESI\n2 ADDR 1 High St\n1 BIRT\n2 DATE 1850\n1 RESI\n2 DATE FROM 1885 TO 1905\n"));
+    const personrec& p = ix->people.at(0);
+    ASSERT_EQ(p.residences.size(), 3u);
+    EXPECT_EQ(sv(p.residences[0].date), "3 APR 1881");
+    EXPECT_EQ(sv(p.residences[0].place), "Leeds");
+    EXPECT_TRUE(p.residences[1].date.empty() && p.residences[1].place.empty());
+    EXPECT_EQ(sv(p.residences[2].date), "FROM 1885 TO 1905");
+    EXPECT_EQ(sv(p.birthdate), "1850");
+    ASSERT_EQ(p.census.size(), 1u);
+    EXPECT_EQ(sv(p.census[0].date), "1891");
+    EXPECT_TRUE(p.census[0].sourceids.empty());
+    EXPECT_EQ(p.sourceids, (std::vector<int32_t>{4}));
+}
+
 TEST(LoadGedcom, FamiliesAndFlags)
 {
     flagtable defs;
