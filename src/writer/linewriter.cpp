@@ -144,6 +144,7 @@ void linewriter::flush()
             fail(file_->errorstring());
             return;
         }
+        hash_.add(buf_.data(), static_cast<size_t>(want));
         written_ += want;
         if (written_ - sentback_ >= writebackstep) {
             startwriteback(file_->handle(), sentback_, written_ - sentback_);

@@ -13,6 +13,7 @@
 // stays as it was. After the first failure nothing more is written and the
 // error is kept for the end.
 
+#include "platform/contenthash.h"
 #include "platform/encoding.h"
 #include "platform/replacefile.h"
 
@@ -82,6 +83,9 @@ public:
     QString errorstring() const { return error_; }
     int64_t lines() const { return lines_; }
     textencoding encoding() const { return enc_; }
+    // The hash (contenthash.h) of the bytes handed to the file so far: after
+    // commit, of the whole new file.
+    uint64_t writtenhash() const { return hash_.value(); }
 
 private:
     void fail(const QString& error);
@@ -99,6 +103,7 @@ private:
     int64_t written_ = 0;  // bytes handed to the device
     int64_t sentback_ = 0; // bytes of them sent on to the disk
     int64_t lines_ = 0;
+    contenthash hash_;
     bool failed_ = false;
     bool started_ = false;
     bool withdrawn_ = false, inplace_ = false, damaged_ = false;

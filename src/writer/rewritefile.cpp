@@ -847,6 +847,7 @@ void commit(linewriter& out, rewritemode mode, rewriteresult& r, const replacefi
         return;
     const bool done = out.commit(check);
     r.inplace = out.inplace();
+    r.writtenhash = out.writtenhash();
     if (done)
         return;
     r.ok = false;
