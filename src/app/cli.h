@@ -39,6 +39,7 @@ int cliaddentry(QStringList args);
 int clidatecheck(QStringList args);
 int cliflagcheck(QStringList args);
 int cliattachimages(QStringList args);
+int cliundo(QStringList args);
 
 // Exit status of a command that could not do its work.
 constexpr int clifailure = 2;
@@ -47,6 +48,8 @@ constexpr int clifailure = 2;
 int clifail(const QString& message);
 // Writes "quillmark-cli: warning: " + message as one line on standard error.
 void cliwarn(const QString& message);
+// Writes "quillmark-cli: note: " + message as one line on standard error.
+void clinote(const QString& message);
 // Usage of one command (or of all when name is empty), for --help and mistakes.
 QString cliusage(const QString& name = QString());
 
@@ -107,6 +110,8 @@ std::unique_ptr<clifamily> openfamily(const QStringList& files, const QString& u
 
 // One line of text, or one JSON object on one line, on standard output.
 void printline(const QString& text);
+// Text as it stands (its own line ends), on standard output.
+void printtext(const QString& text);
 void printjson(const QJsonObject& object);
 
 // A JSON object written field by field on one line.
