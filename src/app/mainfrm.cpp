@@ -13,6 +13,7 @@
 #include "platform/settingsstore.h"
 #include "writer/backups.h"
 #include "writer/maketitle.h"
+#include "writer/undoprompts.h"
 
 #include <QAction>
 #include <QApplication>
@@ -89,6 +90,11 @@ void mainfrm::buildmenus()
 
     QMenu* edit = menuBar()->addMenu(QStringLiteral("&Edit"));
     edit->setObjectName(QStringLiteral("editmen"));
+    connect(item(edit, "undomen", QStringLiteral("&Undo Last Census Entry")), &QAction::triggered, this, [this] {
+        if (index_ && !saving_)
+            runtool([this] { reloadneeded_ = askundolast(gedcomfile_, settings_, prompts_); });
+    });
+    edit->addSeparator();
     copymen_ = item(edit, "copymen", QStringLiteral("Copy"));
     cutmen_ = item(edit, "cutmen", QStringLiteral("Cut"));
     pastemen_ = item(edit, "pastemen", QStringLiteral("Paste"));
@@ -192,6 +198,10 @@ void mainfrm::buildform()
     addbut_ = new QPushButton(QStringLiteral("Save Census Entry"), central);
     addbut_->setObjectName(QStringLiteral("addbut"));
     connect(addbut_, &QPushButton::clicked, this, &mainfrm::saveentry);
+    previewbut_ = new QPushButton(QStringLiteral("Preview..."), central);
+    previewbut_->setObjectName(QStringLiteral("previewbut"));
+    previewbut_->setToolTip(QStringLiteral("Show the lines that saving this entry would write, without saving it"));
+    connect(previewbut_, &QPushButton::clicked, this, &mainfrm::previewentry);
     Autosourcebut_ = new QPushButton(QStringLiteral("Auto Text"), central);
     Autosourcebut_->setObjectName(QStringLiteral("Autosourcebut"));
     Autosourcebut_->setToolTip(QStringLiteral(
@@ -208,6 +218,7 @@ void mainfrm::buildform()
     reloadbut_->setToolTip(QStringLiteral("Read the family file again"));
     connect(reloadbut_, &QPushButton::clicked, this, &mainfrm::reload);
     buttons->addWidget(addbut_);
+    buttons->addWidget(previewbut_);
     buttons->addWidget(Autosourcebut_);
     buttons->addStretch(1);
     buttons->addWidget(findbut_);
