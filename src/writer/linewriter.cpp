@@ -79,8 +79,9 @@ bool linewriter::open(const QString& path)
     return true;
 }
 
-void linewriter::openmemory()
+void linewriter::openmemory(size_t expected)
 {
+    mem_.reserve(expected);
     memory_ = true;
     mem_.clear();
 }

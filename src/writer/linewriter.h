@@ -45,9 +45,13 @@ public:
 
     // Starts the safe write of path. False with errorstring() on failure.
     bool open(const QString& path);
-    // Collects the bytes in memory instead (tests); memory() holds them.
-    void openmemory();
+    // Collects the bytes in memory instead (tests, previews); memory() holds
+    // them. `expected` bytes are reserved at once, so that a whole file's
+    // worth is not copied again and again as it grows.
+    void openmemory(size_t expected = 0);
     const std::string& memory() const { return mem_; }
+    // The bytes collected, handed over without a copy.
+    std::string takememory() { return std::move(mem_); }
 
     // A line kept from the input, as the line reader handed it out.
     void writeline(std::string_view line);
