@@ -27,6 +27,11 @@ void cliwarn(const QString& message)
     std::fputs(("quillmark-cli: warning: " + message.toStdString() + "\n").c_str(), stderr);
 }
 
+void clinote(const QString& message)
+{
+    std::fputs(("quillmark-cli: note: " + message.toStdString() + "\n").c_str(), stderr);
+}
+
 QString cliusage(const QString& name)
 {
     QString text = QStringLiteral("usage:\n");
@@ -203,6 +208,8 @@ bool clisaved(const saveoutcome& out)
     }
     if (!out.logerror.isEmpty())
         cliwarn(out.logerror);
+    if (!out.undoerror.isEmpty())
+        cliwarn(out.undoerror);
     return true;
 }
 
@@ -238,7 +245,12 @@ std::unique_ptr<clifile> openfamily(const QStringList& files, const QString& usa
 
 void printline(const QString& text)
 {
-    const QByteArray bytes = text.toUtf8() + '\n';
+    printtext(text + u'\n');
+}
+
+void printtext(const QString& text)
+{
+    const QByteArray bytes = text.toUtf8();
     std::fwrite(bytes.constData(), 1, static_cast<size_t>(bytes.size()), stdout);
 }
 

@@ -40,6 +40,7 @@ int clidatecheck(QStringList args);
 int cliflagcheck(QStringList args);
 int cliattachimages(QStringList args);
 int clicoverage(QStringList args);
+int cliundo(QStringList args);
 
 // Exit status of a command that could not do its work.
 constexpr int clifailure = 2;
@@ -48,6 +49,8 @@ constexpr int clifailure = 2;
 int clifail(const QString& message);
 // Writes "quillmark-cli: warning: " + message as one line on standard error.
 void cliwarn(const QString& message);
+// Writes "quillmark-cli: note: " + message as one line on standard error.
+void clinote(const QString& message);
 // Usage of one command (or of all when name is empty), for --help and mistakes.
 QString cliusage(const QString& name = QString());
 
@@ -114,6 +117,8 @@ std::unique_ptr<clifile> openfamily(const QStringList& files, const QString& usa
 
 // One line of text, or one JSON object on one line, on standard output.
 void printline(const QString& text);
+// Text as it stands (its own line ends), on standard output.
+void printtext(const QString& text);
 void printjson(const QJsonObject& object);
 
 // Appends utf8 to out as a JSON string, in quotes, with quotes, backslashes

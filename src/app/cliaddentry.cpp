@@ -1,10 +1,15 @@
 // quillmark-cli add-entry: saves one census entry (a new census source, or a
 // citation of an existing one) into a family file without windows, through the
-// same checks and the same save road as "Save Census Entry".
+// same checks and the same save road as "Save Census Entry". The household
+// check's findings are printed as warnings (--strict refuses the entry on
+// them); --dry-run prints what the save would write, as a unified diff, and
+// writes nothing.
 #include "app/cli.h"
 
 #include "app/clientry.h"
+#include "census/householdcheck.h"
 #include "model/gedcomindex.h"
+#include "writer/preview.h"
 #include "writer/saveroad.h"
 
 #include <QDir>
@@ -35,6 +40,8 @@ int cliaddentry(QStringList args)
     const QStringList operands = takeoperands(args);
     if (!takesettingsoption(args, &inipath, &error))
         return clifail(error);
+    const bool strict = args.removeAll(QStringLiteral("--strict")) > 0;
+    const bool dryrun = args.removeAll(QStringLiteral("--dry-run")) > 0;
     for (qsizetype i = 0; i < args.size(); ++i) {
         if (args[i] == QLatin1String("--entry") && i + 1 < args.size()) {
             entrypath = args[i + 1];
@@ -52,8 +59,8 @@ int cliaddentry(QStringList args)
         return clifail(error);
     args += operands;
     if (args.size() != 1 || entrypath.isEmpty())
-        return clifail(QStringLiteral("add-entry needs a family file and an entry: "
-                                      "quillmark-cli add-entry FILE --entry ENTRY.json [--settings S.ini]"));
+        return clifail(QStringLiteral("add-entry needs a family file and an entry: quillmark-cli add-entry FILE "
+                                      "--entry ENTRY.json [--strict] [--dry-run] [--settings S.ini]"));
     const QString path = args.front();
     error = checkfamilypath(path);
     if (!error.isEmpty())
@@ -73,11 +80,12 @@ int cliaddentry(QStringList args)
 
     // The backup copy is made while the file loads: the copy is mostly the
     // kernel's and the disk's work, the load the processor's. The save road
-    // takes it only if the file is still as loaded.
-    std::future<backupresult> early =
-        std::async(std::launch::async, [&path, folder = s.backupfolder] { return makebackup(path, folder); });
+    // takes it only if the file is still as loaded. A dry run makes none.
+    std::future<backupresult> early;
+    if (!dryrun)
+        early = std::async(std::launch::async, [&path, folder = s.backupfolder] { return makebackup(path, folder); });
     const readoutcome loaded = loadfamily(*f, path);
-    const backupresult made = early.get();
+    const backupresult made = early.valid() ? early.get() : backupresult();
     backupguard guard{made.path};
     if (!loaded.ok)
         return clifail(loaded.error);
@@ -87,6 +95,28 @@ int cliaddentry(QStringList args)
     error = makeentry(e, ix, s, entry);
     if (!error.isEmpty())
         return clifail(error);
+
+    // The household against the tree; --strict asks for it even when the setting turns it off.
+    if (s.householdcheck || strict) {
+        const std::vector<householdfinding> findings = householdcheck(ix, s, entry);
+        for (const householdfinding& x : findings) {
+            if (x.severity == findingseverity::warning)
+                cliwarn(findingline(x));
+            else
+                clinote(findingline(x));
+        }
+        if (strict && anywarning(findings))
+            return clifail(QStringLiteral("the household check found problems (above), so the entry was not saved "
+                                          "(--strict)"));
+    }
+    if (dryrun) {
+        const savepreview preview = previewentry(ix, s, entry);
+        if (!preview.ok)
+            return clifail(preview.message);
+        printtext(unifieddiff(preview));
+        (void)loaded.index.release();
+        return 0;
+    }
 
     guard.path.clear(); // the save road uses the backup or removes it
     rewriterequest request;

@@ -78,11 +78,10 @@ int clicoverage(QStringList args)
     const auto f = openfamily(args, usage(), inipath);
     if (!f)
         return clifailure;
-    const settings& s = f->settings->values;
+    const settings& s = f->values();
     if (country.isEmpty())
         country = s.country;
-    loadresult& loaded = f->loaded;
-    const gedcomindex& ix = *loaded.index;
+    const gedcomindex& ix = *f->file.index();
 
     const censuscoverage c = computecoverage(ix, country, s.residence);
     std::vector<size_t> columns;
@@ -149,7 +148,7 @@ int clicoverage(QStringList args)
     if (std::fflush(stdout) != 0 || std::ferror(stdout))
         return clifail(QStringLiteral("the coverage could not be written to standard output"));
     // The process ends here: the system takes the index's memory back at once.
-    (void)loaded.index.release();
+    f->file.abandonindex();
     return 0;
 }
 

@@ -20,8 +20,9 @@ const std::vector<clicommand>& clicommands()
     static const std::vector<clicommand> commands = {
         {"stats", "FILE [--settings S.ini]",
          "load FILE and print what it holds as one JSON object (individuals, sources, places, ...)", clistats},
-        {"add-entry", "FILE --entry ENTRY.json [--settings S.ini]",
-         "save the census entry described by ENTRY.json into FILE (backup, rewrite, census log); see docs/cli.md",
+        {"add-entry", "FILE --entry ENTRY.json [--strict] [--dry-run] [--settings S.ini]",
+         "save the census entry described by ENTRY.json into FILE (backup, rewrite, census log), after the household "
+         "check's warnings; --strict refuses it on them, --dry-run prints the lines it would write; see docs/cli.md",
          cliaddentry},
         {"flag-check", "FILE [--apply] [--country-for PLACE=COUNTRY]... [--settings S.ini]",
          "list the census flags to add and remove as the Flag Check dialog does; --apply makes the changes",
@@ -35,6 +36,10 @@ const std::vector<clicommand>& clicommands()
         {"coverage", "FILE [--country C] [--year Y] [--missing-only] [--format csv|json] [--settings S.ini]",
          "for every individual and census of the country: recorded, not alive, uncertain, elsewhere or missing",
          clicoverage},
+        {"undo", "FILE [--settings S.ini]",
+         "put FILE back as it was before the last change any Quillmark command or window made to it, when it has "
+         "not changed since; see docs/cli.md",
+         cliundo},
     };
     return commands;
 }

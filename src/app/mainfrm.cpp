@@ -14,6 +14,7 @@
 #include "tools/coveragefrm.h"
 #include "writer/backups.h"
 #include "writer/maketitle.h"
+#include "writer/undoprompts.h"
 
 #include <QAction>
 #include <QApplication>
@@ -92,6 +93,11 @@ void mainfrm::buildmenus()
 
     QMenu* edit = menuBar()->addMenu(QStringLiteral("&Edit"));
     edit->setObjectName(QStringLiteral("editmen"));
+    connect(item(edit, "undomen", QStringLiteral("&Undo Last Census Entry")), &QAction::triggered, this, [this] {
+        if (file_.index() && !saving_)
+            runtool([this] { reloadneeded_ = askundolast(file_.path(), file_.currentsettings(), prompts_); });
+    });
+    edit->addSeparator();
     copymen_ = item(edit, "copymen", QStringLiteral("Copy"));
     cutmen_ = item(edit, "cutmen", QStringLiteral("Cut"));
     pastemen_ = item(edit, "pastemen", QStringLiteral("Paste"));
@@ -197,6 +203,10 @@ void mainfrm::buildform()
     addbut_ = new QPushButton(QStringLiteral("Save Census Entry"), central);
     addbut_->setObjectName(QStringLiteral("addbut"));
     connect(addbut_, &QPushButton::clicked, this, &mainfrm::saveentry);
+    previewbut_ = new QPushButton(QStringLiteral("Preview..."), central);
+    previewbut_->setObjectName(QStringLiteral("previewbut"));
+    previewbut_->setToolTip(QStringLiteral("Show the lines that saving this entry would write, without saving it"));
+    connect(previewbut_, &QPushButton::clicked, this, &mainfrm::previewentry);
     Autosourcebut_ = new QPushButton(QStringLiteral("Auto Text"), central);
     Autosourcebut_->setObjectName(QStringLiteral("Autosourcebut"));
     Autosourcebut_->setToolTip(QStringLiteral(
@@ -213,6 +223,7 @@ void mainfrm::buildform()
     reloadbut_->setToolTip(QStringLiteral("Read the family file again"));
     connect(reloadbut_, &QPushButton::clicked, this, &mainfrm::reload);
     buttons->addWidget(addbut_);
+    buttons->addWidget(previewbut_);
     buttons->addWidget(Autosourcebut_);
     buttons->addStretch(1);
     buttons->addWidget(findbut_);

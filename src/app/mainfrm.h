@@ -66,6 +66,8 @@ public slots:
     // "Save Census Entry" (addbut, savemen): checks the form, asks for birth
     // details, writes the entry and clears the form (entryform_ui.cpp).
     void saveentry();
+    // "Preview...": the form's checks, then what the save would write (entryform_ui.cpp).
+    void previewentry();
 
 protected:
     void closeEvent(QCloseEvent* event) override;
@@ -121,6 +123,9 @@ private:
     void autotextclicked();
     void edittext(int mode);
     void dividermoved(double share);
+    // The save's checks of the form: false when they refused it (the message
+    // shown, the field focused); otherwise the census date to write.
+    bool checkform(entryform& form, QString& entrydate);
     // The form as the save's checks read it (rows already stored).
     entryform currentform() const;
     // The birth details dialog for each individual of the entry who has no
@@ -194,6 +199,7 @@ private:
     householdpanel* household_ = nullptr;
     QLabel* infolab_ = nullptr;
     QPushButton* addbut_ = nullptr;
+    QPushButton* previewbut_ = nullptr;
     QPushButton* Autosourcebut_ = nullptr;
     QPushButton* reloadbut_ = nullptr;
     QPushButton* findbut_ = nullptr;

@@ -7,6 +7,8 @@
 #include "census/birthfrm.h"
 #include "census/censustable.h"
 #include "census/entrypanel_ui.h"
+#include "census/householdcheck.h"
+#include "census/householdcheckfrm.h"
 #include "census/householdpanel_ui.h"
 #include "census/sourcetextfrm.h"
 #include "census/validateentry.h"
@@ -15,6 +17,7 @@
 #include "platform/encoding.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
+#include "writer/previewfrm.h"
 #include "writer/saveprompts.h"
 
 #include <QApplication>
@@ -208,24 +211,9 @@ censusentry mainfrm::gatherentry(const entryform& form, const QString& entrydate
     return e;
 }
 
-void mainfrm::saveentry()
+bool mainfrm::checkform(entryform& form, QString& entrydate)
 {
-    // Pending clicks are let through below: a second click on Save must not
-    // start a second save of the same entry.
-    if (!file_.index() || saving_)
-        return;
-    saving_ = true;
-    const struct done {
-        bool& flag;
-        ~done() { flag = false; }
-    } guard{saving_};
-    if (!checkages())
-        return;
-    storerows();
-    QApplication::processEvents();
-
     entrypanel* p = panel();
-    entryform form = currentform();
     const entrycheck check = validateentry(form, file_.currentsettings(), &prompts_);
     if (check.datechanged) {
         // The date as written into the file; the title follows it.
@@ -255,9 +243,62 @@ void mainfrm::saveentry()
         case entryfield::none:
             break;
         }
-        return;
+        return false;
     }
-    const QString entrydate = check.entrydate;
+    entrydate = check.entrydate;
+    return true;
+}
+
+void mainfrm::previewentry()
+{
+    if (!file_.index() || saving_ || !checkages())
+        return;
+    storerows();
+    entryform form = currentform();
+    QString entrydate;
+    if (checkform(form, entrydate) &&
+        !showentrypreview(*file_.index(), file_.currentsettings(), gatherentry(form, entrydate), prompts_, this))
+        reload();
+}
+
+void mainfrm::saveentry()
+{
+    // Pending clicks are let through below: a second click on Save must not
+    // start a second save of the same entry.
+    if (!file_.index() || saving_)
+        return;
+    saving_ = true;
+    const struct done {
+        bool& flag;
+        ~done() { flag = false; }
+    } guard{saving_};
+    if (!checkages())
+        return;
+    storerows();
+    QApplication::processEvents();
+
+    entryform form = currentform();
+    QString entrydate;
+    if (!checkform(form, entrydate))
+        return;
+    if (file_.currentsettings().householdcheck) {
+        std::vector<householdfinding> findings;
+        {
+            busycursor busy(prompts_);
+            findings = householdcheck(*file_.index(), file_.currentsettings(), gatherentry(form, entrydate));
+        }
+        // "Go back": the row of the finding is shown and its age box takes the focus.
+        if (const std::optional<int> back = householdcheckfrm::ask(findings, this)) {
+            if (*back < rows_.toprow || *back >= rows_.toprow + householdrows::visible) {
+                rows_.toprow = std::max(0, *back - householdrows::visible + 1);
+                showrows(rows_.toprow);
+            }
+            QLineEdit* age = household_->rows->agebox(*back - rows_.toprow);
+            age->setFocus();
+            age->selectAll();
+            return;
+        }
+    }
 
     repaint();
     // The place typed is offered by the place completion from now on.

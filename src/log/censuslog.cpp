@@ -102,6 +102,11 @@ void modeonelines(const settings& s, const logentry& e, QStringList& out)
 
 } // namespace
 
+QString logtimestamp()
+{
+    return timestamp();
+}
+
 QString logseparator()
 {
     return QString(78, u'=');
@@ -153,6 +158,16 @@ QString writerenameentry(const settings& s, const QString& from, const QString& 
 {
     return appendlines(s, {logseparator(), QStringLiteral("Image renamed on: ") + timestamp(),
                            QStringLiteral("From: ") + native(from), QStringLiteral("To: ") + native(to)});
+}
+
+QString writeundoentry(const settings& s, const QString& gedcomfile, const QString& summary, const QString& made,
+                       const QString& restoredfrom, const QString& backup)
+{
+    return appendlines(s, {logseparator(), QStringLiteral("Change undone: ") + timestamp(),
+                           QStringLiteral("In GEDCOM File: ") + native(gedcomfile),
+                           QStringLiteral("Undone: ") + summary + QStringLiteral(" (made ") + made + u')',
+                           QStringLiteral("Put back from backup: ") + native(restoredfrom),
+                           QStringLiteral("The file as it was before the undo is in backup: ") + native(backup)});
 }
 
 QString writelogentry(const settings& s, const logentry& e)

@@ -58,4 +58,14 @@ QString logseparator();
 // returns like writelogentry.
 QString writerenameentry(const settings& s, const QString& from, const QString& to);
 
+// Appends the entry noting that the last change to a family file was undone:
+// what that change was and when it was made (summary, made), the backup put
+// back, and the backup of the file as it was before the undo. Returns like
+// writelogentry.
+QString writeundoentry(const settings& s, const QString& gedcomfile, const QString& summary, const QString& made,
+                       const QString& restoredfrom, const QString& backup);
+
+// The local date and time as log entries give it ("2026-12-04 23:50:07").
+QString logtimestamp();
+
 } // namespace qm

@@ -334,6 +334,46 @@ datephraseyears dateyears(QStringView date, const std::optional<QDate>& census, 
     return r;
 }
 
+std::optional<dayspan> datespan(QStringView date, dateorder order)
+{
+    datewords w;
+    splitdate(date, w);
+    dayspan r;
+    QDate earliest, latest;
+    if (w.canage) {
+        if (!birthrange(w.used, order, earliest, latest))
+            return std::nullopt;
+        r.earliest = earliest;
+        r.latest = latest;
+        r.approximate = w.q != nullptr;
+        return r;
+    }
+    r.bounded = true;
+    const QLatin1StringView q(w.q->word);
+    if (q == QLatin1StringView("BET") || q == QLatin1StringView("FROM")) {
+        const qsizetype to = w.used.indexOf(QStringView(q == QLatin1StringView("BET") ? u"AND" : u"TO"));
+        const QList<QStringView> first = to < 0 ? w.used : w.used.first(to);
+        if (!birthrange(first, order, earliest, latest))
+            return std::nullopt;
+        r.earliest = earliest;
+        if (to < 0)
+            return q == QLatin1StringView("BET") ? std::nullopt : std::optional<dayspan>(r);
+        if (!birthrange(w.used.sliced(to + 1), order, earliest, latest))
+            return std::nullopt;
+        r.latest = latest;
+        return r;
+    }
+    if (!birthrange(w.used, order, earliest, latest))
+        return std::nullopt;
+    if (q == QLatin1StringView("AFT"))
+        r.earliest = latest.addDays(1);
+    else if (q == QLatin1StringView("BEF"))
+        r.latest = earliest.addDays(-1);
+    else // TO
+        r.latest = latest;
+    return r;
+}
+
 datephraseresult datephrase(QStringView date, const std::optional<QDate>& census, dateorder order)
 {
     datephraseresult r;

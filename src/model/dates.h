@@ -80,6 +80,19 @@ datephraseyears dateyears(QStringView date, const std::optional<QDate>& census, 
 QString personinfo(const personrec& person, const std::optional<QDate>& census, dateorder order);
 QString personinfo(const personrec& person, const QString& censusdatetext);
 
+// The days a GEDCOM date allows. Plain, ABT, EST and CAL dates: the days of
+// their day, month or year, as their age phrase counts them. BET ... AND and
+// FROM ... TO: from the first date's first day to the second date's last.
+// AFT: the days after the date; BEF: the days before it; FROM or TO alone: from
+// or up to the date. An end the date leaves open is empty. Nothing for a date
+// these words do not give (a date phrase, no four-digit year, BET without AND).
+struct dayspan {
+    std::optional<QDate> earliest, latest;
+    bool approximate = false; // ABT, EST or CAL
+    bool bounded = false;     // BET, AFT, BEF, FROM or TO: the date states bounds, not a day
+};
+std::optional<dayspan> datespan(QStringView date, dateorder order);
+
 struct datecheck {
     bool isdate = false;
     // The text the census date box is to hold instead of what was typed, when

@@ -28,6 +28,7 @@ void takeoptions(settings& to, const settings& form)
     to.logpath = form.logpath;
     to.country = form.country;
     to.birthdate = form.birthdate;
+    to.householdcheck = form.householdcheck;
     to.certainty = form.certainty;
     to.residence = form.residence;
     to.sourcetype = form.sourcetype;

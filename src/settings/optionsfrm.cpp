@@ -258,6 +258,11 @@ QWidget* optionsfrm::methodstab()
     birthchk = check(birth, "birthchk",
                      QStringLiteral("Create a calculated birth event for individuals who don't have a birth recorded"));
 
+    QGroupBox* household = frame(QStringLiteral("Household check"), "householdcheckfra");
+    householdcheckchk = check(household, "householdcheckchk",
+                              QStringLiteral("Before saving, check the household against the family file: ages, "
+                                             "deaths, a household entered twice"));
+
     QGroupBox* autotext = frame(QStringLiteral("Auto Text"), "autotextfra");
     marriageconditionchk = check(autotext, "marriageconditionchk",
                                  QStringLiteral("Add a column for the marriage condition to the Auto-text"));
@@ -298,7 +303,7 @@ QWidget* optionsfrm::methodstab()
                                      "attribute."));
 
     auto* columns = new QHBoxLayout(tab);
-    columns->addWidget(column({method, birth, autotext}, tab), 3);
+    columns->addWidget(column({method, birth, household, autotext}, tab), 3);
     columns->addWidget(column({assessment, occupation}, tab), 2);
     return tab;
 }
@@ -420,6 +425,7 @@ settings optionsfrm::form() const
                                           : QStringLiteral("UK");
     s.autoreference = autorefchk->isChecked();
     s.birthdate = birthchk->isChecked();
+    s.householdcheck = householdcheckchk->isChecked();
     s.fullentry = !methodopt[1]->isChecked();
     int choice = -1;
     for (int i = 0; i < 4; ++i)
@@ -464,6 +470,7 @@ void optionsfrm::showform(const settings& s)
     country->setChecked(true);
     autorefchk->setChecked(s.autoreference);
     birthchk->setChecked(s.birthdate);
+    householdcheckchk->setChecked(s.householdcheck);
     methodopt[s.fullentry ? 0 : 1]->setChecked(true);
     const int choice = choiceofcertainty(s.certainty);
     (choice < 0 ? Norecordopt : assessmentopt[static_cast<size_t>(choice)])->setChecked(true);

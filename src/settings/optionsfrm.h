@@ -101,6 +101,7 @@ public:
     QCheckBox* autorefchk = nullptr;
     // Recording Methods
     QCheckBox* birthchk = nullptr;
+    QCheckBox* householdcheckchk = nullptr;
     std::array<QRadioButton*, 2> methodopt{};
     QRadioButton* Norecordopt = nullptr;
     std::array<QRadioButton*, 4> assessmentopt{};

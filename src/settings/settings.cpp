@@ -272,6 +272,8 @@ settingsload loadsettings(settingsstore& store)
         s.imageoption = *option;
     if (const auto rename = store.read(QStringLiteral("Rename File")); rename && rename->size() == 1)
         s.renamefile = *rename == QLatin1String("1");
+    if (const auto check = store.read(QStringLiteral("Household Check")); check && check->size() == 1)
+        s.householdcheck = *check != QLatin1String("0");
 
     if (failedgroup <= 7)
         saveflagsettings(store, s);
@@ -287,6 +289,8 @@ void savesettings(settingsstore& store, const settings& s)
         const entry& e = entrynamed(name);
         store.write(QLatin1String(e.name), textof(s, e));
     }
+    // Not one of the groups: older versions neither write nor read it.
+    store.write(QStringLiteral("Household Check"), s.householdcheck ? QStringLiteral("1") : QStringLiteral("0"));
     store.sync();
 }
 

@@ -65,6 +65,10 @@ struct settings {
     QString imagefolder;         // "Image Folder"
     QString imageoption = QStringLiteral("0"); // "Image Option"
     bool renamefile = false;     // "Rename File"
+    // "Household Check": the household is compared with the tree before a
+    // census entry is saved. One character, on unless "0"; read whatever
+    // happened to the groups, so that a store without it keeps the check on.
+    bool householdcheck = true;
 
     // Settings incomplete (first run, or written by an older version): the
     // options dialog opens at start; saving the options clears it.

@@ -79,8 +79,9 @@ bool linewriter::open(const QString& path)
     return true;
 }
 
-void linewriter::openmemory()
+void linewriter::openmemory(size_t expected)
 {
+    mem_.reserve(expected);
     memory_ = true;
     mem_.clear();
 }
@@ -144,6 +145,7 @@ void linewriter::flush()
             fail(file_->errorstring());
             return;
         }
+        hash_.add(buf_.data(), static_cast<size_t>(want));
         written_ += want;
         if (written_ - sentback_ >= writebackstep) {
             startwriteback(file_->handle(), sentback_, written_ - sentback_);

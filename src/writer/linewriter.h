@@ -13,6 +13,7 @@
 // stays as it was. After the first failure nothing more is written and the
 // error is kept for the end.
 
+#include "platform/contenthash.h"
 #include "platform/encoding.h"
 #include "platform/replacefile.h"
 
@@ -44,9 +45,13 @@ public:
 
     // Starts the safe write of path. False with errorstring() on failure.
     bool open(const QString& path);
-    // Collects the bytes in memory instead (tests); memory() holds them.
-    void openmemory();
+    // Collects the bytes in memory instead (tests, previews); memory() holds
+    // them. `expected` bytes are reserved at once, so that a whole file's
+    // worth is not copied again and again as it grows.
+    void openmemory(size_t expected = 0);
     const std::string& memory() const { return mem_; }
+    // The bytes collected, handed over without a copy.
+    std::string takememory() { return std::move(mem_); }
 
     // A line kept from the input, as the line reader handed it out.
     void writeline(std::string_view line);
@@ -82,6 +87,9 @@ public:
     QString errorstring() const { return error_; }
     int64_t lines() const { return lines_; }
     textencoding encoding() const { return enc_; }
+    // The hash (contenthash.h) of the bytes handed to the file so far: after
+    // commit, of the whole new file.
+    uint64_t writtenhash() const { return hash_.value(); }
 
 private:
     void fail(const QString& error);
@@ -99,6 +107,7 @@ private:
     int64_t written_ = 0;  // bytes handed to the device
     int64_t sentback_ = 0; // bytes of them sent on to the disk
     int64_t lines_ = 0;
+    contenthash hash_;
     bool failed_ = false;
     bool started_ = false;
     bool withdrawn_ = false, inplace_ = false, damaged_ = false;

@@ -847,6 +847,7 @@ void commit(linewriter& out, rewritemode mode, rewriteresult& r, const replacefi
         return;
     const bool done = out.commit(check);
     r.inplace = out.inplace();
+    r.writtenhash = out.writtenhash();
     if (done)
         return;
     r.ok = false;
@@ -906,10 +907,11 @@ rewriteresult rewritebytes(std::string_view input, std::string& output, const ge
     if (!bad.isEmpty())
         return refuse(bad);
     linewriter out(in.encoding(), in.hasbom());
-    out.openmemory();
+    // The new content is the old one and a little more: room for it at once.
+    out.openmemory(input.size() + input.size() / 32 + 65536);
     rewriteresult r = runrewrite(in, out, index, s, request);
     commit(out, request.mode, r);
-    output = r.ok ? out.memory() : std::string();
+    output = r.ok ? out.takememory() : std::string();
     return r;
 }
 

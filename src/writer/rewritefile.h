@@ -89,6 +89,7 @@ struct rewriteresult {
     int32_t censusblocks = 0;        // mode 1: individuals whose census block was written
     int32_t linksadded = 0;          // mode 2: image links written into the source
     int64_t lines = 0;               // lines written
+    uint64_t writtenhash = 0;        // the hash of the family file as written (platform/contenthash.h)
 };
 
 // Runs the rewrite from inputpath to outputpath (they may be the same path).

@@ -10,6 +10,8 @@ aftersave tellsaveoutcome(prompts& p, const saveoutcome& out)
     case savestatus::saved:
         if (!out.logerror.isEmpty())
             p.tell(out.logerror, icon::critical);
+        if (!out.undoerror.isEmpty())
+            p.tell(out.undoerror, icon::exclamation);
         return aftersave::saved;
     case savestatus::changed:
         return aftersave::changed;

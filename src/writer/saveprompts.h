@@ -16,8 +16,8 @@ enum class aftersave {
 };
 
 // Refused and failed backups are shown as warnings, a failed rewrite as an
-// error; after a save, a census log entry that could not be written is shown
-// as a warning.
+// error; after a save, a census log entry that could not be written, and a
+// change that could not be noted for an undo, are shown as warnings.
 aftersave tellsaveoutcome(prompts& p, const saveoutcome& out);
 
 } // namespace qm

@@ -7,6 +7,7 @@
 #include "platform/replacefile.h"
 #include "settings/settings.h"
 #include "writer/rewritechecks.h"
+#include "writer/undolast.h"
 
 #include <QDir>
 #include <QFile>
@@ -179,6 +180,7 @@ saveoutcome savechange(const gedcomindex& index, const settings& s, const rewrit
 
     out.status = savestatus::saved;
     out.newstamp = stampof(family);
+    out.undoerror = notelastchange(index, s, request, out);
     if (s.keeplog) {
         out.logerror = writelogentry(s, logfor(index, request, out.rewrite));
         out.logwritten = out.logerror.isEmpty();

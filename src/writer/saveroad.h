@@ -41,6 +41,7 @@ struct saveoutcome {
     bool logwritten = false;
     QString logerror;   // after a save: the log entry could not be written (shown, the save stands)
     filestamp newstamp; // after a save: the family file's new stamp
+    QString undoerror;  // after a save: what an undo needs could not be noted (shown, the save stands)
     rewriteresult rewrite;
 
     bool saved() const { return status == savestatus::saved; }

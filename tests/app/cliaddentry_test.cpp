@@ -54,12 +54,14 @@ protected:
         store->sync();
     }
 
-    run addentry(const std::string& json, const QString& target = QString())
+    run addentry(const std::string& json, const QString& target = QString(), const QStringList& options = {})
     {
         const QString entry = dir.filePath(QStringLiteral("entry.json"));
         writefile(entry, json);
-        const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), target.isEmpty() ? file : target,
-                                                 QStringLiteral("--entry"), entry, QStringLiteral("--settings"), ini},
+        const qmtest::clirun r = qmtest::runcli(QStringList{QStringLiteral("add-entry"), target.isEmpty() ? file : target,
+                                                            QStringLiteral("--entry"), entry, QStringLiteral("--settings"),
+                                                            ini}
+                                                    + options,
                                                 dir.path());
         return qmtest::astext(r);
     }
@@ -274,4 +276,91 @@ TEST_F(CliAddEntry, DoubleDashEndsTheOptions)
                                            dir.path(), dir.path());
     EXPECT_EQ(r.status, 0) << r.err.toStdString();
     EXPECT_NE(readfile(odd), family);
+}
+
+// The household check's findings are warnings; --strict refuses on them;
+// --dry-run prints the lines the save would write and writes nothing.
+TEST_F(CliAddEntry, HouseholdCheckAndDryRun)
+{
+    // Mary, born 1812, typed as 58 in 1851.
+    const std::string entry = R"({"year": 1851, "place": "Leeds", "reference": "HO107/2320", "individuals": [
+        {"id": 1, "age": "39"}, {"id": 2, "age": "58"}]})";
+    const std::string warning = "quillmark-cli: warning: Row 2: Smith, Mary (ID: 2) is entered as aged 58, but by the "
+                                "tree was born in 1812 and in this census would be aged 38 or 39.\n";
+    const QDir backups(dir.filePath(QStringLiteral("backups")));
+
+    run r = addentry(entry, QString(), {QStringLiteral("--strict")});
+    EXPECT_EQ(r.status, 2);
+    EXPECT_EQ(r.err, warning + "quillmark-cli: the household check found problems (above), so the entry was not "
+                               "saved (--strict)\n");
+    EXPECT_EQ(readfile(file), family);
+    EXPECT_TRUE(backups.isEmpty());
+
+    r = addentry(entry, QString(), {QStringLiteral("--dry-run")});
+    EXPECT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.err, warning);
+    EXPECT_EQ(r.out.rfind("--- a/family.ged\n+++ b/family.ged\n@@ -2,", 0), 0u) << r.out;
+    EXPECT_NE(r.out.find("\n+1 CENS\n+2 DATE 30 MAR 1851\n+2 PLAC Leeds\n+2 AGE 58y\n+2 SOUR @S3@\n"), std::string::npos)
+        << r.out;
+    EXPECT_NE(r.out.find("\n+0 @S3@ SOUR\n"), std::string::npos) << r.out;
+    EXPECT_EQ(readfile(file), family) << "a dry run writes nothing";
+    EXPECT_TRUE(backups.isEmpty());
+    EXPECT_FALSE(QFileInfo::exists(dir.filePath(QStringLiteral("censuslog.txt"))));
+
+    // The dry run's lines are what the save writes (byte for byte in the preview's own test).
+    const std::string diff = r.out;
+    r = addentry(entry);
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(r.err, warning);
+    const std::string written = readfile(file);
+    for (size_t at = diff.find("\n+"); at != std::string::npos; at = diff.find("\n+", at + 1)) {
+        const std::string line = diff.substr(at + 2, diff.find('\n', at + 1) - at - 2);
+        // The change stamp's time is the moment of each run.
+        if (line != "++ b/family.ged" && !line.starts_with("3 TIME ")) {
+            EXPECT_NE(written.find(line + "\r\n"), std::string::npos) << line;
+        }
+    }
+
+    // With the setting off, no check; --strict asks for it all the same.
+    writefile(file, family);
+    setting(QStringLiteral("Household Check"), QStringLiteral("0"));
+    r = addentry(entry, QString(), {QStringLiteral("--dry-run")});
+    EXPECT_EQ(r.status, 0);
+    EXPECT_EQ(r.err, "");
+    EXPECT_EQ(addentry(entry, QString(), {QStringLiteral("--strict")}).status, 2);
+}
+
+TEST_F(CliAddEntry, UndoTakesBackTheLastChange)
+{
+    const auto undo = [&] {
+        return qmtest::astext(qmtest::runcli({QStringLiteral("undo"), file, QStringLiteral("--settings"), ini}, dir.path()));
+    };
+    run r = undo();
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.find("has no change to"), std::string::npos) << r.err;
+
+    const std::string entry = R"({"year": 1851, "place": "Leeds", "reference": "HO107/2320", )" + household + "}";
+    ASSERT_EQ(addentry(entry).status, 0);
+    const std::string saved = readfile(file);
+    r = undo();
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_EQ(readfile(file), family);
+    const QJsonObject j = r.json();
+    EXPECT_EQ(j.value(QStringLiteral("undone")).toString(),
+              QStringLiteral("Census entry added: Census 1851 Leeds HO107/2320 (ID: 3), 2 individuals"));
+    EXPECT_EQ(readfile(j.value(QStringLiteral("backup")).toString()), saved);
+    EXPECT_TRUE(j.value(QStringLiteral("log")).toBool());
+    EXPECT_NE(readfile(dir.filePath(QStringLiteral("censuslog.txt"))).find("Change undone: "), std::string::npos);
+    r = undo();
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.find("was undone at"), std::string::npos) << r.err;
+
+    // A change made by another program after the save is never undone over.
+    ASSERT_EQ(addentry(entry).status, 0);
+    writefile(file, readfile(file) + "0 @N1@ NOTE later\r\n");
+    const std::string later = readfile(file);
+    r = undo();
+    EXPECT_EQ(r.status, 2);
+    EXPECT_NE(r.err.find("has been changed since"), std::string::npos) << r.err;
+    EXPECT_EQ(readfile(file), later);
 }

@@ -123,5 +123,5 @@ TEST_F(CliDateCheck, AppliesTheSuggestedChanges)
     ASSERT_EQ(again.status, 0);
     EXPECT_FALSE(again.out.contains(QStringLiteral("Backup:")));
     EXPECT_EQ(qmtest::readfile(path), after);
-    EXPECT_EQ(QDir(dir.filePath(QStringLiteral("backups"))).entryList(QDir::Files).size(), 1);
+    EXPECT_EQ(QDir(dir.filePath(QStringLiteral("backups"))).entryList({QStringLiteral("QM Backup*")}, QDir::Files).size(), 1);
 }

@@ -67,7 +67,7 @@ protected:
 
     QStringList backups() const
     {
-        return QDir(dir.filePath(QStringLiteral("backups"))).entryList(QDir::Files);
+        return QDir(dir.filePath(QStringLiteral("backups"))).entryList({QStringLiteral("QM Backup*")}, QDir::Files);
     }
 
     QTemporaryDir dir;

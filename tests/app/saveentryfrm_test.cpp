@@ -105,6 +105,8 @@ private:
         s.logpath = folder + QStringLiteral("/censuslog.txt");
         // The Census Images dialog is tested on its own (imagesfrm_test).
         s.requestimage = false;
+        // The household check is tested on its own (householdcheckfrm_test).
+        s.householdcheck = false;
         return s;
     }
     int runs_ = 0;
@@ -132,7 +134,7 @@ private:
         return run;
     }
 
-    static QStringList backups(const settings& s) { return QDir(s.backupfolder).entryList(QDir::Files); }
+    static QStringList backups(const settings& s) { return QDir(s.backupfolder).entryList({QStringLiteral("QM Backup*")}, QDir::Files); }
 
 private slots:
     void initTestCase()

@@ -86,7 +86,7 @@ class flagcheckfrmtest : public QObject {
         return loadgedcom(file, testflagdefs());
     }
 
-    int backupcount() const { return static_cast<int>(QDir(backups).entryList(QDir::Files).size()); }
+    int backupcount() const { return static_cast<int>(QDir(backups).entryList({QStringLiteral("QM Backup*")}, QDir::Files).size()); }
 
     // Starts the main window on `file` with the flag definitions in its store;
     // `queue` queues the prompts' answers after the default-file question.

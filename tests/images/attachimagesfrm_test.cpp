@@ -78,7 +78,7 @@ private:
         s.logpath = folder + QStringLiteral("/censuslog.txt");
         return s;
     }
-    static QStringList backups(const settings& s) { return QDir(s.backupfolder).entryList(QDir::Files); }
+    static QStringList backups(const settings& s) { return QDir(s.backupfolder).entryList({QStringLiteral("QM Backup*")}, QDir::Files); }
 
     // A small PNG beside the family files.
     QString png(const char* name)

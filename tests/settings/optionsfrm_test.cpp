@@ -202,10 +202,14 @@ private slots:
         // A change that needs no reload keeps the entry.
         QVERIFY(inoptions(w, [&](optionsfrm& f) {
             f.occagechk->click();
+            QVERIFY(f.householdcheckchk->isChecked());
+            f.householdcheckchk->click();
             f.savebut->click();
             QVERIFY(!f.isVisible());
         }));
         QVERIFY(w.currentsettings().occage);
+        QVERIFY(!w.currentsettings().householdcheck);
+        QCOMPARE(s->read("Household Check"), QStringLiteral("0"));
         QCOMPARE(w.household().selectioncount, 1);
 
         // Method and country changed: only the method question, then the file

@@ -294,7 +294,8 @@ TEST_F(SettingsTest, SaveWritesEveryDialogValueTrimmedAndReadsBack)
     const QString otherpath = other.filePath("saved.ini");
     savesettings(*settingsstore::onfile(otherpath), s);
     QSettings raw(otherpath, QSettings::IniFormat);
-    EXPECT_EQ(raw.allKeys().size(), 32);
+    EXPECT_EQ(raw.allKeys().size(), 33) << "the dialog's values and Household Check";
+    EXPECT_EQ(raw.value("Household Check").toString(), "1");
     for (const auto& [name, text] : fullstore()) {
         const QString expected = name.startsWith("Flag ") ? QString()
                                  : name == "Certainty"    ? QStringLiteral("-1")
@@ -327,3 +328,15 @@ TEST_F(SettingsTest, SaveFlagSettingsWritesOnlyTheTwoFlagValues)
 }
 
 } // namespace
+
+TEST_F(SettingsTest, HouseholdCheckIsOnUnlessTurnedOff)
+{
+    fill(fullstore());
+    EXPECT_TRUE(loadsettings(*store).values.householdcheck) << "a store of an older version keeps the check on";
+    store->write("Household Check", "0");
+    settings s = loadsettings(*store).values;
+    EXPECT_FALSE(s.householdcheck);
+    s.householdcheck = true;
+    savesettings(*store, s);
+    EXPECT_TRUE(loadsettings(*store).values.householdcheck);
+}

@@ -97,7 +97,7 @@ class datecheckfrmtest : public QObject {
         return s;
     }
 
-    int backupcount() const { return static_cast<int>(QDir(backups).entryList(QDir::Files).size()); }
+    int backupcount() const { return static_cast<int>(QDir(backups).entryList({QStringLiteral("QM Backup*")}, QDir::Files).size()); }
 
     // The sample with four census dates that are no census day and one of
     // another country's census; William's 1851 occupation cites his 1851 census.

@@ -93,7 +93,7 @@ protected:
         entry.selection = {qmtest::chosen(1, 0, "Smith, John", "40"), qmtest::chosen(2, 1, "Smith, Mary", "38")};
     }
 
-    QStringList backups() const { return QDir(s.backupfolder).entryList(QDir::Files); }
+    QStringList backups() const { return QDir(s.backupfolder).entryList({QStringLiteral("QM Backup*")}, QDir::Files); }
     QString lockpath() const { return family + QStringLiteral(".quillmark-lock"); }
     // Nothing but the family file is left beside it (no temporary files).
     QStringList besidefamily() const
