@@ -114,7 +114,7 @@ int cliaddentry(QStringList args)
         if (!preview.ok)
             return clifail(preview.message);
         printtext(unifieddiff(preview));
-        (void)loaded.index.release();
+        f->file.abandonindex();
         return 0;
     }
 
