@@ -1,18 +1,12 @@
 // quillmark-cli add-entry, run as a process on copies of family files.
 #include "platform/settingsstore.h"
-#include "settings/settings.h"
 #include "support/clirun.h"
 #include "support/heldfile.h"
 #include "support/testfiles.h"
 
-#include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QJsonObject>
 #include <QLockFile>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 #include <iostream>
 
@@ -34,36 +28,25 @@ const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
 
 using run = qmtest::clitextrun;
 
-class CliAddEntry : public ::testing::Test {
+class CliAddEntry : public qmtest::clitest {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
-        file = dir.filePath(QStringLiteral("family.ged"));
+        clitest::SetUp();
         writefile(file, family);
-        ini = dir.filePath(QStringLiteral("settings.ini"));
-        // A complete store: an absent value would send its group and all later
-        // ones back to their defaults.
-        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
     }
 
-    void setting(const QString& name, const QString& value)
+    void setting(const QString& name, const QString& value) const
     {
-        auto store = qm::settingsstore::onfile(ini);
-        store->write(name, value);
-        store->sync();
+        qm::settingsstore::onfile(ini)->write(name, value);
     }
 
-    run addentry(const std::string& json, const QString& target = QString(), const QStringList& options = {})
+    run addentry(const std::string& json, const QString& target = QString(), const QStringList& options = {}) const
     {
         const QString entry = dir.filePath(QStringLiteral("entry.json"));
         writefile(entry, json);
-        const qmtest::clirun r = qmtest::runcli(QStringList{QStringLiteral("add-entry"), target.isEmpty() ? file : target,
-                                                            QStringLiteral("--entry"), entry, QStringLiteral("--settings"),
-                                                            ini}
-                                                    + options,
-                                                dir.path());
-        return qmtest::astext(r);
+        return cli(QStringLiteral("add-entry"), QStringList{target.isEmpty() ? file : target, QStringLiteral("--entry"), entry}
+                                                    + options);
     }
 
     // A refused entry: status 2, the message on standard error, nothing written.
@@ -74,11 +57,8 @@ protected:
         EXPECT_EQ(r.err, "quillmark-cli: " + message + "\n") << json;
         EXPECT_EQ(r.out, "");
         EXPECT_EQ(readfile(file), family);
-        EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty());
+        EXPECT_TRUE(backupfolderempty());
     }
-
-    QTemporaryDir dir;
-    QString file, ini;
 };
 
 const std::string household = R"("individuals": [{"id": 1, "age": "39", "agetype": "Y", "occupation": "Weaver"},
@@ -190,7 +170,7 @@ TEST_F(CliAddEntry, RefusesWithTheFormsMessages)
     EXPECT_EQ(bad.status, 2);
     EXPECT_NE(bad.err.find("The occupation of Smith, John holds the character \"∧\""), std::string::npos) << bad.err;
     EXPECT_EQ(readfile(file), family);
-    EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty()) << "refused before the backup";
+    EXPECT_TRUE(backupfolderempty()) << "refused before the backup";
 
     setting(QStringLiteral("Full Entry"), QStringLiteral("0"));
     expectrefused("{" + base + R"("source": 2, )" + household + "}",
@@ -239,7 +219,7 @@ TEST_F(CliAddEntry, WaitsForNoOtherQuillmarkSavingTheFile)
               std::string::npos)
         << r.err;
     EXPECT_EQ(readfile(file), family);
-    EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty()) << "the backup made ahead is removed";
+    EXPECT_TRUE(backupfolderempty()) << "the backup made ahead is removed";
     other.unlock();
     EXPECT_EQ(addentry(entry).status, 0);
 }
@@ -287,14 +267,13 @@ TEST_F(CliAddEntry, HouseholdCheckAndDryRun)
         {"id": 1, "age": "39"}, {"id": 2, "age": "58"}]})";
     const std::string warning = "quillmark-cli: warning: Row 2: Smith, Mary (ID: 2) is entered as aged 58, but by the "
                                 "tree was born in 1812 and in this census would be aged 38 or 39.\n";
-    const QDir backups(dir.filePath(QStringLiteral("backups")));
 
     run r = addentry(entry, QString(), {QStringLiteral("--strict")});
     EXPECT_EQ(r.status, 2);
     EXPECT_EQ(r.err, warning + "quillmark-cli: the household check found problems (above), so the entry was not "
                                "saved (--strict)\n");
     EXPECT_EQ(readfile(file), family);
-    EXPECT_TRUE(backups.isEmpty());
+    EXPECT_TRUE(backupfolderempty());
 
     r = addentry(entry, QString(), {QStringLiteral("--dry-run")});
     EXPECT_EQ(r.status, 0) << r.err;
@@ -304,7 +283,7 @@ TEST_F(CliAddEntry, HouseholdCheckAndDryRun)
         << r.out;
     EXPECT_NE(r.out.find("\n+0 @S3@ SOUR\n"), std::string::npos) << r.out;
     EXPECT_EQ(readfile(file), family) << "a dry run writes nothing";
-    EXPECT_TRUE(backups.isEmpty());
+    EXPECT_TRUE(backupfolderempty());
     EXPECT_FALSE(QFileInfo::exists(dir.filePath(QStringLiteral("censuslog.txt"))));
 
     // The dry run's lines are what the save writes (byte for byte in the preview's own test).
@@ -332,9 +311,7 @@ TEST_F(CliAddEntry, HouseholdCheckAndDryRun)
 
 TEST_F(CliAddEntry, UndoTakesBackTheLastChange)
 {
-    const auto undo = [&] {
-        return qmtest::astext(qmtest::runcli({QStringLiteral("undo"), file, QStringLiteral("--settings"), ini}, dir.path()));
-    };
+    const auto undo = [&] { return cli(QStringLiteral("undo"), {file}); };
     run r = undo();
     EXPECT_EQ(r.status, 2);
     EXPECT_NE(r.err.find("has no change to"), std::string::npos) << r.err;

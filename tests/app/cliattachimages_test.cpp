@@ -1,17 +1,9 @@
 // quillmark-cli attach-images, run as a process on copies of family files.
-#include "platform/settingsstore.h"
-#include "settings/settings.h"
 #include "support/clirun.h"
 #include "support/testfiles.h"
 
-#include <QDir>
-#include <QFile>
 #include <QFileInfo>
 #include <QJsonArray>
-#include <QJsonObject>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 using qmtest::readfile;
 using qmtest::writefile;
@@ -29,19 +21,15 @@ const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n"
 
 using run = qmtest::clitextrun;
 
-class CliAttachImages : public ::testing::Test {
+class CliAttachImages : public qmtest::clitest {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
-        file = dir.filePath(QStringLiteral("family.ged"));
+        clitest::SetUp();
         writefile(file, family);
-        ini = dir.filePath(QStringLiteral("settings.ini"));
         qm::settings s = qmtest::clitestsettings(dir.path());
         s.asid = false;
-        const auto store = qm::settingsstore::onfile(ini);
-        qm::savesettings(*store, s);
-        qm::saveflagsettings(*store, s); // kept apart from the others, but read with them
+        qmtest::writeclisettings(ini, s);
         page1 = image("page1.png");
         page2 = image("page2.jpg");
     }
@@ -56,13 +44,7 @@ protected:
         return path;
     }
 
-    run attach(const QStringList& args)
-    {
-        const qmtest::clirun r = qmtest::runcli(QStringList{QStringLiteral("attach-images"), file} + args
-                                                    + QStringList{QStringLiteral("--settings"), ini},
-                                                dir.path());
-        return qmtest::astext(r);
-    }
+    run attach(const QStringList& args) const { return cli(QStringLiteral("attach-images"), QStringList{file} + args); }
 
     // Refused: status 2, the message on standard error, nothing written.
     void expectrefused(const QStringList& args, const std::string& message)
@@ -72,13 +54,12 @@ protected:
         EXPECT_NE(r.err.find(message), std::string::npos) << r.err;
         EXPECT_EQ(r.out, "");
         EXPECT_EQ(readfile(file), family);
-        EXPECT_TRUE(QDir(dir.filePath(QStringLiteral("backups"))).isEmpty());
+        EXPECT_TRUE(backupfolderempty());
     }
 
     std::string native(const QString& path) const { return QDir::toNativeSeparators(path).toStdString(); }
 
-    QTemporaryDir dir;
-    QString file, ini, page1, page2;
+    QString page1, page2;
 };
 
 } // namespace

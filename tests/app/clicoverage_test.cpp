@@ -7,23 +7,19 @@
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
-#include <QTemporaryDir>
 
 #include <gtest/gtest.h>
 
 namespace {
 
-class CliCoverage : public ::testing::Test {
+class CliCoverage : public qmtest::clitest {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
-        ini = dir.filePath(QStringLiteral("settings.ini"));
-        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
-        path = dir.filePath(QStringLiteral("family.ged"));
+        clitest::SetUp();
         // Ann: 1881 recorded, a residence in 1891; "Smith, "Jack"": born 1885;
         // =Cmd: no dates at all (a name a spreadsheet would run).
-        qmtest::writefile(path, "0 HEAD\r\n1 CHAR UTF-8\r\n"
+        qmtest::writefile(file, "0 HEAD\r\n1 CHAR UTF-8\r\n"
                                 "0 @I3@ INDI\r\n1 NAME Ann /Kelly/\r\n1 BIRT\r\n2 DATE 1850\r\n"
                                 "1 CENS\r\n2 DATE 3 APR 1881\r\n2 PLAC Leeds, England\r\n"
                                 "1 RESI\r\n2 DATE 5 APR 1891\r\n2 PLAC Leeds, England\r\n"
@@ -33,13 +29,8 @@ protected:
 
     qmtest::clitextrun coverage(const QStringList& args) const
     {
-        return qmtest::astext(qmtest::runcli(QStringList{QStringLiteral("coverage"), path} + args
-                                             + QStringList{QStringLiteral("--settings"), ini},
-                                             dir.path()));
+        return cli(QStringLiteral("coverage"), QStringList{file} + args);
     }
-
-    QTemporaryDir dir;
-    QString ini, path;
 };
 
 } // namespace

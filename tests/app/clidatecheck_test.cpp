@@ -1,45 +1,19 @@
 // quillmark-cli date-check, run as a user would run it: the three lists on the
 // bundled sample, --country, --apply and its refusals.
-#include "platform/settingsstore.h"
-#include "settings/settings.h"
-
 #include "support/clirun.h"
 #include "support/testfiles.h"
 
-#include <QDir>
-#include <QFile>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
-
 namespace {
 
-struct run {
-    int status = -1;
-    QString out;
-    QByteArray err;
-};
+using run = qmtest::clitextrun;
 
-class CliDateCheck : public ::testing::Test {
+class CliDateCheck : public qmtest::clitest {
 protected:
-    void SetUp() override
-    {
-        ASSERT_TRUE(dir.isValid());
-        ini = dir.filePath(QStringLiteral("settings.ini"));
-        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
-    }
-
-    run datecheck(const QStringList& args) const
-    {
-        const qmtest::clirun r = qmtest::runcli(
-            QStringList{QStringLiteral("date-check")} + args + QStringList{QStringLiteral("--settings"), ini}, dir.path());
-        return {r.status, QString::fromUtf8(r.out), r.err};
-    }
+    run datecheck(const QStringList& args) const { return cli(QStringLiteral("date-check"), args); }
 
     // A copy of the sample with some census dates changed.
     QString sample(const std::vector<std::pair<std::string, std::string>>& edits = {})
     {
-        const QString path = dir.filePath(QStringLiteral("sample.ged"));
         std::string bytes = qmtest::readfile(qmtest::samplefile());
         for (const auto& [from, to] : edits) {
             const size_t at = bytes.find(from);
@@ -47,21 +21,17 @@ protected:
             if (at != std::string::npos)
                 bytes.replace(at, from.size(), to);
         }
-        QFile::remove(path);
-        qmtest::writefile(path, bytes);
-        return path;
+        qmtest::writefile(file, bytes);
+        return file;
     }
-
-    QTemporaryDir dir;
-    QString ini;
 };
 
 void expectfailure(const run& r, const char* contains)
 {
     EXPECT_EQ(r.status, 2);
-    EXPECT_TRUE(r.out.isEmpty()) << r.out.toStdString();
-    EXPECT_TRUE(r.err.startsWith("quillmark-cli: ")) << r.err.toStdString();
-    EXPECT_TRUE(r.err.contains(contains)) << r.err.toStdString();
+    EXPECT_EQ(r.out, "");
+    EXPECT_TRUE(r.err.starts_with("quillmark-cli: ")) << r.err;
+    EXPECT_NE(r.err.find(contains), std::string::npos) << r.err;
 }
 
 } // namespace
@@ -69,8 +39,8 @@ void expectfailure(const run& r, const char* contains)
 TEST_F(CliDateCheck, ListsTheSampleAsTheDialogDoes)
 {
     const run uk = datecheck({sample()});
-    ASSERT_EQ(uk.status, 0) << uk.err.toStdString();
-    EXPECT_EQ(uk.out, QStringLiteral("Unknown Census dates:\n"
+    ASSERT_EQ(uk.status, 0) << uk.err;
+    EXPECT_EQ(uk.out, "Unknown Census dates:\n"
                                      "Census entries found assumed to be for the UK:\n"
                                      "6 JUN 1841 (6 occurences) : UK 1841 Census\n"
                                      "30 MAR 1851 (5 occurences) : UK 1851 Census\n"
@@ -79,16 +49,16 @@ TEST_F(CliDateCheck, ListsTheSampleAsTheDialogDoes)
                                      "2 APR 1871 (12 occurences) : UK 1871 Census\n"
                                      "5 APR 1891 (8 occurences) : UK 1891 Census\n"
                                      "31 MAR 1901 (3 occurences) : UK 1901 Census\n"
-                                     "Entries assumed to be for countries other than the UK:\n"));
+                                     "Entries assumed to be for countries other than the UK:\n");
 
     // From the USA's rows, days shared by several countries are met at the
     // first of them after the USA's.
     const run usa = datecheck({sample(), QStringLiteral("--country"), QStringLiteral("usa")});
     ASSERT_EQ(usa.status, 0);
-    EXPECT_TRUE(usa.out.startsWith(QStringLiteral("Unknown Census dates:\nCensus entries found assumed to be for the "
-                                                  "USA:\nEntries assumed to be for countries other than the USA:\n")));
-    EXPECT_TRUE(usa.out.contains(QStringLiteral("\n2 APR 1871 (12 occurences) : Canada 1871 Census\n")));
-    EXPECT_TRUE(usa.out.contains(QStringLiteral("\n31 MAR 1901 (3 occurences) : Ireland 1901 Census\n")));
+    EXPECT_TRUE(usa.out.starts_with("Unknown Census dates:\nCensus entries found assumed to be for the "
+                                    "USA:\nEntries assumed to be for countries other than the USA:\n"));
+    EXPECT_NE(usa.out.find("\n2 APR 1871 (12 occurences) : Canada 1871 Census\n"), std::string::npos);
+    EXPECT_NE(usa.out.find("\n31 MAR 1901 (3 occurences) : Ireland 1901 Census\n"), std::string::npos);
 
     expectfailure(datecheck({sample(), QStringLiteral("--country=France")}), "--country France");
     expectfailure(datecheck({}), "needs one family file");
@@ -102,8 +72,8 @@ TEST_F(CliDateCheck, AppliesTheSuggestedChanges)
                                  {"2 DATE 7 APR 1861", "2 DATE ABT 1650"}});
     const std::string before = qmtest::readfile(path);
     const run r = datecheck({path, QStringLiteral("--apply")});
-    ASSERT_EQ(r.status, 0) << r.err.toStdString();
-    const QStringList lines = r.out.split(QLatin1Char('\n'), Qt::SkipEmptyParts);
+    ASSERT_EQ(r.status, 0) << r.err;
+    const QStringList lines = QString::fromStdString(r.out).split(QLatin1Char('\n'), Qt::SkipEmptyParts);
     ASSERT_GE(lines.size(), 6);
     EXPECT_EQ(lines.mid(0, 4),
               (QStringList{QStringLiteral("Unknown Census dates:"),
@@ -121,7 +91,7 @@ TEST_F(CliDateCheck, AppliesTheSuggestedChanges)
     // Again: nothing left to change, nothing written.
     const run again = datecheck({path, QStringLiteral("--apply")});
     ASSERT_EQ(again.status, 0);
-    EXPECT_FALSE(again.out.contains(QStringLiteral("Backup:")));
+    EXPECT_EQ(again.out.find("Backup:"), std::string::npos);
     EXPECT_EQ(qmtest::readfile(path), after);
-    EXPECT_EQ(QDir(dir.filePath(QStringLiteral("backups"))).entryList({QStringLiteral("QM Backup*")}, QDir::Files).size(), 1);
+    EXPECT_EQ(backups().size(), 1);
 }

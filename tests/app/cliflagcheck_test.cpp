@@ -1,16 +1,9 @@
 // quillmark-cli flag-check, run as a process on small family files.
 #include "flags/flagtable.h"
 #include "platform/settingsstore.h"
-#include "settings/settings.h"
 #include "support/clirun.h"
 #include "support/testfiles.h"
 #include "support/testflags.h"
-
-#include <QDir>
-#include <QFileInfo>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 using qmtest::readfile;
 using qmtest::writefile;
@@ -35,48 +28,29 @@ struct run {
     std::string err;
 };
 
-class CliFlagCheck : public ::testing::Test {
+class CliFlagCheck : public qmtest::clitest {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
-        file = dir.filePath(QStringLiteral("family.ged"));
+        clitest::SetUp();
         writefile(file, family);
-        ini = dir.filePath(QStringLiteral("settings.ini"));
-        auto store = qm::settingsstore::onfile(ini);
-        qm::savesettings(*store, qmtest::clitestsettings(dir.path()));
-        qm::saveflagsettings(*store, qmtest::clitestsettings(dir.path()));
-        qm::saveflagdefs(*store, qmtest::testflagdefs());
-        store->sync();
+        qm::saveflagdefs(*qm::settingsstore::onfile(ini), qmtest::testflagdefs());
     }
 
-    run cli(QStringList args) const
+    // The lines of standard output.
+    run flagcheck(const QStringList& args) const
     {
-        args.prepend(QStringLiteral("flag-check"));
-        args << QStringLiteral("--settings") << ini;
-        const qmtest::clirun c = qmtest::runcli(args);
-        run r;
-        r.status = c.status;
-        QString out = QString::fromUtf8(c.out);
+        const qmtest::clitextrun c = cli(QStringLiteral("flag-check"), args);
+        QString out = QString::fromStdString(c.out);
         if (out.endsWith(QLatin1Char('\n')))
             out.chop(1);
-        r.out = out.split(QLatin1Char('\n'));
-        r.err = c.err.toStdString();
-        return r;
+        return {c.status, out.split(QLatin1Char('\n')), c.err};
     }
-
-    QStringList backups() const
-    {
-        return QDir(dir.filePath(QStringLiteral("backups"))).entryList({QStringLiteral("QM Backup*")}, QDir::Files);
-    }
-
-    QTemporaryDir dir;
-    QString file, ini;
 };
 
 TEST_F(CliFlagCheck, ListsTheRowsUnderTheHeadingsAndWritesNothing)
 {
-    const run r = cli({file, QStringLiteral("--country-for"), QStringLiteral("dublin=ireland")});
+    const run r = flagcheck({file, QStringLiteral("--country-for"), QStringLiteral("dublin=ireland")});
     ASSERT_EQ(r.status, 0) << r.err;
     EXPECT_EQ(r.out, QStringList({QStringLiteral("Flags that need to be added to individuals:"),
                                   QStringLiteral("'Census 1881' flag to individual Smith, John (ID: 1)"),
@@ -89,7 +63,7 @@ TEST_F(CliFlagCheck, ListsTheRowsUnderTheHeadingsAndWritesNothing)
 
 TEST_F(CliFlagCheck, CountryQuestionWithoutAnAnswerFailsNamingTheEvent)
 {
-    run r = cli({file});
+    run r = flagcheck({file});
     EXPECT_EQ(r.status, 2);
     EXPECT_EQ(r.out, QStringList({QString()}));
     EXPECT_NE(r.err.find("Byrne, Ann (ID: 3)"), std::string::npos) << r.err;
@@ -97,23 +71,23 @@ TEST_F(CliFlagCheck, CountryQuestionWithoutAnAnswerFailsNamingTheEvent)
     EXPECT_EQ(std::count(r.err.begin(), r.err.end(), '\n'), 1) << r.err;
 
     // An answer for another place, or a country none of the flags has, does not answer it.
-    r = cli({file, QStringLiteral("--apply"), QStringLiteral("--country-for=Cork=UK")});
+    r = flagcheck({file, QStringLiteral("--apply"), QStringLiteral("--country-for=Cork=UK")});
     EXPECT_EQ(r.status, 2);
-    r = cli({file, QStringLiteral("--apply"), QStringLiteral("--country-for"), QStringLiteral("Dublin=Canada")});
+    r = flagcheck({file, QStringLiteral("--apply"), QStringLiteral("--country-for"), QStringLiteral("Dublin=Canada")});
     EXPECT_EQ(r.status, 2);
     EXPECT_NE(r.err.find("not of Canada"), std::string::npos) << r.err;
     EXPECT_EQ(readfile(file), family);
     EXPECT_TRUE(backups().isEmpty());
 
     // Not a census country, no "=", or no file.
-    EXPECT_EQ(cli({file, QStringLiteral("--country-for"), QStringLiteral("Dublin=Eire")}).status, 2);
-    EXPECT_EQ(cli({file, QStringLiteral("--country-for"), QStringLiteral("Dublin")}).status, 2);
-    EXPECT_EQ(cli({QStringLiteral("--apply")}).status, 2);
+    EXPECT_EQ(flagcheck({file, QStringLiteral("--country-for"), QStringLiteral("Dublin=Eire")}).status, 2);
+    EXPECT_EQ(flagcheck({file, QStringLiteral("--country-for"), QStringLiteral("Dublin")}).status, 2);
+    EXPECT_EQ(flagcheck({QStringLiteral("--apply")}).status, 2);
 }
 
 TEST_F(CliFlagCheck, ApplyMakesTheChangesAfterABackup)
 {
-    const run r = cli({file, QStringLiteral("--apply"), QStringLiteral("--country-for"), QStringLiteral("DUBLIN=UK")});
+    const run r = flagcheck({file, QStringLiteral("--apply"), QStringLiteral("--country-for"), QStringLiteral("DUBLIN=UK")});
     ASSERT_EQ(r.status, 0) << r.err;
     ASSERT_EQ(r.out.size(), 6);
     EXPECT_EQ(r.out[2], QStringLiteral("'Census UK 1901' flag to individual Byrne, Ann (ID: 3)"));
@@ -131,7 +105,7 @@ TEST_F(CliFlagCheck, ApplyMakesTheChangesAfterABackup)
     EXPECT_NE(readfile(dir.filePath(QStringLiteral("censuslog.txt"))).find("Made 3 changes."), std::string::npos);
 
     // In step now: the two nothing rows, and --apply writes nothing.
-    const run again = cli({file, QStringLiteral("--apply")});
+    const run again = flagcheck({file, QStringLiteral("--apply")});
     ASSERT_EQ(again.status, 0) << again.err;
     EXPECT_EQ(again.out,
               QStringList({QStringLiteral("Flags that need to be added to individuals:"),

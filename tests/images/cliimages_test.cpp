@@ -1,35 +1,26 @@
 // quillmark-cli add-entry with images: new image files and existing
 // multimedia records linked to the entry's new source, and the refusals.
-#include "platform/settingsstore.h"
-#include "settings/settings.h"
 #include "support/clirun.h"
 #include "support/testfiles.h"
 
 #include <QDir>
 #include <QFile>
 #include <QJsonDocument>
-#include <QJsonObject>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 using qmtest::readfile;
 using qmtest::writefile;
 
 namespace {
 
-class CliImages : public ::testing::Test {
+class CliImages : public qmtest::clitest {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
+        clitest::SetUp();
         QDir(dir.path()).mkdir(QStringLiteral("scans"));
-        file = dir.filePath(QStringLiteral("sample.ged"));
         ASSERT_TRUE(QFile::copy(qmtest::samplefile(), file));
         QFile(file).setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
         before = readfile(file);
-        ini = dir.filePath(QStringLiteral("settings.ini"));
-        qmtest::writeclisettings(ini, qmtest::clitestsettings(dir.path()));
         // Each begins as a picture of its type, which is all the tool looks at.
         writefile(scan("a.png"), "\x89PNG\r\n\x1A\nnot really an image");
         writefile(scan("b.jpg"), "\xFF\xD8\xFF\xE0not really an image");
@@ -44,10 +35,7 @@ protected:
         const QString entry = dir.filePath(QStringLiteral("entry.json"));
         writefile(entry, R"({"year": 1881, "place": "Hebden Bridge", "reference": "RG11/4426/52",
                              "individuals": [{"id": 11, "age": "28"}], "images": )" + images + "}");
-        const qmtest::clirun r = qmtest::runcli({QStringLiteral("add-entry"), file, QStringLiteral("--entry"), entry,
-                                                 QStringLiteral("--settings"), ini},
-                                                dir.path());
-        return qmtest::astext(r);
+        return cli(QStringLiteral("add-entry"), {file, QStringLiteral("--entry"), entry});
     }
 
     void expectrefused(const std::string& images, const std::string& message)
@@ -58,8 +46,6 @@ protected:
         EXPECT_EQ(readfile(file), before);
     }
 
-    QTemporaryDir dir;
-    QString file, ini;
     std::string before;
 };
 

@@ -4,9 +4,13 @@
 #include "settings/settings.h"
 
 #include <QByteArray>
+#include <QDir>
 #include <QJsonObject>
 #include <QString>
 #include <QStringList>
+#include <QTemporaryDir>
+
+#include <gtest/gtest.h>
 
 #include <string>
 
@@ -47,5 +51,36 @@ qm::settings clitestsettings(const QString& folder);
 // Writes every value of s that the tool reads into an INI file, so that none
 // of them falls back to its default.
 void writeclisettings(const QString& ini, const qm::settings& s);
+
+#ifdef QM_CLI_PATH
+// The tests of one command: a folder holding a complete settings file (the
+// backups and the census log inside the folder) and the path family.ged in it.
+class clitest : public ::testing::Test {
+protected:
+    void SetUp() override
+    {
+        ASSERT_TRUE(dir.isValid());
+        ini = dir.filePath(QStringLiteral("settings.ini"));
+        file = dir.filePath(QStringLiteral("family.ged"));
+        writeclisettings(ini, clitestsettings(dir.path()));
+    }
+
+    // `quillmark-cli command args --settings ini`, with the folder as its home.
+    clitextrun cli(const QString& command, const QStringList& args) const
+    {
+        return astext(runcli(QStringList{command} + args + QStringList{QStringLiteral("--settings"), ini}, dir.path()));
+    }
+    // The backups made (the notes kept beside them left out).
+    QStringList backups() const
+    {
+        return QDir(dir.filePath(QStringLiteral("backups"))).entryList({QStringLiteral("QM Backup*")}, QDir::Files);
+    }
+    // Nothing at all in the backup folder: no backup, no note.
+    bool backupfolderempty() const { return QDir(dir.filePath(QStringLiteral("backups"))).isEmpty(); }
+
+    QTemporaryDir dir;
+    QString ini, file;
+};
+#endif
 
 } // namespace qmtest
