@@ -1,13 +1,17 @@
 #!/usr/bin/env bash
 # Builds the Windows Qt that Quillmark's Windows build links (Core, Gui, Widgets,
 # Test and the platforms and imageformats plugins) with MinGW-w64, once, into a
-# cache folder outside the repository:
+# cache folder outside the repository, then the image formats of the
+# qtimageformats module that census images come in beside JPEG and PNG (TIFF
+# with its bundled libtiff, TGA; the module adds WBMP and ICNS):
 #
 #   $QM_WINQT_CACHE (default ~/.cache/quillmark/qt6-mingw)
 #     src/      Debian's qt6-base source with its security patches
 #     build/    the build tree (kept, so an interrupted build goes on)
 #     qt/       the installed Qt; qt/.quillmark-recipe marks it complete
 #     qt-build.log
+#     imageformats-src/, imageformats-build/, imageformats-build.log
+#                qtimageformats, the same way; qt/.quillmark-imageformats-recipe
 #
 # It takes Debian's own qt6-base source, the same version as the host Qt whose
 # tools (moc, rcc, uic) the cross build uses. A finished Qt is reused as long as
@@ -72,9 +76,47 @@ version=$(dpkg-query -W -f='${Version}' qt6-base-dev)    # e.g. 6.4.2+dfsg-10
 source_recipe=$(printf '%s\n' "$version" "${cve_patches[@]}" "$wintab_h" "$direct2d_guard" | hash)
 recipe=$( { echo "$source_recipe"; printf '%s\n' "${qt_args[@]}"; cat "$here/cmake/mingw-w64-x86_64.cmake"; } | hash)
 
+# qtimageformats, built against the Qt above into the same prefix.
+imageformats_args=(
+  -DCMAKE_BUILD_TYPE=Release
+  -DQT_HOST_PATH=/usr
+  -DQT_HOST_PATH_CMAKE_DIR=/usr/lib/x86_64-linux-gnu/cmake
+  -DQT_BUILD_TESTS=OFF -DQT_BUILD_EXAMPLES=OFF
+  -DFEATURE_tiff=ON -DFEATURE_system_tiff=OFF
+  -DFEATURE_webp=OFF -DFEATURE_jasper=OFF -DFEATURE_mng=OFF
+)
+imageformats() {
+  local v r isrc="$cache/imageformats-src" ibuild="$cache/imageformats-build" ilog="$cache/imageformats-build.log"
+  # The same upstream version as the Qt it plugs into.
+  v=$(apt-cache showsrc qt6-imageformats | sed -n "s/^Version: \(${version%%+*}[-+].*\)/\1/p" | sort -V | tail -1)
+  r=$( { echo "$recipe" "$v"; printf '%s\n' "${imageformats_args[@]}"; } | hash)
+  if [ "$(cat "$prefix/.quillmark-imageformats-recipe" 2>/dev/null)" = "$r" ]; then
+    echo "Windows Qt image formats: cached"
+    return 0
+  fi
+  echo "Windows Qt image formats: building qt6-imageformats $v (log: $ilog); some minutes"
+  rm -rf "$isrc" "$ibuild"
+  mkdir -p "$isrc"
+  (cd "$isrc" && apt-get source --download-only "qt6-imageformats=$v" >/dev/null 2>&1 &&
+     dpkg-source --skip-patches -x ./*.dsc "$isrc/src" >/dev/null 2>&1) ||
+    { echo "Windows Qt image formats: could not fetch Debian's qt6-imageformats source" >&2; return 1; }
+  { cmake -S "$isrc/src" -B "$ibuild" -G Ninja \
+      -DCMAKE_TOOLCHAIN_FILE="$prefix/lib/cmake/Qt6/qt.toolchain.cmake" \
+      -DQT_CHAINLOAD_TOOLCHAIN_FILE="$here/cmake/mingw-w64-x86_64.cmake" \
+      -DCMAKE_INSTALL_PREFIX="$prefix" "${launcher[@]}" "${imageformats_args[@]}" &&
+      cmake --build "$ibuild" -j "${QM_WINQT_JOBS:-2}" && cmake --install "$ibuild"; } >"$ilog" 2>&1 ||
+    { echo "Windows Qt image formats: build failed; the end of $ilog:" >&2; tail -30 "$ilog" >&2; return 1; }
+  echo "$r" >"$prefix/.quillmark-imageformats-recipe"
+  echo "Windows Qt image formats: installed $(cd "$prefix/plugins/imageformats" && echo *.dll)"
+}
+
+launcher=()
+command -v ccache >/dev/null && launcher=(-DQT_USE_CCACHE=ON)
+
 if [ "$(cat "$prefix/.quillmark-recipe" 2>/dev/null)" = "$recipe" ]; then
   echo "Windows Qt: $prefix (cached)"
-  exit 0
+  imageformats
+  exit
 fi
 
 src="$cache/src/qt6-base-${version%%+*}"
@@ -99,8 +141,6 @@ if [ "$(cat "$src/.quillmark-recipe" 2>/dev/null)" != "$source_recipe" ]; then
   echo "$source_recipe" >"$src/.quillmark-recipe"
 fi
 
-launcher=()
-command -v ccache >/dev/null && launcher=(-DQT_USE_CCACHE=ON)
 echo "Windows Qt: building into $prefix (log: $log); most of an hour on 2 cores"
 # An interrupted build goes on where it stopped; a changed recipe is
 # configured over the same tree, so only what it changes is built again.
@@ -116,3 +156,4 @@ build_qt() {
 build_qt >"$log" 2>&1 || { echo "Windows Qt: build failed; the end of $log:" >&2; tail -30 "$log" >&2; exit 1; }
 echo "$recipe" >"$prefix/.quillmark-recipe"
 echo "Windows Qt: installed, $(du -sh "$prefix" | cut -f1)"
+imageformats

@@ -84,10 +84,12 @@ export WINEARCH=win64
 export WINEDEBUG=-all
 export WINEDLLOVERRIDES="mscoree,mshtml="
 export WINEPATH="$(windows_path "$qt/bin");$(windows_path "$gccdir");$(windows_path "/usr/$triple/lib")"
-export QT_PLUGIN_PATH="$(windows_path "$qt/plugins")"
+# Wine gives Windows programs none of the QT_ variables of the Unix
+# environment (they belong to the Linux desktop); WINEQT_X reaches them as QT_X.
+export WINEQT_PLUGIN_PATH="$(windows_path "$qt/plugins")"
 # The offscreen platform of a Windows Qt draws with FreeType from the fonts of
 # one folder: the same DejaVu fonts the Linux tests get from fontconfig.
-export QT_QPA_FONTDIR="$(windows_path /usr/share/fonts/truetype/dejavu)"
+export WINEQT_QPA_FONTDIR="$(windows_path /usr/share/fonts/truetype/dejavu)"
 
 start_wine() {
   if [ ! -f "$WINEPREFIX/system.reg" ]; then
@@ -131,7 +133,7 @@ run_examples() {
 paint_window() {
   start_wine
   rm -f "$build/mainwindow-windows.png"
-  QM_SCREENSHOT="$(windows_path "$build/mainwindow-windows.png")" QT_QPA_PLATFORM=windows \
+  QM_SCREENSHOT="$(windows_path "$build/mainwindow-windows.png")" WINEQT_QPA_PLATFORM=windows \
     xvfb-run -a -s "-screen 0 1366x768x24" wine "$build/tests/mainfrm_test.exe" screenshot >"$build/paint.log" 2>&1 ||
     { cat "$build/paint.log" >&2; return 1; }
   [ -s "$build/mainwindow-windows.png" ] && echo "wrote $build/mainwindow-windows.png"

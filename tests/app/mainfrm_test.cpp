@@ -419,7 +419,8 @@ private slots:
 
         // The name changed in the other program: reloaded, rows kept.
         QVERIFY(replaceinfile(file, QStringLiteral("1 NAME Agnes /Schröder/").toUtf8(), "1 NAME Agnes /Schroeder/"));
-        s->prompts.expect(answer::ok, file + QStringLiteral(" has been modified by another application and will be reloaded."));
+        s->prompts.expect(answer::ok, QDir::toNativeSeparators(file)
+                                          + QStringLiteral(" has been modified by another application and will be reloaded."));
         w.checkonactivate();
         QCOMPARE(shownnames(w), (QStringList{QStringLiteral("Schroeder, Agnes"), QStringLiteral("Ashworth, Frederick")}));
         QCOMPARE(rowcontrols<QLineEdit>(w, "agetxt")[0]->text(), QStringLiteral("26"));
@@ -447,7 +448,7 @@ private slots:
 
         // The file renamed in the other program: said once, not reloaded.
         QVERIFY(QFile::rename(file, file + QStringLiteral(".old")));
-        s->prompts.expect(answer::no, file + QStringLiteral(" can no longer be found"));
+        s->prompts.expect(answer::no, QDir::toNativeSeparators(file) + QStringLiteral(" can no longer be found"));
         w.checkonactivate();
         w.checkonactivate();
         QCOMPARE(w.index()->people.size(), size_t(39));

@@ -12,14 +12,16 @@
 #include <QAction>
 #include <QDir>
 #include <QPlainTextEdit>
-#include <QProcess>
 #include <QRegularExpression>
 #include <QPushButton>
 #include <QSplitter>
 #include <QSplitterHandle>
 #include <QToolButton>
 
+#include <algorithm>
 #include <cmath>
+#include <utility>
+#include <vector>
 
 using namespace qm;
 using namespace qmtest;
@@ -47,29 +49,123 @@ QString snapshot(const QString& path)
 
 // The changes from the snapshot to the file, line by line: each run of changed
 // lines is headed by "@ " and the record ("0 ..." line) it falls in, then "-"
-// removed and "+" added lines.
+// removed and "+" added lines, as diff gives them; line ends are ignored.
 QStringList linediff(const QString& before, const QString& after)
 {
-    QProcess diff;
-    diff.start(QStringLiteral("diff"), {QStringLiteral("--strip-trailing-cr"), QStringLiteral("--unchanged-line-format= %L"),
-                                        QStringLiteral("--old-line-format=-%L"), QStringLiteral("--new-line-format=+%L"),
-                                        before, after});
-    if (!diff.waitForFinished())
-        return {QStringLiteral("diff did not run")};
-    QStringList out;
-    QString record;
-    bool changing = false;
-    for (QString l : QString::fromUtf8(diff.readAllStandardOutput()).split(QLatin1Char('\n'), Qt::SkipEmptyParts)) {
-        l.remove(QLatin1Char('\r'));
-        const bool changed = !l.startsWith(QLatin1Char(' '));
-        if (changed && !changing)
-            out << QStringLiteral("@ ") + record;
-        if (changed)
-            out << l;
-        changing = changed;
-        if (!l.startsWith(QLatin1Char('+')) && l.mid(1).startsWith(QLatin1String("0 ")))
-            record = l.mid(1);
+    const auto lines = [](const QString& path) {
+        QFile f(path);
+        if (!f.open(QIODevice::ReadOnly))
+            return QStringList{QStringLiteral("cannot read ") + path};
+        QStringList out = QString::fromUtf8(f.readAll()).remove(QLatin1Char('\r')).split(QLatin1Char('\n'));
+        if (out.back().isEmpty())
+            out.removeLast();
+        return out;
+    };
+    const QStringList a = lines(before);
+    const QStringList b = lines(after);
+    qsizetype head = 0;
+    while (head < a.size() && head < b.size() && a[head] == b[head])
+        ++head;
+    qsizetype tail = 0;
+    while (tail < a.size() - head && tail < b.size() - head && a[a.size() - 1 - tail] == b[b.size() - 1 - tail])
+        ++tail;
+    // The shortest edit script of the middle parts (Myers' algorithm: each
+    // round d reaches as far as d edits can along every diagonal k = x - y,
+    // following equal lines as far as they go, so that lines are kept as early
+    // as possible). The rounds are kept to walk the script back.
+    const auto old = [&](qsizetype x) -> const QString& { return a[head + x]; };
+    const auto now = [&](qsizetype y) -> const QString& { return b[head + y]; };
+    const qsizetype n = a.size() - head - tail;
+    const qsizetype m = b.size() - head - tail;
+    std::vector<std::vector<qsizetype>> rounds; // round d: the furthest x of diagonals -d..d
+    std::vector<qsizetype> reach{0};             // diagonal k at reach[k + d]
+    for (qsizetype d = 0;; ++d) {
+        std::vector<qsizetype> next(size_t(2 * d + 1));
+        bool done = false;
+        for (qsizetype k = -d; k <= d && !done; k += 2) {
+            const auto last = [&](qsizetype kk) { return reach[size_t(kk + d - 1)]; };
+            qsizetype x = d == 0 ? 0 : (k == -d || (k != d && last(k - 1) < last(k + 1))) ? last(k + 1) : last(k - 1) + 1;
+            qsizetype y = x - k;
+            while (x < n && y < m && old(x) == now(y)) {
+                ++x;
+                ++y;
+            }
+            next[size_t(k + d)] = x;
+            done = x >= n && y >= m;
+        }
+        rounds.push_back(next);
+        reach = std::move(next);
+        if (done)
+            break;
     }
+    // Walked back from the end: 0 kept, 1 removed (old line), 2 added (new line).
+    std::vector<std::pair<int, qsizetype>> script;
+    qsizetype x = n, y = m;
+    for (qsizetype d = qsizetype(rounds.size()) - 1; d >= 0; --d) {
+        qsizetype px = 0, py = 0;
+        bool down = false;
+        if (d > 0) {
+            const std::vector<qsizetype>& last = rounds[size_t(d - 1)];
+            const qsizetype k = x - y;
+            down = k == -d || (k != d && last[size_t(k - 1 + d - 1)] < last[size_t(k + 1 + d - 1)]);
+            const qsizetype pk = down ? k + 1 : k - 1;
+            px = last[size_t(pk + d - 1)];
+            py = px - pk;
+        }
+        while (x > (d > 0 && !down ? px + 1 : px) && y > (d > 0 && down ? py + 1 : py)) {
+            --x;
+            --y;
+            script.emplace_back(0, x);
+        }
+        if (d > 0) {
+            script.emplace_back(down ? 2 : 1, down ? py : px);
+            x = px;
+            y = py;
+        }
+    }
+    std::reverse(script.begin(), script.end());
+
+    QStringList out;
+    QString record; // the last "0 ..." line of the old file passed
+    QString heading;
+    QStringList removed;
+    QStringList added;
+    const auto flush = [&] {
+        if (!removed.isEmpty() || !added.isEmpty())
+            out << heading << removed << added;
+        removed.clear();
+        added.clear();
+    };
+    const auto unchanged = [&](const QString& l) {
+        flush();
+        if (l.startsWith(QLatin1String("0 ")))
+            record = l;
+    };
+    const auto remove = [&](const QString& l) {
+        if (removed.isEmpty() && added.isEmpty())
+            heading = QStringLiteral("@ ") + record;
+        removed << QLatin1Char('-') + l;
+        if (l.startsWith(QLatin1String("0 ")))
+            record = l;
+    };
+    const auto add = [&](const QString& l) {
+        if (removed.isEmpty() && added.isEmpty())
+            heading = QStringLiteral("@ ") + record;
+        added << QLatin1Char('+') + l;
+    };
+    for (qsizetype i = 0; i < head; ++i)
+        unchanged(a[i]);
+    for (const auto& [what, at] : script) {
+        if (what == 0)
+            unchanged(old(at));
+        else if (what == 1)
+            remove(old(at));
+        else
+            add(now(at));
+    }
+    for (qsizetype k = a.size() - tail; k < a.size(); ++k)
+        unchanged(a[k]);
+    flush();
     return out;
 }
 

@@ -150,7 +150,8 @@ private slots:
             QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/", "1 NAME Johnny /Ashworth/"));
             QTest::mouseClick(child<QPushButton>(d, "okbut"), Qt::LeftButton);
         });
-        run->prompts.expect(answer::ok, file + QStringLiteral(" has been modified by another application"));
+        run->prompts.expect(answer::ok,
+                            QDir::toNativeSeparators(file) + QStringLiteral(" has been modified by another application"));
         QTest::mouseClick(findbut(w), Qt::LeftButton);
         QCOMPARE(dialogs.seen, QStringList{QStringLiteral("findfrm")});
         QCOMPARE(dialogs.unexpected, 0);

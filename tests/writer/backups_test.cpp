@@ -86,7 +86,13 @@ TEST_F(Backups, FailureGivesMessageAndLeavesNothing)
 {
     const backupresult r = makebackup(family, dir.filePath(QStringLiteral("missing")));
     EXPECT_FALSE(r.ok());
-    EXPECT_EQ(r.error, backupfailedmessage() + QStringLiteral(" (No such file or directory)")) << "with the system's reason";
+    // With the system's reason, in its words.
+#ifdef Q_OS_WIN
+    EXPECT_TRUE(r.error.startsWith(backupfailedmessage() + QStringLiteral(" (")) && r.error.endsWith(u')')) << r.error.toStdString();
+    EXPECT_GT(r.error.size(), backupfailedmessage().size() + 3);
+#else
+    EXPECT_EQ(r.error, backupfailedmessage() + QStringLiteral(" (No such file or directory)"));
+#endif
     EXPECT_TRUE(r.error.startsWith(QStringLiteral("There was an error when attempting to back up your family historian file.")));
     EXPECT_FALSE(makebackup(dir.filePath(QStringLiteral("nofile.ged")), folder).ok());
     EXPECT_FALSE(makebackup(family, QStringLiteral(" ")).ok());
