@@ -2,6 +2,8 @@
 
 #include "platform/encoding.h"
 
+#include <QFile>
+
 namespace qm {
 
 bool logpages::open(const QString& path)
@@ -10,11 +12,19 @@ bool logpages::open(const QString& path)
     text_.clear();
     page_ = 0;
     pending_ = false;
-    reader_ = std::make_unique<linereader>();
-    if (!reader_->open(path)) {
-        reader_.reset();
+    reader_.reset();
+    bytes_.clear();
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly))
+        return false;
+    bytes_ = file.readAll();
+    if (file.error() != QFileDevice::NoError) {
+        bytes_.clear();
         return false;
     }
+    file.close();
+    reader_ = std::make_unique<linereader>();
+    reader_->openbytes(std::string_view(bytes_.constData(), static_cast<size_t>(bytes_.size())));
     std::string_view line;
     if (reader_->next(line)) {
         held_.assign(line);

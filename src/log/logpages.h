@@ -3,9 +3,14 @@
 // lines, each without its trailing spaces and ended by CR LF; it ends after the
 // line that brings its length to 65,001 characters or more, or at the end of
 // the log.
+//
+// The log is read whole when it is opened and closed at once: a viewer left
+// open must not hold the file, which on Windows would stop Clear Log, a second
+// Quillmark or any other program from clearing, renaming or removing it.
 
 #include "platform/linereader.h"
 
+#include <QByteArray>
 #include <QString>
 
 #include <memory>
@@ -33,6 +38,7 @@ private:
     bool readline(QString& line);
 
     QString path_;
+    QByteArray bytes_; // the log as read at open(); reader_ reads from it
     std::unique_ptr<linereader> reader_;
     std::string held_; // the line read ahead to learn whether more remain
     bool pending_ = false;

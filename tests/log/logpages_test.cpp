@@ -4,6 +4,7 @@
 #include "platform/scriptedprompts.h"
 #include "support/testfiles.h"
 
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QTemporaryDir>
@@ -82,6 +83,27 @@ TEST_F(LogPages, LineEndsEncodingsAndStart)
     EXPECT_TRUE(pages.restart());
     EXPECT_EQ(pages.page(), 1);
     EXPECT_EQ(pages.text().size(), 651 * 100);
+}
+
+// The viewer shows page 1 of 3 and keeps nothing open: the log can be
+// cleared or removed meanwhile (Windows refuses both for a file held open).
+TEST_F(LogPages, TheLogIsNotHeldOpenWhileShown)
+{
+    writefile(log, lines(1500));
+    logpages pages;
+    ASSERT_TRUE(pages.open(log));
+    ASSERT_TRUE(pages.more());
+#ifdef Q_OS_LINUX
+    const QString target = QFileInfo(log).canonicalFilePath();
+    const QDir fds(QStringLiteral("/proc/self/fd"));
+    for (const QFileInfo& fd : fds.entryInfoList(QDir::System | QDir::NoDotAndDotDot))
+        EXPECT_NE(fd.symLinkTarget(), target) << "the log is held open as descriptor " << qPrintable(fd.fileName());
+#endif
+    EXPECT_TRUE(QFile::remove(log));
+    pages.nextpage();
+    EXPECT_EQ(pages.page(), 2);
+    EXPECT_EQ(pages.text().size(), 650 * 100);
+    EXPECT_FALSE(pages.restart()); // gone now
 }
 
 TEST_F(LogPages, EmptyAndMissing)
