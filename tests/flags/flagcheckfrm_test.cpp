@@ -298,7 +298,7 @@ private slots:
         change->click();
         QCOMPARE(prompts.unexpected(), 0);
         QVERIFY(d.isVisible());
-        QCOMPARE(d.outcome(), flagcheckend::unchanged);
+        QCOMPARE(d.outcome(), toolend::unchanged);
         QCOMPARE(bytesof(file), john);
     }
 };
