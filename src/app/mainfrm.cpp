@@ -5,13 +5,19 @@
 #include "census/entrypanel_ui.h"
 #include "census/householdpanel_ui.h"
 #include "census/placecompleter_ui.h"
+#include "flags/flagsmenu_ui.h"
 #include "flags/flagtable.h"
+#include "images/imagesmenu_ui.h"
+#include "log/clearlog.h"
+#include "log/logfrm.h"
 #include "model/dates.h"
 #include "model/loadgedcom.h"
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
+#include "settings/optionsmenu_ui.h"
 #include "tools/coveragefrm.h"
+#include "tools/toolsmenu_ui.h"
 #include "writer/backups.h"
 #include "writer/maketitle.h"
 #include "writer/undoprompts.h"
@@ -33,6 +39,8 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QStackedWidget>
+#include <QThread>
+#include <QTimer>
 #include <QVBoxLayout>
 
 namespace qm {
@@ -94,8 +102,14 @@ void mainfrm::buildmenus()
     QMenu* edit = menuBar()->addMenu(QStringLiteral("&Edit"));
     edit->setObjectName(QStringLiteral("editmen"));
     connect(item(edit, "undomen", QStringLiteral("&Undo Last Census Entry")), &QAction::triggered, this, [this] {
-        if (file_.index() && !saving_)
-            runtool([this] { reloadneeded_ = askundolast(file_.path(), file_.currentsettings(), prompts_); });
+        if (!file_.index() || saving_)
+            return;
+        bool undone = false;
+        {
+            const pausewatch paused = file_.pause();
+            undone = askundolast(file_.path(), file_.currentsettings(), prompts_);
+        }
+        endtool(undone ? toolend::reload : toolend::unchanged);
     });
     edit->addSeparator();
     copymen_ = item(edit, "copymen", QStringLiteral("Copy"));
@@ -149,20 +163,20 @@ void mainfrm::buildmenus()
     item(help, "donatemen", QStringLiteral("Make a Donation..."));
     item(help, "aboutmen", QStringLiteral("&About Quillmark..."));
 
-    const auto on = [this](const char* name, void (mainfrm::*slot)()) {
+    const auto on = [this](const char* name, const std::function<void()>& run) {
         if (QAction* a = menuBar()->findChild<QAction*>(QString::fromLatin1(name)))
-            connect(a, &QAction::triggered, this, slot);
+            connect(a, &QAction::triggered, this, run);
     };
-    on("viewlogmen", &mainfrm::viewlog);
-    on("clearlogmen", &mainfrm::clearlogfile);
-    on("removemen", &mainfrm::removebackups);
-    on("attachbut", &mainfrm::attachimages);
-    on("datecheckmen", &mainfrm::censusdatecheck);
-    on("flagsmen", &mainfrm::censusflags);
-    on("coveragemen", &mainfrm::opencoverage);
-    on("optionsmen", &mainfrm::showoptions);
-    on("donatemen", &mainfrm::donate);
-    on("aboutmen", &mainfrm::about);
+    on("viewlogmen", [this] { logfrm::view(file_.currentsettings().logpath, prompts_, this); });
+    on("clearlogmen", [this] { clearlog(prompts_, file_.currentsettings().logpath); });
+    on("removemen", [this] { removebackups(); });
+    on("attachbut", [this] { endtool(attachimages(file_, prompts_, this)); });
+    on("datecheckmen", [this] { endtool(censusdatecheck(file_, prompts_, this)); });
+    on("flagsmen", [this] { endtool(censusflags(file_, prompts_, this)); });
+    on("coveragemen", [this] { opencoverage(); });
+    on("optionsmen", [this] { showoptions(); });
+    on("donatemen", [this] { donate(); });
+    on("aboutmen", [this] { about(); });
     const auto helpitem = [this](const char* name, int topic, const QString& command) {
         if (QAction* a = menuBar()->findChild<QAction*>(QString::fromLatin1(name)))
             connect(a, &QAction::triggered, this, [this, topic, command] { prompts_.showhelp(topic, command); });
@@ -348,7 +362,8 @@ bool mainfrm::start(const QStringList& arguments)
 
     file_.readsettings();
     settitleandpanel(file);
-    startoptions(file);
+    if (qm::startoptions(file_, prompts_, [this] { donate(); }, this))
+        settitleandpanel(file);
     file_.load(file);
     if (file_.currentsettings().flagcheck)
         silentflagcheck();
@@ -533,21 +548,78 @@ void mainfrm::clearall()
     panel()->yearcom->setFocus();
 }
 
-void mainfrm::runtool(const std::function<void()>& open)
+void mainfrm::endtool(toolend end)
 {
-    reloadneeded_ = false;
     const pausewatch paused = file_.pause();
-    open();
     repaint();
-    if (reloadneeded_)
+    if (end == toolend::reload)
         reload();
-    reloadneeded_ = false;
+    else if (end == toolend::fatal)
+        endprogram();
 }
 
 void mainfrm::removebackups()
 {
     const pausewatch paused = file_.pause();
     removeoldbackups(prompts_, file_.currentsettings().backupfolder);
+}
+
+// "Options...": after Save the new settings take effect; a change of the
+// recording method, the country or "ID Only" clears the entry and reads the
+// file again.
+void mainfrm::showoptions()
+{
+    const pausewatch paused = file_.pause();
+    const optionsend end = qm::showoptions(file_, prompts_, [this] { donate(); }, this);
+    if (end.reloadneeded) {
+        clearentry();
+        settitleandpanel(file_.path());
+    } else if (end.saved) {
+        viewlogmen_->setEnabled(file_.currentsettings().keeplog);
+        attachbut_->setEnabled(file_.currentsettings().fullentry);
+    }
+    if (end.saved && file_.currentsettings().fullentry && !panel_[0]->titletxt->text().isEmpty())
+        refreshtitle();
+    endtool(end.reloadneeded ? toolend::reload : toolend::unchanged);
+}
+
+// When the flags are out of step the Flag Check dialog opens; the file is read
+// again when it was rewritten (or changed outside the program).
+void mainfrm::silentflagcheck()
+{
+    const toolend end = qm::silentflagcheck(file_, prompts_, this);
+    if (end == toolend::reload) {
+        file_.reload();
+    } else if (end == toolend::fatal) {
+        endprogram();
+        // At start the event loop is not running yet: leave it as soon as it does.
+        if (QThread::currentThread()->loopLevel() == 0)
+            QTimer::singleShot(0, qApp, [] { QCoreApplication::exit(1); });
+    }
+}
+
+bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
+{
+    const entrypanel* p = panel();
+    entrysource e;
+    e.fullentry = sourcemode_ == 0;
+    e.date = p->fixeddatetxt->text();
+    if (e.fullentry) {
+        e.title = p->titletxt->text();
+        e.reference = p->referencetxt->text();
+    } else {
+        e.sourcetitle = p->sourcecom->currentText();
+        e.where = p->wherewithinsourcetxt->text();
+    }
+    return qm::chooseentryimages(e, file_, prompts_, this, chosen);
+}
+
+int32_t mainfrm::runfind(int32_t start)
+{
+    const findchoice c = findindividual(file_, *household_->people, start, prompts_, this);
+    if (c.person >= 0 || c.refocus)
+        fromfind_ = c.refocus;
+    return c.person;
 }
 
 void mainfrm::fillyears()

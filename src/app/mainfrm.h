@@ -3,7 +3,11 @@
 // being put together and the menus. The family file, its index, the settings
 // and the watch for outside changes are the window's openfile (file_); the
 // prompts and the settings store are handed in by main() (tests hand in
-// scripted prompts and an INI store).
+// scripted prompts and an INI store). The tools and dialogs of the menus are
+// the features' own (flags/flagsmenu_ui.h, images/imagesmenu_ui.h,
+// tools/toolsmenu_ui.h, settings/optionsmenu_ui.h, log/logfrm.h and
+// log/clearlog.h): the window hands them the openfile, the prompts and itself
+// as parent, and reads the file again or ends the program as they report.
 
 #include "app/recentfiles.h"
 #include "census/selection.h"
@@ -87,33 +91,26 @@ private:
     void editmenuopening();
     void clearall();
 
-    // The menus' tools and dialogs, each defined in its feature's folder.
-    // A tool that may rewrite the family file runs with the watch for outside
-    // changes paused, and the file is read again afterwards when reloadneeded_ is set.
-    void runtool(const std::function<void()>& open);
-    void removebackups();      // mainfrm.cpp
-    void viewlog();            // log/logmenu_ui.cpp
-    void clearlogfile();       // log/logmenu_ui.cpp
-    void attachimages();       // images/attachmenu_ui.cpp
-    void censusdatecheck();    // tools/datecheckmenu_ui.cpp
-    void censusflags();        // flags/flagsmenu_ui.cpp
-    // After each load when "Flag Check" is on (flags/flagcheckmenu_ui.cpp).
+    // The menus' tools and dialogs are offered by their features' folders;
+    // these wire them to the window. A tool that may rewrite the family file
+    // runs with the watch for outside changes paused and says how it ended:
+    // endtool() reads the file again or ends the program.
+    void endtool(toolend end);
+    void removebackups();
+    void showoptions();
+    // After each load when "Flag Check" is on.
     void silentflagcheck();
     // Census Coverage (app/coveragemenu_ui.cpp): the grid stays open and is
     // given every index read; a missing cell chosen in it starts its entry.
     void opencoverage();
     void transcribegap(int32_t k, int year);
-    void showoptions();        // settings/optionsmenu_ui.cpp
-    // At start, once the settings are read: the options dialog when the
-    // settings are incomplete or their paths fail the checks (same file).
-    void startoptions(const QString& path);
     void donate();             // app/helpmenu_ui.cpp
     void about();              // app/helpmenu_ui.cpp
     void helpkeys();           // app/helpmenu_ui.cpp: F1
     // After each saved entry, once Count has been raised (app/helpmenu_ui.cpp).
     void milestone();
-    // Save step 12: the Census Images dialog for the entry being saved
-    // (images/imagesmenu_ui.cpp). False when the user chose "Cancel saving census".
+    // Save step 12: the Census Images dialog for the entry being saved. False
+    // when the user chose "Cancel saving census".
     bool chooseentryimages(std::vector<imagechoice>& chosen);
     std::optional<QString> askforfile(bool startup);
 
@@ -163,7 +160,8 @@ private:
     void showpersoninfo(int32_t k);
     void clearentry();
     void findclicked();
-    // Shows the Find dialog starting at people[start]; the individual chosen, or -1.
+    // Shows the Find dialog starting at people[start]; the individual chosen,
+    // or -1. Sets fromfind_ when the immediate family is to be rebuilt.
     int32_t runfind(int32_t start);
     void pullrows();
     void pushrows();
@@ -188,7 +186,6 @@ private:
     QString gonetold_; // the family file the user was told is no longer there
     int32_t findresult_ = -1;
     bool fromfind_ = false;     // the Find dialog asked for the immediate family to be rebuilt
-    bool reloadneeded_ = false; // a tool rewrote the file (or found it changed): read it again
     bool ending_ = false; // closing after a failed rewrite: no questions
     bool saving_ = false; // a save is running (a second click waits its turn)
     QPointer<coveragefrm> coverage_; // the Census Coverage window while open

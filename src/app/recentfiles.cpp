@@ -58,22 +58,4 @@ QString recentfiles::caption(int slot) const
     return n + QLatin1Char(' ') + p;
 }
 
-namespace {
-qsizetype lastseparator(const QString& path)
-{
-    return std::max(path.lastIndexOf(QLatin1Char('/')), path.lastIndexOf(QLatin1Char('\\')));
-}
-} // namespace
-
-QString folderof(const QString& path)
-{
-    const qsizetype at = lastseparator(path);
-    return at < 0 ? QString() : path.left(at + 1);
-}
-
-QString filenameof(const QString& path)
-{
-    return path.mid(lastseparator(path) + 1);
-}
-
 } // namespace qm

@@ -3,6 +3,8 @@
 // other values the main window keeps about files: the default file and the
 // folder the Open dialog starts in.
 
+#include "platform/paths.h"
+
 #include <QString>
 
 #include <array>
@@ -36,11 +38,5 @@ struct recentfiles {
 // The registry name of a slot: "Recent Files" + " " + number, as
 // "Recent Files  1" (the number is written with its leading space).
 QString recentvaluename(int slot);
-
-// The folder part of a path, up to and including its last separator ("/" or
-// "\"); empty when it has none.
-QString folderof(const QString& path);
-// The file name of a path: the part after its last separator.
-QString filenameof(const QString& path);
 
 } // namespace qm

@@ -125,36 +125,36 @@ void flagcheckfrm::makechanges()
     switch (tellsaveoutcome(prompts_, out)) {
     case aftersave::saved:
         index_.gedcomdate = out.newstamp;
-        end_ = flagcheckend::reload;
+        end_ = toolend::reload;
         accept();
         return;
     case aftersave::changed:
         prompts_.tell(flagsfilechangedmessage(index_.gedcomfile));
-        end_ = flagcheckend::reload;
+        end_ = toolend::reload;
         accept();
         return;
     case aftersave::stay:
         // Nothing was written: the dialog stays.
         return;
     case aftersave::fatal:
-        end_ = flagcheckend::fatal;
+        end_ = toolend::fatal;
         accept();
         return;
     }
 }
 
-flagcheckend flagcheckfrm::open(gedcomindex& index, settings& s, settingsstore& store, prompts& p, QWidget* parent)
+toolend flagcheckfrm::open(gedcomindex& index, settings& s, settingsstore& store, prompts& p, QWidget* parent)
 {
     flagcheckfrm dialog(index, s, store, p, parent);
     if (dialog.cancelled())
-        return flagcheckend::unchanged;
+        return toolend::unchanged;
     dialog.exec();
     return dialog.outcome();
 }
 
 bool flagcheckfrm::run(gedcomindex& index, settings& s, settingsstore& store, prompts& p, QWidget* parent)
 {
-    return open(index, s, store, p, parent) != flagcheckend::unchanged;
+    return open(index, s, store, p, parent) != toolend::unchanged;
 }
 
 } // namespace qm

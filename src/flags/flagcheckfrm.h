@@ -4,6 +4,7 @@
 // them (after a backup; never over a change made by another program).
 
 #include "flags/flagcheck.h"
+#include "writer/openfile.h"
 
 #include <QDialog>
 
@@ -18,13 +19,6 @@ struct settings;
 class prompts;
 class settingsstore;
 
-// How the Flag Check dialog ended.
-enum class flagcheckend {
-    unchanged, // nothing written, the index still in step with the file
-    reload,    // rewritten, or changed outside the program: read the file again
-    fatal,     // the rewrite failed (message shown, file as it was): the program ends
-};
-
 class flagcheckfrm : public QDialog {
     Q_OBJECT
 public:
@@ -35,11 +29,11 @@ public:
     // to end the program use open().
     static bool run(gedcomindex& index, settings& s, settingsstore& store, prompts& p, QWidget* parent);
     // The same, telling a failed rewrite apart.
-    static flagcheckend open(gedcomindex& index, settings& s, settingsstore& store, prompts& p, QWidget* parent);
+    static toolend open(gedcomindex& index, settings& s, settingsstore& store, prompts& p, QWidget* parent);
 
     // The check was cancelled while the dialog loaded: it is not shown.
     bool cancelled() const { return check_.cancelled; }
-    flagcheckend outcome() const { return end_; }
+    toolend outcome() const { return end_; }
     const flagcheckresult& check() const { return check_; }
 
 private:
@@ -51,7 +45,7 @@ private:
     settingsstore& store_;
     prompts& prompts_;
     flagcheckresult check_;
-    flagcheckend end_ = flagcheckend::unchanged;
+    toolend end_ = toolend::unchanged;
     bool loading_ = false;
 
     QListWidget* addlst_ = nullptr;

@@ -1,35 +1,48 @@
-#include "app/mainfrm.h"
+#include "flags/flagsmenu_ui.h"
 
+#include "flags/flagcheck.h"
 #include "flags/flagcheckfrm.h"
 #include "flags/flagfrm.h"
+#include "platform/prompts.h"
 
 namespace qm {
 
-// "Census Flags...": the flag definitions are stored when the dialog closes;
-// the file is read again when its Flag Check rewrote it, and the program ends
-// when that rewrite failed.
-void mainfrm::censusflags()
+toolend censusflags(openfile& file, prompts& p, QWidget* parent)
 {
-    if (!file_.index())
-        return;
+    if (!file.index())
+        return toolend::unchanged;
+    const pausewatch paused = file.pause();
     bool fatal = false;
-    runtool([this, &fatal] {
-        flagfrm* owner = nullptr;
-        flagfrm d(
-            *file_.index(), file_.currentsettings(), file_.store(), prompts_,
-            [this, &fatal, &owner] {
-                const flagcheckend end = flagcheckfrm::open(*file_.index(), file_.currentsettings(), file_.store(), prompts_, owner);
-                fatal = end == flagcheckend::fatal;
-                return end != flagcheckend::unchanged;
-            },
-            this);
-        owner = &d;
-        d.exec();
-        if (d.reloadneeded() && !fatal)
-            reloadneeded_ = true;
-    });
+    flagfrm* owner = nullptr;
+    flagfrm d(
+        *file.index(), file.currentsettings(), file.store(), p,
+        [&] {
+            const toolend end = flagcheckfrm::open(*file.index(), file.currentsettings(), file.store(), p, owner);
+            fatal = end == toolend::fatal;
+            return end != toolend::unchanged;
+        },
+        parent);
+    owner = &d;
+    d.exec();
     if (fatal)
-        endprogram();
+        return toolend::fatal;
+    return d.reloadneeded() ? toolend::reload : toolend::unchanged;
+}
+
+toolend silentflagcheck(openfile& file, prompts& p, QWidget* parent)
+{
+    if (!file.index() || file.index()->people.empty())
+        return toolend::unchanged;
+    bool outofstep = false;
+    {
+        busycursor busy(p);
+        outofstep = flagsoutofstep(*file.index());
+    }
+    if (!outofstep)
+        return toolend::unchanged;
+    p.tell(flagsoutofsyncmessage());
+    const pausewatch paused = file.pause();
+    return flagcheckfrm::open(*file.index(), file.currentsettings(), file.store(), p, parent);
 }
 
 } // namespace qm

@@ -1,10 +1,10 @@
 #include "images/imagechoices.h"
 
-#include "app/recentfiles.h"
 
 #include "log/censuslog.h"
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
+#include "platform/paths.h"
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
 

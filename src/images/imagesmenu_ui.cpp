@@ -1,37 +1,55 @@
-#include "app/mainfrm.h"
+#include "images/imagesmenu_ui.h"
 
-#include "census/entrypanel_ui.h"
+#include "images/attachimagesfrm.h"
 #include "images/imagesfrm.h"
-
-#include <QComboBox>
-#include <QLineEdit>
 
 namespace qm {
 
-// Save step: the Census Images dialog for the entry being saved. The titles it
-// offers are built from the source the entry makes or cites and from its
-// reference.
-bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
+toolend attachimages(openfile& file, prompts& p, QWidget* parent)
+{
+    // Nothing to attach to while no family file could be read.
+    if (!file.index() || file.index()->gedcomfile.isEmpty())
+        return toolend::unchanged;
+    const pausewatch paused = file.pause();
+    const auto chooser = [&file, &p](const QString& title, const QString& date, QWidget* owner) {
+        imagerequest r;
+        r.context = 2;
+        r.sourcetitle = title;
+        r.imagedate = date;
+        r.sourcebase = title.trimmed();
+        r.fullentry = file.currentsettings().fullentry;
+        std::vector<imagechoice> chosen;
+        imagesfrm::choose(r, *file.index(), file.currentsettings(), file.store(), p, chosen, owner);
+        return chosen;
+    };
+    Attachimagesfrm d(*file.index(), file.currentsettings(), p, chooser, parent);
+    d.exec();
+    if (d.fatal())
+        return toolend::fatal;
+    return d.imagesattached() || d.filechanged() ? toolend::reload : toolend::unchanged;
+}
+
+bool chooseentryimages(const entrysource& e, openfile& file, prompts& p, QWidget* parent,
+                       std::vector<imagechoice>& chosen)
 {
     chosen.clear();
-    if (!file_.index())
+    if (!file.index())
         return true;
-    const entrypanel* p = panel();
     imagerequest r;
     r.context = 1;
-    r.fullentry = sourcemode_ == 0;
-    r.imagedate = p->fixeddatetxt->text();
+    r.fullentry = e.fullentry;
+    r.imagedate = e.date;
     if (r.fullentry) {
-        r.sourcetitle = p->titletxt->text();
-        r.sourcebase = p->titletxt->text().trimmed();
-        r.referencebase = p->referencetxt->text().trimmed();
+        r.sourcetitle = e.title;
+        r.sourcebase = e.title.trimmed();
+        r.referencebase = e.reference.trimmed();
     } else {
-        const QString where = p->wherewithinsourcetxt->text().trimmed();
-        r.sourcetitle = p->sourcecom->currentText();
-        r.sourcebase = p->sourcecom->currentText().trimmed() + QStringLiteral(" (") + where + QStringLiteral(")");
+        const QString where = e.where.trimmed();
+        r.sourcetitle = e.sourcetitle;
+        r.sourcebase = e.sourcetitle.trimmed() + QStringLiteral(" (") + where + QStringLiteral(")");
         r.referencebase = where;
     }
-    return imagesfrm::choose(r, *file_.index(), file_.currentsettings(), file_.store(), prompts_, chosen, this);
+    return imagesfrm::choose(r, *file.index(), file.currentsettings(), file.store(), p, chosen, parent);
 }
 
 } // namespace qm

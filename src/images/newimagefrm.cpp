@@ -1,9 +1,9 @@
 #include "images/newimagefrm.h"
 
-#include "app/recentfiles.h"
 #include "images/imagechoices.h"
 #include "images/imagepreview_ui.h"
 #include "platform/formparts_ui.h"
+#include "platform/paths.h"
 #include "platform/prompts.h"
 #include "settings/settings.h"
 

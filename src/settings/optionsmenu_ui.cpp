@@ -1,51 +1,28 @@
-#include "app/mainfrm.h"
+#include "settings/optionsmenu_ui.h"
 
-#include "census/entrypanel_ui.h"
 #include "platform/prompts.h"
 #include "settings/optionsfrm.h"
 #include "writer/backups.h"
-
-#include <QLineEdit>
+#include "writer/openfile.h"
 
 namespace qm {
 
-// "Options...": after Save the new settings take effect; a change of the
-// recording method, the country or "ID Only" clears the entry and reads the
-// file again.
-void mainfrm::showoptions()
+optionsend showoptions(openfile& file, prompts& p, const std::function<void()>& donate, QWidget* parent)
 {
-    runtool([this] {
-        optionsfrm f(prompts_, file_.store(), file_.currentsettings(), [this] { donate(); }, this);
-        if (f.exec() != QDialog::Accepted)
-            return;
-        file_.usesettings(f.saved());
-        if (f.reloadneeded()) {
-            clearentry();
-            settitleandpanel(file_.path());
-            reloadneeded_ = true;
-        } else {
-            viewlogmen_->setEnabled(file_.currentsettings().keeplog);
-            attachbut_->setEnabled(file_.currentsettings().fullentry);
-        }
-        if (file_.currentsettings().fullentry && !panel_[0]->titletxt->text().isEmpty())
-            refreshtitle();
-    });
+    optionsfrm f(p, file.store(), file.currentsettings(), donate, parent);
+    if (f.exec() != QDialog::Accepted)
+        return {};
+    file.usesettings(f.saved());
+    return {true, f.reloadneeded()};
 }
 
-// At start, once the settings are read: incomplete settings, or paths that
-// fail their checks, are put right in the options dialog before the file is
-// loaded. It cannot be cancelled while the settings are incomplete.
-void mainfrm::startoptions(const QString& path)
+bool startoptions(openfile& file, prompts& p, const std::function<void()>& donate, QWidget* parent)
 {
-    if (!file_.currentsettings().firststart && checkpaths(prompts_, file_.currentsettings()))
-        file_.currentsettings().firststart = true;
-    if (!file_.currentsettings().firststart)
-        return;
-    optionsfrm f(prompts_, file_.store(), file_.currentsettings(), [this] { donate(); }, this);
-    if (f.exec() != QDialog::Accepted)
-        return;
-    file_.usesettings(f.saved());
-    settitleandpanel(path);
+    if (!file.currentsettings().firststart && checkpaths(p, file.currentsettings()))
+        file.currentsettings().firststart = true;
+    if (!file.currentsettings().firststart)
+        return false;
+    return showoptions(file, p, donate, parent).saved;
 }
 
 } // namespace qm

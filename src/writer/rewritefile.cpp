@@ -1,3 +1,9 @@
+// The rewrite's one pass over the family file (see rewritefile.h). It stays one
+// file above the usual size on purpose: the four modes are not separate
+// routines but branches of the same line loop (rewriterun::iteration), sharing
+// its reader and writer, the read-ahead of a record's tail, the anchors where
+// new records go, the change stamps and the flag blocks. Split by mode, each
+// part would need that whole state and the loop would be read across files.
 #include "writer/rewritefile.h"
 
 #include "writer/rewritechecks.h"

@@ -1,14 +1,16 @@
 // The Flag Check dialogs on the offscreen platform: the silent check after a
-// family file is opened with "Flag Check" on, the country question (answered,
-// remembered for the place, cancelled), making the changes, a family file
-// changed by another program before the changes are made, and the dialog's
-// own controls.
+// family file is opened with "Flag Check" on, end to end through the main
+// window; the check over the open file alone (the country question cancelled,
+// no changes made, a family file changed by another program before the
+// changes are made); and the dialog's own controls.
 #include "flags/flagcheckfrm.h"
 
 #include "flags/flagcheck.h"
+#include "flags/flagsmenu_ui.h"
 #include "flags/flagtable.h"
 #include "model/loadgedcom.h"
 #include "support/mainfrmfixture.h"
+#include "support/openfixture.h"
 #include "support/testflags.h"
 #include "writer/saveroad.h"
 
@@ -169,67 +171,53 @@ private slots:
         QVERIFY(r->w->watching());
     }
 
-    // Cancelling the country question ends the check (the message, no Flag
-    // Check dialog); "Don't make changes" closes it. Neither writes anything.
-    void cancelledordeclinedwritesnothing()
+    // The check itself, over the open file without the main window: a
+    // cancelled country question (the message, no Flag Check dialog) or "Don't
+    // make changes" write nothing; a change made by another program while the
+    // dialog is open is not written over, and the file is to be read again.
+    void checkoverthefile()
     {
-        for (const bool cancel : {true, false}) {
+        for (const int run : {0, 1, 2}) {
+            const bool cancel = run == 0, outside = run == 2;
             const QString file = familyfile();
             const int before = backupcount();
+            const flagtable defs = testflagdefs();
+            const openrun open = openon(files.ini(), file, checking(), &defs);
+            QVERIFY(open.read);
+            scriptedprompts p;
+
             dialoganswers dialogs;
-            dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [cancel](QDialog* d) {
-                d->findChild<QCheckBox*>(QStringLiteral("alwayschk"))->setChecked(true);
+            dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [cancel, outside](QDialog* d) {
+                d->findChild<QCheckBox*>(QStringLiteral("alwayschk"))->setChecked(!outside); // else asked for Pat too
                 click(d, cancel ? "cancelbut" : "okbut");
             });
+            if (outside)
+                dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) { click(d, "okbut"); });
             if (!cancel)
-                dialogs.expect(QStringLiteral("flagcheckfrm"), [](QDialog* d) { click(d, "closebut"); });
-            auto r = start(file, checking(), [cancel](scriptedprompts& p) {
-                p.expect(answer::ok, QStringLiteral("out of sync"));
-                if (cancel)
-                    p.expect(answer::ok,
-                             QStringLiteral("Flag check was cancelled. The flags in the file have not been changed."));
-            });
-            QVERIFY(r);
-            QTest::qWait(30);
-            QVERIFY(dialogs.unexpected == 0 && dialogs.pending() == 0 && r->prompts.unexpected() == 0);
-            QCOMPARE(dialogs.seen.size(), cancel ? 1 : 2);
-            QCOMPARE(bytesof(file), family);
+                dialogs.expect(QStringLiteral("flagcheckfrm"), [&](QDialog* d) {
+                    if (outside)
+                        QVERIFY(replaceinfile(file, "1 NAME Pat /Byrne/", "1 NAME Patrick /Byrne/"));
+                    click(d, outside ? "Changebut" : "closebut");
+                });
+            p.expect(answer::ok, QStringLiteral("out of sync"));
+            if (cancel)
+                p.expect(answer::ok, QStringLiteral("Flag check was cancelled. The flags in the file have not been changed."));
+            if (outside) {
+                p.expect(answer::yes, QStringLiteral("set/unset"));
+                p.expect(answer::ok, QDir::toNativeSeparators(file) +
+                                         QStringLiteral(" has been modified by another application. Flags will not be "
+                                                        "changed as a precaution to ensure there is no data loss. This "
+                                                        "form will now close and the file will be reloaded."));
+            }
+            QCOMPARE(silentflagcheck(*open.file, p, nullptr), outside ? toolend::reload : toolend::unchanged);
+            QVERIFY(open.file->watching());
+            QVERIFY(dialogs.unexpected == 0 && dialogs.pending() == 0 && p.unexpected() == 0);
+            QByteArray now = family;
+            if (outside)
+                now.replace("1 NAME Pat /Byrne/", "1 NAME Patrick /Byrne/");
+            QCOMPARE(bytesof(file), now);
             QCOMPARE(backupcount(), before);
         }
-    }
-
-    // The family file changes outside the program while the dialog is open:
-    // nothing is written, the user is told, and the file is read again.
-    void outsidechangeisnotwrittenover()
-    {
-        const QString file = familyfile();
-        const int before = backupcount();
-        dialoganswers dialogs;
-        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
-            click(d, "okbut"); // UK, preselected
-        });
-        dialogs.expect(QStringLiteral("flagcheckcountryfrm"), [](QDialog* d) {
-            click(d, "okbut");
-        });
-        dialogs.expect(QStringLiteral("flagcheckfrm"), [&](QDialog* d) {
-            QVERIFY(replaceinfile(file, "1 NAME Pat /Byrne/", "1 NAME Patrick /Byrne/"));
-            click(d, "Changebut");
-        });
-        auto r = start(file, checking(), [&](scriptedprompts& p) {
-            p.expect(answer::ok, QStringLiteral("out of sync"));
-            p.expect(answer::yes, QStringLiteral("set/unset"));
-            p.expect(answer::ok, QDir::toNativeSeparators(file) +
-                                     QStringLiteral(" has been modified by another application. Flags will not be "
-                                                    "changed as a precaution to ensure there is no data loss. This "
-                                                    "form will now close and the file will be reloaded."));
-        });
-        QVERIFY(r);
-        QVERIFY(dialogs.unexpected == 0 && dialogs.pending() == 0 && r->prompts.unexpected() == 0);
-        QByteArray changed = family;
-        changed.replace("1 NAME Pat /Byrne/", "1 NAME Patrick /Byrne/");
-        QCOMPARE(bytesof(file), changed);
-        QCOMPARE(backupcount(), before);
-        QCOMPARE(QString::fromUtf8(r->w->index()->people.at(3).name), QStringLiteral("Byrne, Patrick"));
     }
 
     // With the flags in step nothing is shown; opening a file from the menu checks it too.
@@ -298,7 +286,7 @@ private slots:
         change->click();
         QCOMPARE(prompts.unexpected(), 0);
         QVERIFY(d.isVisible());
-        QCOMPARE(d.outcome(), flagcheckend::unchanged);
+        QCOMPARE(d.outcome(), toolend::unchanged);
         QCOMPARE(bytesof(file), john);
     }
 };

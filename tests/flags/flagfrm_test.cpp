@@ -270,45 +270,9 @@ private slots:
     }
 
     // From the main window: a census and a new name chosen through both
-    // choosers; the row appears and the definition is stored on close.
+    // choosers; the flag check that rewrites the file closes Census Flags, and
+    // the main window reads the file again, with the new definition stored.
     void fromthemenu()
-    {
-        auto run = files_.opened(files_.sample());
-        QVERIFY(run);
-        const QString name = QStringLiteral("Canada Census 1881");
-        bool checked = false;
-        dialoganswers answers;
-        answers.expect(QStringLiteral("flagfrm"), [&](QDialog* d) {
-            QTimer::singleShot(0, d, [&, d] {
-                QTest::mouseClick(child(d, "Datebut"), Qt::LeftButton);
-                QTest::mouseClick(child(d, "flagbut"), Qt::LeftButton);
-                checked = rows(d).contains(QStringLiteral("4 APR 1881     Canada         ") + name);
-                QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
-            });
-        });
-        answers.expect(QStringLiteral("flagdatefrm"), [](QDialog* d) {
-            QTest::mouseClick(child<QRadioButton>(d, "CanadaOpt"), Qt::LeftButton);
-            clickrow(child<QListWidget>(d, "datelst"), QStringLiteral("4 APR 1881"));
-            QTest::mouseClick(child(d, "datebut"), Qt::LeftButton);
-        });
-        answers.expect(QStringLiteral("flagnamefrm"), [&](QDialog* d) {
-            QTest::keyClicks(child<QLineEdit>(d, "flagnametxt"), name);
-            QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
-        });
-        run->prompts.expect(answer::no, flaguseprompt());
-        run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
-        QVERIFY(answers.unexpected == 0 && answers.pending() == 0 && run->prompts.unexpected() == 0);
-        QVERIFY(checked && run->w->watching());
-        QStringList stored;
-        for (const char* key : {"Code", "Name", "Date", "Country"})
-            stored << run->store->read(QStringLiteral("Flags/1"), QString::fromLatin1(key)).value_or(QString());
-        QCOMPARE(stored, (QStringList{"__CANADA_CENSUS", name, "4 APR 1881", "Canada"}));
-        QVERIFY(!run->store->groupexists(QStringLiteral("Flags/2")));
-    }
-
-    // A flag check that rewrites the file closes Census Flags; the main window
-    // reads the file again, with the new definition from the store.
-    void flagcheckrewrites()
     {
         settings s = defaultsettings();
         QDir().mkpath(files_.filepath(QStringLiteral("backups")));
@@ -317,16 +281,26 @@ private slots:
         const QString file = files_.sample();
         auto run = files_.opened(file, &s);
         QVERIFY(run);
-        bool closed = false;
+        const QString name = QStringLiteral("Census 1871");
+        bool checked = false, closed = false;
         dialoganswers answers;
         answers.expect(QStringLiteral("flagfrm"), [&](QDialog* d) {
             QTimer::singleShot(0, d, [&, d] {
-                auto* f = qobject_cast<flagfrm*>(d);
-                f->setflagname(QStringLiteral("Census 1871"));
-                f->setcensus(QStringLiteral("UK"), QStringLiteral("2 APR 1871"));
+                QTest::mouseClick(child(d, "Datebut"), Qt::LeftButton);
+                QTest::mouseClick(child(d, "flagbut"), Qt::LeftButton);
+                checked = rows(d).contains(QStringLiteral("2 APR 1871     UK             ") + name);
                 QTest::mouseClick(child(d, "flagcheckbut"), Qt::LeftButton);
-                closed = !d->isVisible() && f->reloadneeded();
+                closed = !d->isVisible() && qobject_cast<flagfrm*>(d)->reloadneeded();
             });
+        });
+        answers.expect(QStringLiteral("flagdatefrm"), [](QDialog* d) {
+            QTest::mouseClick(child<QRadioButton>(d, "ukopt"), Qt::LeftButton);
+            clickrow(child<QListWidget>(d, "datelst"), QStringLiteral("2 APR 1871"));
+            QTest::mouseClick(child(d, "datebut"), Qt::LeftButton);
+        });
+        answers.expect(QStringLiteral("flagnamefrm"), [&](QDialog* d) {
+            QTest::keyClicks(child<QLineEdit>(d, "flagnametxt"), name);
+            QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
         });
         answers.expect(QStringLiteral("flagcheckfrm"), [](QDialog* d) {
             QVERIFY(child<QListWidget>(d, "addlst")->count() > 0);
@@ -336,7 +310,11 @@ private slots:
         run->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to set/unset flags as suggested?"));
         run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
         QVERIFY(answers.unexpected == 0 && answers.pending() == 0 && run->prompts.unexpected() == 0);
-        QVERIFY(closed && run->w->watching());
+        QVERIFY(checked && closed && run->w->watching());
+        QStringList stored;
+        for (const char* key : {"Code", "Name", "Date", "Country"})
+            stored << run->store->read(QStringLiteral("Flags/1"), QString::fromLatin1(key)).value_or(QString());
+        QCOMPARE(stored, (QStringList{"__CENSUS_1871", name, "2 APR 1871", "UK"}));
 
         QFile f(file);
         QVERIFY(f.open(QIODevice::ReadOnly));

@@ -18,7 +18,6 @@
 #include <QDir>
 #include <QImage>
 #include <QLineEdit>
-#include <QRegularExpression>
 #include <QListWidget>
 #include <QPushButton>
 #include <QRadioButton>
@@ -373,16 +372,8 @@ private slots:
         QVERIFY(linked == (std::vector<int32_t>{2, 3}));
         QCOMPARE(objects, size_t(3));
 
-        const QStringList lines = QString::fromStdString(readfile(file)).split(QStringLiteral("\r\n"));
-        const qsizetype at = lines.indexOf(QStringLiteral("0 @S5@ SOUR"));
-        QVERIFY(at > 0);
-        const qsizetype end = lines.indexOf(QRegularExpression(QStringLiteral("0 .*")), at + 1);
-        const QStringList record = lines.mid(at, end - at);
-        QCOMPARE(record.filter(QRegularExpression(QStringLiteral("^1 OBJE"))),
-                 (QStringList{QStringLiteral("1 OBJE @O2@"), QStringLiteral("1 OBJE @O3@")}));
-        QVERIFY(lines.indexOf(QStringLiteral("1 _FILE ") + page) > lines.indexOf(QStringLiteral("0 @O3@ OBJE")));
+        // The records written are attachtwice's; here: read again afterwards.
         QCOMPARE(backups(s).size(), 1);
-        // Read again afterwards.
         QVERIFY(w.index()->sources[4].objectids == (std::vector<int32_t>{2, 3}));
         QCOMPARE(w.index()->maxobjectid, 3);
 

@@ -1,10 +1,10 @@
-#include "app/recentfiles.h"
 #include "images/imagechoices.h"
 
 #include "log/censuslog.h"
 #include "model/gedcomindex.h"
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
+#include "platform/paths.h"
 #include "platform/settingsstore.h"
 #include "settings/settings.h"
 #include "support/readonlyfolder.h"

@@ -1,11 +1,14 @@
-// The Census Date Check dialog offscreen, from the main window's Tools menu:
-// the lists, the edits, the details, another country, the changes made, a file
-// changed by another program, and a rewrite that fails.
+// The Census Date Check dialog offscreen: from the main window's Tools menu,
+// the lists, the edits, the details, another country and the changes made;
+// over the open file alone, a file changed by another program and a rewrite
+// that fails.
 #include "tools/datecheckfrm.h"
+#include "tools/toolsmenu_ui.h"
 
 #include "platform/clock.h"
 #include "writer/saveroad.h"
 #include "support/mainfrmfixture.h"
+#include "support/openfixture.h"
 
 #include <QAction>
 #include <QGroupBox>
@@ -210,90 +213,50 @@ private slots:
         // The file was read again: the index holds the new dates.
         QCOMPARE(qs(w.index()->people[2].census[1].date), QStringLiteral("30 MAR 1851"));
         QVERIFY(w.watching());
-
-        // Choosing the country again discards the edits.
-        dialoganswers again;
-        bool seen = false;
-        again.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
-            seen = true;
-            QCOMPARE(rows(d, "changelst").size(), 1); // only ABT 1841 is left
-            click(d, QStringLiteral("countryopt1"));
-            QCOMPARE(rows(d, "currentlst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
-            click(d, QStringLiteral("exitbut"));
-        });
-        opendatecheck(w);
-        QTRY_VERIFY(seen);
-        QCOMPARE(again.unexpected, 0);
-        QCOMPARE(backupcount(), before + 1);
     }
 
-    // The file changed by another program while the dialog was open: nothing
-    // written, the dialog closes and the file is read again.
-    void outsidechangerefused()
+    // The tool over the open file alone. Changed by another program while the
+    // dialog was open: nothing written, the dialog closes and the file is to
+    // be read again. A rewrite that fails: its message, the file as it was,
+    // and the program is to end.
+    void refusedandfailedrewrites()
     {
-        const QString file = family();
-        QVERIFY(!file.isEmpty());
-        const settings s = testsettings();
-        auto run = files.opened(file, &s);
-        QVERIFY(run);
-        mainfrm& w = *run->w;
-        const int before = backupcount();
-        QByteArray changed;
+        for (const bool outside : {true, false}) {
+            const QString file = family();
+            QVERIFY(!file.isEmpty());
+            const openrun open = openon(files.ini(), file, testsettings());
+            QVERIFY(open.read);
+            scriptedprompts p;
+            const int before = backupcount();
+            QByteArray expected;
 
-        dialoganswers dialogs;
-        bool done = false;
-        dialogs.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
-            done = true;
-            QVERIFY(replaceinfile(file, "2 DATE ABT 1841", "2 DATE ABT 1842"));
+            dialoganswers dialogs;
+            dialogs.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
+                if (outside)
+                    QVERIFY(replaceinfile(file, "2 DATE ABT 1841", "2 DATE ABT 1842"));
+                else
+                    setinputfaultfortests(true);
+                QFile f(file);
+                QVERIFY(f.open(QIODevice::ReadOnly));
+                expected = f.readAll();
+                p.expect(answer::yes, QStringLiteral("Are you sure"));
+                p.expect(answer::ok, outside ? QDir::toNativeSeparators(file) + QStringLiteral(
+                                                   " has been modified by another application. Dates will not be "
+                                                   "changed as a precaution to ensure there is no data loss. This "
+                                                   "form will now close and the file will be reloaded.")
+                                             : QStringLiteral("An error occurred"));
+                control<QPushButton>(d, QStringLiteral("changebut"))->click();
+            });
+            const toolend end = censusdatecheck(*open.file, p, nullptr);
+            setinputfaultfortests(false);
+            QCOMPARE(end, outside ? toolend::reload : toolend::fatal);
+            QVERIFY(dialogs.unexpected == 0 && dialogs.pending() == 0 && p.unexpected() == 0);
+            QVERIFY(open.file->watching());
+            if (outside)
+                QCOMPARE(backupcount(), before);
             QFile f(file);
-            QVERIFY(f.open(QIODevice::ReadOnly));
-            changed = f.readAll();
-            run->prompts.expect(answer::yes, QStringLiteral("Are you sure"));
-            run->prompts.expect(answer::ok, QDir::toNativeSeparators(file)
-                                                + QStringLiteral(" has been modified by another application. Dates will "
-                                                                 "not be changed as a precaution to ensure there is no "
-                                                                 "data loss. This form will now close and the file will "
-                                                                 "be reloaded."));
-            control<QPushButton>(d, QStringLiteral("changebut"))->click();
-        });
-        opendatecheck(w);
-        QTRY_VERIFY(done);
-        QVERIFY(dialogs.unexpected == 0 && run->prompts.unexpected() == 0);
-        QCOMPARE(backupcount(), before);
-        QFile f(file);
-        QVERIFY(f.open(QIODevice::ReadOnly) && f.readAll() == changed);
-        QCOMPARE(qs(w.index()->people[0].census[0].date), QStringLiteral("ABT 1842"));
-    }
-
-    // A rewrite that fails: its message, the file as it was, and the program ends.
-    void rewritefailedends()
-    {
-        const QString file = family();
-        QVERIFY(!file.isEmpty());
-        const settings s = testsettings();
-        auto run = files.opened(file, &s);
-        QVERIFY(run);
-        QFile f(file);
-        QVERIFY(f.open(QIODevice::ReadOnly));
-        const QByteArray before = f.readAll();
-        f.close();
-
-        dialoganswers dialogs;
-        bool done = false;
-        dialogs.expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
-            done = true;
-            setinputfaultfortests(true);
-            run->prompts.expect(answer::yes, QStringLiteral("Are you sure"));
-            run->prompts.expect(answer::ok, QStringLiteral("An error occurred"));
-            control<QPushButton>(d, QStringLiteral("changebut"))->click();
-        });
-        opendatecheck(*run->w);
-        setinputfaultfortests(false);
-        QTRY_VERIFY(done);
-        QVERIFY(dialogs.unexpected == 0 && run->prompts.unexpected() == 0);
-        QVERIFY(!run->w->isVisible());
-        QVERIFY(f.open(QIODevice::ReadOnly));
-        QCOMPARE(f.readAll(), before);
+            QVERIFY(f.open(QIODevice::ReadOnly) && f.readAll() == expected);
+        }
     }
 };
 

@@ -1,0 +1,16 @@
+#pragma once
+// The parts of a file path written with either separator ("/" or "\\"): the
+// settings keep Windows paths, and a family file moved between systems may
+// carry either.
+
+#include <QString>
+
+namespace qm {
+
+// The folder part of a path, up to and including its last separator; empty
+// when it has none.
+QString folderof(const QString& path);
+// The file name of a path: the part after its last separator.
+QString filenameof(const QString& path);
+
+} // namespace qm
