@@ -27,8 +27,8 @@ void mainfrm::showoptions()
             viewlogmen_->setEnabled(file_.currentsettings().keeplog);
             attachbut_->setEnabled(file_.currentsettings().fullentry);
         }
-        if (file_.currentsettings().fullentry && !panel_[0]->titletxt->text().isEmpty())
-            refreshtitle();
+        if (file_.currentsettings().fullentry && !panel()->titletxt->text().isEmpty())
+            form_->refreshtitle();
     });
 }
 

@@ -10,8 +10,8 @@
 namespace qm {
 
 // The Find dialog, from the Find button: the individual chosen, or -1. Sets
-// fromfind_ when the immediate family is to be rebuilt around it.
-int32_t mainfrm::runfind(int32_t start)
+// refocus when the immediate family is to be rebuilt around it.
+int32_t mainfrm::runfind(int32_t start, bool& refocus)
 {
     if (!file_.index())
         return -1;
@@ -21,7 +21,7 @@ int32_t mainfrm::runfind(int32_t start)
         std::vector<listentry> mainlist;
         // Above 32,000 individuals the dialog offers what the people list holds.
         if (!peoplelistshown(*file_.index())) {
-            const peoplelistmodel* people = household_->people;
+            const peoplelistmodel* people = household_->panel()->people;
             mainlist.reserve(static_cast<size_t>(people->rowCount()));
             for (int r = 0; r < people->rowCount(); ++r)
                 mainlist.push_back({people->textat(r), people->personat(r)});
@@ -31,7 +31,7 @@ int32_t mainfrm::runfind(int32_t start)
     findfrm dialog(*file_.index(), std::move(entries), start, prompts_, this);
     if (dialog.exec() != QDialog::Accepted)
         return -1;
-    fromfind_ = dialog.refocus();
+    refocus = dialog.refocus();
     return dialog.result();
 }
 
