@@ -29,10 +29,10 @@ void mainfrm::transcribegap(int32_t k, int year)
 {
     if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size())
         return;
-    QComboBox* years = panel()->yearcom;
+    QComboBox* years = form_->panel()->yearcom;
     const QString wanted = QString::number(year);
     if (years->currentIndex() < 0 || years->currentText().trimmed() != wanted) {
-        if (rows_.selectioncount > 0) {
+        if (household_->rows().selectioncount > 0) {
             if (!prompts_.yes(QStringLiteral("The census entry you are making has not been saved. Do you want to "
                                              "clear it and start an entry for the census of %1?")
                                   .arg(wanted),
@@ -45,11 +45,7 @@ void mainfrm::transcribegap(int32_t k, int year)
             return;
         years->setCurrentIndex(item);
     }
-    findresult_ = k;
-    fromfind_ = true;
-    peopleclicked(-1);
-    findresult_ = -1;
-    fromfind_ = false;
+    household_->showfound(k);
     raise();
     activateWindow();
 }

@@ -1,16 +1,15 @@
 #include "app/mainfrm.h"
 
 #include "app/startup.h"
-#include "census/censustable.h"
 #include "census/entrypanel_ui.h"
 #include "census/householdpanel_ui.h"
-#include "census/placecompleter_ui.h"
 #include "flags/flagsmenu_ui.h"
 #include "flags/flagtable.h"
 #include "images/imagesmenu_ui.h"
 #include "log/clearlog.h"
 #include "log/logfrm.h"
 #include "model/dates.h"
+#include "model/filechanged.h"
 #include "model/loadgedcom.h"
 #include "platform/formparts_ui.h"
 #include "platform/prompts.h"
@@ -27,7 +26,6 @@
 #include <QCheckBox>
 #include <QClipboard>
 #include <QCloseEvent>
-#include <QCollator>
 #include <QComboBox>
 #include <QFileInfo>
 #include <QHBoxLayout>
@@ -69,11 +67,6 @@ mainfrm::mainfrm(prompts& p, settingsstore& store, QWidget* parent)
 
 mainfrm::~mainfrm() = default;
 
-entrypanel* mainfrm::panel() const
-{
-    return panel_[static_cast<size_t>(sourcemode_)];
-}
-
 void mainfrm::buildmenus()
 {
     const auto item = [this](QMenu* menu, const char* name, const QString& caption) {
@@ -102,7 +95,7 @@ void mainfrm::buildmenus()
     QMenu* edit = menuBar()->addMenu(QStringLiteral("&Edit"));
     edit->setObjectName(QStringLiteral("editmen"));
     connect(item(edit, "undomen", QStringLiteral("&Undo Last Census Entry")), &QAction::triggered, this, [this] {
-        if (!file_.index() || saving_)
+        if (!file_.index() || form_->saving())
             return;
         bool undone = false;
         {
@@ -194,77 +187,33 @@ void mainfrm::buildform()
     v->setContentsMargins(8, 6, 8, 8);
     v->setSpacing(6);
 
-    panels_ = new QStackedWidget(central);
-    panels_->setObjectName(QStringLiteral("entrypanels"));
-    for (int m = 0; m < 2; ++m) {
-        entrypanel* p = new entrypanel(m, panels_);
-        panel_[static_cast<size_t>(m)] = p;
-        panels_->addWidget(p);
-        connect(p->yearcom, &QComboBox::currentIndexChanged, this, &mainfrm::yearchosen);
-        connect(p->fixeddatetxt, &QLineEdit::textEdited, this, &mainfrm::datechanged);
-        p->fixeddatetxt->installEventFilter(this);
-        new placecompleter(p->locationtxt, [this]() -> const std::vector<placerec>* {
-            return file_.index() ? &file_.index()->places : nullptr;
-        });
-        for (QLineEdit* e : {p->locationtxt, p->addresstxt, p->othertxt, p->referencetxt}) {
-            if (e && m == 0)
-                connect(e, &QLineEdit::textChanged, this, &mainfrm::refreshtitle);
-        }
-    }
-    v->addWidget(panels_, 1);
+    form_ = new censusform(file_, prompts_, central);
+    household_ = new householdform(file_, prompts_, *form_, central);
+    form_->sethousehold(household_);
+    household_->find = [this](int32_t start, bool& refocus) { return runfind(start, refocus); };
+    form_->chooseimages = [this](std::vector<imagechoice>& chosen) { return chooseentryimages(chosen); };
+    connect(household_, &householdform::filecheck, this, &mainfrm::checkonactivate);
+    connect(form_, &censusform::saved, this, &mainfrm::milestone);
+    connect(form_, &censusform::fatal, this, &mainfrm::endprogram);
+    v->addWidget(form_->stack(), 1);
 
-    auto* buttons = new QHBoxLayout;
-    addbut_ = new QPushButton(QStringLiteral("Save Census Entry"), central);
-    addbut_->setObjectName(QStringLiteral("addbut"));
-    connect(addbut_, &QPushButton::clicked, this, &mainfrm::saveentry);
-    previewbut_ = new QPushButton(QStringLiteral("Preview..."), central);
-    previewbut_->setObjectName(QStringLiteral("previewbut"));
-    previewbut_->setToolTip(QStringLiteral("Show the lines that saving this entry would write, without saving it"));
-    connect(previewbut_, &QPushButton::clicked, this, &mainfrm::previewentry);
-    Autosourcebut_ = new QPushButton(QStringLiteral("Auto Text"), central);
-    Autosourcebut_->setObjectName(QStringLiteral("Autosourcebut"));
-    Autosourcebut_->setToolTip(QStringLiteral(
-        "This will generate source text from the individuals chosen below. You will almost certainly need to edit "
-        "this to match the actual census entry."));
-    Autosourcebut_->setEnabled(false);
-    findbut_ = new QPushButton(QStringLiteral("Find..."), central);
-    findbut_->setObjectName(QStringLiteral("findbut"));
-    findbut_->setToolTip(
-        QStringLiteral("Click to find individuals by searching for name or browsing through relationships."));
-    connect(findbut_, &QPushButton::clicked, this, &mainfrm::findclicked);
     reloadbut_ = new QPushButton(QStringLiteral("Reload"), central);
     reloadbut_->setObjectName(QStringLiteral("reloadbut"));
     reloadbut_->setToolTip(QStringLiteral("Read the family file again"));
     connect(reloadbut_, &QPushButton::clicked, this, &mainfrm::reload);
-    buttons->addWidget(addbut_);
-    buttons->addWidget(previewbut_);
-    buttons->addWidget(Autosourcebut_);
+    // Tab goes from Find to Reload, then on to the household.
+    QWidget::setTabOrder(household_->findbutton(), reloadbut_);
+    auto* buttons = new QHBoxLayout;
+    buttons->addWidget(form_->savebutton());
+    buttons->addWidget(form_->previewbutton());
+    buttons->addWidget(form_->autotextbutton());
     buttons->addStretch(1);
-    buttons->addWidget(findbut_);
+    buttons->addWidget(household_->findbutton());
     buttons->addWidget(reloadbut_);
     v->addLayout(buttons);
-
-    infolab_ = showsvalue(new QLabel(central), QStringLiteral("infolab"), QStringLiteral("Information"));
-    infolab_->setWordWrap(true);
-    infolab_->setTextFormat(Qt::PlainText);
-    infolab_->setFrameShape(QFrame::StyledPanel);
-    infolab_->setMinimumHeight(infolab_->fontMetrics().lineSpacing() * 2 + 6);
-    infolab_->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Fixed);
-    v->addWidget(infolab_);
-
-    household_ = new householdpanel(central);
-    v->addWidget(household_, 3);
+    v->addWidget(household_->infolabel());
+    v->addWidget(household_->panel(), 3);
     setCentralWidget(central);
-
-    connect(household_->allpeoplechk, &QCheckBox::clicked, this, &mainfrm::showallclicked);
-    connect(household_, &householdpanel::personchosen, this, &mainfrm::peopleclicked);
-    connect(household_, &householdpanel::familychosen, this, &mainfrm::familyclicked);
-    censusrowsview* rows = household_->rows;
-    connect(rows, &censusrowsview::deleterequested, this, &mainfrm::deleterow);
-    connect(rows, &censusrowsview::inforequested, this, &mainfrm::inforow);
-    connect(rows, &censusrowsview::uprequested, this, &mainfrm::scrollup);
-    connect(rows, &censusrowsview::downrequested, this, &mainfrm::scrolldown);
-    connectform();
 }
 
 void mainfrm::placewindow()
@@ -304,9 +253,7 @@ void mainfrm::placewindow()
         if (p.centre)
             move(avail.center() - QPoint(s.width() / 2, s.height() / 2));
     }
-    divider_ = p.divider;
-    for (entrypanel* panel : panel_)
-        panel->setdivider(divider_);
+    form_->setdivider(p.divider);
 }
 
 void mainfrm::showplaced()
@@ -407,10 +354,9 @@ void mainfrm::showrecentfiles()
 void mainfrm::settitleandpanel(const QString& path)
 {
     setWindowTitle(windowtitle(path));
-    sourcemode_ = file_.currentsettings().fullentry ? 0 : 1;
-    panels_->setCurrentIndex(sourcemode_);
-    rows_.toprow = std::min(rows_.toprow, rows_.selectioncount);
-    fillyears();
+    form_->usesettings();
+    householdrows& rows = household_->rows();
+    rows.toprow = std::min(rows.toprow, rows.selectioncount);
     viewlogmen_->setEnabled(file_.currentsettings().keeplog);
     attachbut_->setEnabled(file_.currentsettings().fullentry);
 }
@@ -419,50 +365,18 @@ void mainfrm::afterload()
 {
     if (coverage_)
         coverage_->setindex(*file_.index(), file_.currentsettings()); // first: the grid must not read the index it had
-    const gedcomindex& x = *file_.index();
-    // Existing census sources, by title.
-    std::vector<sourceitem> sources = censussourcelist(x);
-    QCollator collator;
-    collator.setCaseSensitivity(Qt::CaseInsensitive);
-    std::stable_sort(sources.begin(), sources.end(),
-                     [&](const sourceitem& a, const sourceitem& b) { return collator.compare(a.title, b.title) < 0; });
-    QComboBox* sourcecom = panel_[1]->sourcecom;
-    const QSignalBlocker block(sourcecom);
-    sourcecom->clear();
-    for (const sourceitem& s : sources)
-        sourcecom->addItem(s.title, s.source);
-    sourcecom->setCurrentIndex(-1);
-    if (sourcemode_ == 0)
-        panel_[0]->sourceidlab->setText(QString::number(x.nextsourceid));
-
-    household_->family->clear();
-    household_->people->clear();
-    if (x.people.empty() && QFileInfo::exists(file_.path())) {
+    if (file_.index()->people.empty() && QFileInfo::exists(file_.path())) {
         prompts_.tell(nopeoplemessage());
         if (file_.path() == defaultfile_) {
             defaultfile_.clear();
             file_.store().write(defaultfilename, QString());
         }
     }
-    QCheckBox* all = household_->allpeoplechk;
-    if (peoplelistshown(x)) {
-        busycursor busy(prompts_);
-        household_->people->setpeople(file_.index(), sortedpeople(x, file_.currentsettings().idonly), file_.currentsettings().idonly);
-        household_->showpeoplelist(true);
-        all->setChecked(true);
-        all->setEnabled(false);
-        findbut_->setEnabled(true);
-    } else {
-        household_->showpeoplelist(false);
-        findbut_->setEnabled(false);
-        all->setChecked(false);
-        all->setEnabled(false);
-    }
 }
 
 void mainfrm::openfamilyfile(const QString& path)
 {
-    if (rows_.selectioncount >= 1 &&
+    if (household_->rows().selectioncount >= 1 &&
         !prompts_.yes(QStringLiteral("Loading another family history file will cause you to lose the census record "
                                      "you are currently entering. Are you sure you want to do this?"),
                       icon::exclamation, answer::no))
@@ -493,12 +407,14 @@ void mainfrm::openfamilyfile(const QString& path)
     }
     const QString previous = file_.path();
     rememberfile(chosen, true);
-    rows_.clear();
+    household_->rows().clear();
     settitleandpanel(chosen);
     if (!file_.load(chosen).ok && !previous.isEmpty() && !file_.index()->gedcomfile.isEmpty()) {
         // The file could not be read: the one read before stays open.
         settitleandpanel(file_.path());
         afterload();
+        form_->refill();
+        household_->refill();
     } else if (file_.currentsettings().flagcheck) {
         silentflagcheck();
     }
@@ -507,7 +423,7 @@ void mainfrm::openfamilyfile(const QString& path)
 
 void mainfrm::closeEvent(QCloseEvent* event)
 {
-    if (rows_.selectioncount >= 1 && !ending_ &&
+    if (household_->rows().selectioncount >= 1 && !ending_ &&
         !prompts_.yes(QStringLiteral("You have a partial or full census entry which has not been saved. Are you sure "
                                      "you want to leave Quillmark without saving it?"),
                       icon::question, answer::no, QStringLiteral("Leaving Quillmark?"))) {
@@ -518,7 +434,7 @@ void mainfrm::closeEvent(QCloseEvent* event)
     const QRect g = normalGeometry().isValid() ? normalGeometry() : geometry();
     const QPoint at = isMaximized() ? g.topLeft() : pos();
     writeplacement(file_.store(), isMaximized(), pixelstotwips(at.y(), dpi), pixelstotwips(at.x(), dpi),
-                   pixelstotwips(g.width(), dpi), pixelstotwips(g.height(), dpi), panel()->divider());
+                   pixelstotwips(g.width(), dpi), pixelstotwips(g.height(), dpi), form_->divider());
     file_.store().sync();
     idle_.emplace(file_);
     event->accept();
@@ -543,9 +459,14 @@ void mainfrm::clearall()
                       icon::exclamation, answer::no))
         return;
     clearentry();
-    household_->allpeoplelst->clearSelection();
-    household_->family->clear();
-    panel()->yearcom->setFocus();
+    household_->clearchoices();
+    household_->panel()->family->clear();
+    form_->focusyear();
+}
+
+void mainfrm::clearentry()
+{
+    form_->clearentry();
 }
 
 void mainfrm::endtool(toolend end)
@@ -578,8 +499,8 @@ void mainfrm::showoptions()
         viewlogmen_->setEnabled(file_.currentsettings().keeplog);
         attachbut_->setEnabled(file_.currentsettings().fullentry);
     }
-    if (end.saved && file_.currentsettings().fullentry && !panel_[0]->titletxt->text().isEmpty())
-        refreshtitle();
+    if (end.saved && file_.currentsettings().fullentry && !form_->panel()->titletxt->text().isEmpty())
+        form_->refreshtitle();
     endtool(end.reloadneeded ? toolend::reload : toolend::unchanged);
 }
 
@@ -598,11 +519,13 @@ void mainfrm::silentflagcheck()
     }
 }
 
+// The entry's Census Images dialog offers titles built from the source the
+// entry makes or cites.
 bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
 {
-    const entrypanel* p = panel();
+    const entrypanel* p = form_->panel();
     entrysource e;
-    e.fullentry = sourcemode_ == 0;
+    e.fullentry = form_->sourcemode() == 0;
     e.date = p->fixeddatetxt->text();
     if (e.fullentry) {
         e.title = p->titletxt->text();
@@ -614,104 +537,53 @@ bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
     return qm::chooseentryimages(e, file_, prompts_, this, chosen);
 }
 
-int32_t mainfrm::runfind(int32_t start)
+int32_t mainfrm::runfind(int32_t start, bool& refocus)
 {
-    const findchoice c = findindividual(file_, *household_->people, start, prompts_, this);
-    if (c.person >= 0 || c.refocus)
-        fromfind_ = c.refocus;
+    const findchoice c = findindividual(file_, *household_->panel()->people, start, prompts_, this);
+    refocus = c.refocus;
     return c.person;
 }
 
-void mainfrm::fillyears()
+void mainfrm::checkonactivate()
 {
-    entrypanel* p = panel();
-    p->fixeddatetxt->clear();
-    p->fixeddatetxt->setEnabled(false);
-    const QSignalBlocker block(p->yearcom);
-    p->yearcom->clear();
-    p->CensusYearLab->setText(censusyearcaption(file_.currentsettings().country));
-    p->yearcom->addItems(qm::fillyears(file_.currentsettings().country));
-    p->yearcom->setCurrentIndex(-1);
-}
-
-void mainfrm::yearchosen(int item)
-{
-    entrypanel* p = qobject_cast<entrypanel*>(sender() ? sender()->parent() : nullptr);
-    if (item < 0 || p != panel())
+    if (!file_.index() || file_.index()->people.empty() || checking_ || !file_.watching())
         return;
-    censuschoice c;
-    c.yeartext = p->yearcom->currentText().trimmed();
-    c.country = file_.currentsettings().country;
-    c.autoreference = file_.currentsettings().autoreference;
-    c.fullentry = file_.currentsettings().fullentry;
-    QLineEdit* ref = file_.currentsettings().fullentry ? p->referencetxt : p->wherewithinsourcetxt;
-    c.referencetext = ref ? ref->text() : QString();
-    c.lastrefprefix = lastrefprefix_;
-    const censusfound f = findcensus(c);
-    if (!f.error.isEmpty())
-        prompts_.tell(f.error);
-    if (f.setreference && ref) {
-        ref->setText(f.referencetext);
-        ref->setCursorPosition(f.cursor);
-    }
-    lastrefprefix_ = f.lastrefprefix;
-    p->fixeddatetxt->setText(f.date);
-    p->fixeddatetxt->setEnabled(true);
-    datechanged();
-
-    if (file_.index() && peoplelistshown(*file_.index())) {
-        QCheckBox* all = household_->allpeoplechk;
-        all->setEnabled(true);
-        const bool was = all->isChecked();
-        all->setChecked(true);
-        household_->setpeoplecaption(QStringLiteral("All Individuals:"));
-        if (!was)
-            fillallpeople();
-    } else {
-        fillalivepeople();
-    }
-    p->locationtxt->setFocus();
-}
-
-void mainfrm::refreshtitle()
-{
-    entrypanel* p = panel_[0];
-    if (sourcemode_ != 0)
+    checking_ = true;
+    repaint();
+    QApplication::processEvents();
+    const QString path = file_.index()->gedcomfile;
+    if (file_.missing()) {
+        // Reloading could only fail: the user is told once, and may open another file.
+        const bool told = gonetold_ == path;
+        gonetold_ = path;
+        checking_ = false;
+        if (!told && prompts_.yes(filegonequestion(path), icon::exclamation))
+            openfamilyfile(QStringLiteral("-1"));
         return;
-    p->titletxt->setText(maketitle(file_.currentsettings().title, p->yearcom->currentText().trimmed(), p->fixeddatetxt->text(),
-                                   p->locationtxt->text(), p->addresstxt->text(), p->othertxt->text(),
-                                   p->referencetxt->text().trimmed(), file_.currentsettings().country));
-    p->titletxt->setCursorPosition(0);
-}
-
-void mainfrm::datechanged()
-{
-    entrypanel* p = panel();
-    if (sourcemode_ == 0)
-        refreshtitle();
-    // The age of the individual chosen last, who may be hidden below the rows.
-    if (rows_.selectioncount > 0 && recognisedate(p->fixeddatetxt->text())) {
-        storerows();
-        showpersoninfo(rows_.selection[static_cast<size_t>(rows_.selectioncount - 1)].personindex);
     }
+    gonetold_.clear();
+    if (file_.changed()) {
+        prompts_.tell(changedmessage(path));
+        checking_ = false;
+        reload();
+        return;
+    }
+    checking_ = false;
 }
 
-bool mainfrm::censusdateok(bool normalise)
+void mainfrm::reload()
 {
-    entrypanel* p = panel();
-    const censusdef* def =
-        lookupcensus(file_.currentsettings().country, p->yearcom->currentIndex() >= 0 ? p->yearcom->currentText().toInt() : -1);
-    const datecheck d = validdate(p->fixeddatetxt->text(), def ? def->date : QString());
-    if (d.isdate && normalise && d.newtext)
-        p->fixeddatetxt->setText(*d.newtext);
-    return d.isdate;
+    household_->reload();
 }
 
-bool mainfrm::eventFilter(QObject* watched, QEvent* event)
+void mainfrm::endprogram()
 {
-    if (event->type() == QEvent::FocusOut && watched == panel()->fixeddatetxt)
-        censusdateok(true);
-    return QMainWindow::eventFilter(watched, event);
+    ending_ = true;
+    idle_.emplace(file_);
+    close();
+    // Only a running event loop can be left (tests drive the window without one).
+    if (QThread::currentThread()->loopLevel() > 0)
+        QCoreApplication::exit(1);
 }
 
 } // namespace qm

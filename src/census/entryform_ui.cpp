@@ -1,7 +1,4 @@
-// The main window's entry form: choosing an existing source, the large text
-// editor and the divider, Auto Text, the birth details asked for the
-// household, and "Save Census Entry".
-#include "app/mainfrm.h"
+#include "census/entryform_ui.h"
 
 #include "census/autotext.h"
 #include "census/birthfrm.h"
@@ -9,25 +6,30 @@
 #include "census/entrypanel_ui.h"
 #include "census/householdcheck.h"
 #include "census/householdcheckfrm.h"
-#include "census/householdpanel_ui.h"
+#include "census/household_ui.h"
+#include "census/placecompleter_ui.h"
 #include "census/sourcetextfrm.h"
 #include "census/validateentry.h"
+#include "model/dates.h"
 #include "model/filechanged.h"
 #include "model/loadgedcom.h"
 #include "platform/encoding.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
+#include "writer/maketitle.h"
+#include "writer/openfile.h"
 #include "writer/previewfrm.h"
 #include "writer/saveprompts.h"
 
 #include <QApplication>
+#include <QCollator>
 #include <QComboBox>
+#include <QEvent>
 #include <QLabel>
 #include <QLineEdit>
-#include <QListView>
 #include <QPlainTextEdit>
 #include <QPushButton>
-#include <QThread>
+#include <QStackedWidget>
 
 namespace qm {
 
@@ -49,22 +51,209 @@ QString withcrlf(const QString& text)
 
 } // namespace
 
-void mainfrm::connectform()
+censusform::censusform(openfile& file, prompts& p, QWidget* parent)
+    : QObject(parent), file_(file), prompts_(p), parent_(parent)
 {
-    for (entrypanel* p : panel_) {
-        connect(p->fulltextbut, &QPushButton::clicked, this, [this] { edittext(sourcetextfrm::sourcetext); });
-        connect(p->notetextbut, &QPushButton::clicked, this, [this] { edittext(sourcetextfrm::sourcenote); });
-        connect(p, &entrypanel::dividermoved, this, &mainfrm::dividermoved);
-        if (p->sourcecom)
-            connect(p->sourcecom, &QComboBox::currentIndexChanged, this, &mainfrm::sourcechosen);
-        // A date normalised on leaving the box is a change of the title too.
-        if (p->mode == 0)
-            connect(p->fixeddatetxt, &QLineEdit::textChanged, this, &mainfrm::refreshtitle);
+    stack_ = new QStackedWidget(parent);
+    stack_->setObjectName(QStringLiteral("entrypanels"));
+    for (int m = 0; m < 2; ++m) {
+        entrypanel* panel = new entrypanel(m, stack_);
+        panel_[static_cast<size_t>(m)] = panel;
+        stack_->addWidget(panel);
+        connect(panel->yearcom, &QComboBox::currentIndexChanged, this,
+                [this, panel](int item) { yearchosen(panel, item); });
+        connect(panel->fixeddatetxt, &QLineEdit::textEdited, this, &censusform::datechanged);
+        panel->fixeddatetxt->installEventFilter(this);
+        new placecompleter(panel->locationtxt, [this]() -> const std::vector<placerec>* {
+            return file_.index() ? &file_.index()->places : nullptr;
+        });
+        if (m == 0) {
+            for (QLineEdit* e : {panel->locationtxt, panel->addresstxt, panel->othertxt, panel->referencetxt})
+                connect(e, &QLineEdit::textChanged, this, &censusform::refreshtitle);
+        }
     }
-    connect(Autosourcebut_, &QPushButton::clicked, this, &mainfrm::autotextclicked);
+
+    addbut_ = new QPushButton(QStringLiteral("Save Census Entry"), parent);
+    addbut_->setObjectName(QStringLiteral("addbut"));
+    connect(addbut_, &QPushButton::clicked, this, &censusform::saveentry);
+    previewbut_ = new QPushButton(QStringLiteral("Preview..."), parent);
+    previewbut_->setObjectName(QStringLiteral("previewbut"));
+    previewbut_->setToolTip(QStringLiteral("Show the lines that saving this entry would write, without saving it"));
+    connect(previewbut_, &QPushButton::clicked, this, &censusform::previewentry);
+    Autosourcebut_ = new QPushButton(QStringLiteral("Auto Text"), parent);
+    Autosourcebut_->setObjectName(QStringLiteral("Autosourcebut"));
+    Autosourcebut_->setToolTip(QStringLiteral(
+        "This will generate source text from the individuals chosen below. You will almost certainly need to edit "
+        "this to match the actual census entry."));
+    Autosourcebut_->setEnabled(false);
+
+    for (entrypanel* panel : panel_) {
+        connect(panel->fulltextbut, &QPushButton::clicked, this, [this] { edittext(sourcetextfrm::sourcetext); });
+        connect(panel->notetextbut, &QPushButton::clicked, this, [this] { edittext(sourcetextfrm::sourcenote); });
+        connect(panel, &entrypanel::dividermoved, this, [this, panel](double share) { dividermoved(panel, share); });
+        if (panel->sourcecom)
+            connect(panel->sourcecom, &QComboBox::currentIndexChanged, this, &censusform::sourcechosen);
+        // A date normalised on leaving the box is a change of the title too.
+        if (panel->mode == 0)
+            connect(panel->fixeddatetxt, &QLineEdit::textChanged, this, &censusform::refreshtitle);
+    }
+    connect(Autosourcebut_, &QPushButton::clicked, this, &censusform::autotextclicked);
+    file_.onread([this] { refill(); });
 }
 
-void mainfrm::sourcechosen(int item)
+void censusform::usesettings()
+{
+    sourcemode_ = file_.currentsettings().fullentry ? 0 : 1;
+    stack_->setCurrentIndex(sourcemode_);
+    fillyears();
+}
+
+void censusform::refill()
+{
+    const gedcomindex& x = *file_.index();
+    // Existing census sources, by title.
+    std::vector<sourceitem> sources = censussourcelist(x);
+    QCollator collator;
+    collator.setCaseSensitivity(Qt::CaseInsensitive);
+    std::stable_sort(sources.begin(), sources.end(),
+                     [&](const sourceitem& a, const sourceitem& b) { return collator.compare(a.title, b.title) < 0; });
+    QComboBox* sourcecom = panel_[1]->sourcecom;
+    const QSignalBlocker block(sourcecom);
+    sourcecom->clear();
+    for (const sourceitem& s : sources)
+        sourcecom->addItem(s.title, s.source);
+    sourcecom->setCurrentIndex(-1);
+    if (sourcemode_ == 0)
+        panel_[0]->sourceidlab->setText(QString::number(x.nextsourceid));
+}
+
+void censusform::forgetsource()
+{
+    if (sourcemode_ == 1)
+        panel_[1]->sourceidlab->clear();
+}
+
+double censusform::divider() const
+{
+    return panel()->divider();
+}
+
+void censusform::setdivider(double share)
+{
+    for (entrypanel* p : panel_)
+        p->setdivider(share);
+}
+
+QString censusform::censusdate() const
+{
+    return panel()->fixeddatetxt->text();
+}
+
+QString censusform::censusyear() const
+{
+    return panel()->yearcom->currentText().trimmed();
+}
+
+void censusform::setautotext(bool enabled)
+{
+    Autosourcebut_->setEnabled(enabled);
+}
+
+void censusform::focusyear()
+{
+    panel()->yearcom->setFocus();
+}
+
+void censusform::focustext()
+{
+    panel()->texttxt->setFocus();
+}
+
+void censusform::clearentry()
+{
+    household_->clear();
+    for (entrypanel* p : panel_)
+        p->clearfields(p->mode == 0 && file_.currentsettings().fullentry);
+}
+
+void censusform::fillyears()
+{
+    entrypanel* p = panel();
+    p->fixeddatetxt->clear();
+    p->fixeddatetxt->setEnabled(false);
+    const QSignalBlocker block(p->yearcom);
+    p->yearcom->clear();
+    p->CensusYearLab->setText(censusyearcaption(file_.currentsettings().country));
+    p->yearcom->addItems(qm::fillyears(file_.currentsettings().country));
+    p->yearcom->setCurrentIndex(-1);
+}
+
+void censusform::yearchosen(entrypanel* p, int item)
+{
+    if (item < 0 || p != panel())
+        return;
+    const settings& s = file_.currentsettings();
+    censuschoice c;
+    c.yeartext = p->yearcom->currentText().trimmed();
+    c.country = s.country;
+    c.autoreference = s.autoreference;
+    c.fullentry = s.fullentry;
+    QLineEdit* ref = s.fullentry ? p->referencetxt : p->wherewithinsourcetxt;
+    c.referencetext = ref ? ref->text() : QString();
+    c.lastrefprefix = lastrefprefix_;
+    const censusfound f = findcensus(c);
+    if (!f.error.isEmpty())
+        prompts_.tell(f.error);
+    if (f.setreference && ref) {
+        ref->setText(f.referencetext);
+        ref->setCursorPosition(f.cursor);
+    }
+    lastrefprefix_ = f.lastrefprefix;
+    p->fixeddatetxt->setText(f.date);
+    p->fixeddatetxt->setEnabled(true);
+    datechanged();
+    household_->yearchosen();
+    p->locationtxt->setFocus();
+}
+
+void censusform::refreshtitle()
+{
+    entrypanel* p = panel_[0];
+    if (sourcemode_ != 0)
+        return;
+    const settings& s = file_.currentsettings();
+    p->titletxt->setText(maketitle(s.title, p->yearcom->currentText().trimmed(), p->fixeddatetxt->text(),
+                                   p->locationtxt->text(), p->addresstxt->text(), p->othertxt->text(),
+                                   p->referencetxt->text().trimmed(), s.country));
+    p->titletxt->setCursorPosition(0);
+}
+
+void censusform::datechanged()
+{
+    if (sourcemode_ == 0)
+        refreshtitle();
+    household_->datechanged();
+}
+
+bool censusform::censusdateok(bool normalise)
+{
+    entrypanel* p = panel();
+    const censusdef* def = lookupcensus(file_.currentsettings().country,
+                                        p->yearcom->currentIndex() >= 0 ? p->yearcom->currentText().toInt() : -1);
+    const datecheck d = validdate(p->fixeddatetxt->text(), def ? def->date : QString());
+    if (d.isdate && normalise && d.newtext)
+        p->fixeddatetxt->setText(*d.newtext);
+    return d.isdate;
+}
+
+bool censusform::eventFilter(QObject* watched, QEvent* event)
+{
+    if (event->type() == QEvent::FocusOut && watched == panel()->fixeddatetxt)
+        censusdateok(true);
+    return QObject::eventFilter(watched, event);
+}
+
+void censusform::sourcechosen(int item)
 {
     entrypanel* p = panel_[1];
     if (item < 0 || sourcemode_ != 1 || !file_.index())
@@ -84,80 +273,59 @@ void mainfrm::sourcechosen(int item)
     p->locationtxt->setFocus();
 }
 
-void mainfrm::edittext(int mode)
+void censusform::edittext(int mode)
 {
     entrypanel* p = panel();
     QPlainTextEdit* box = mode == sourcetextfrm::sourcetext ? p->texttxt : p->notetxt;
-    if (const std::optional<QString> text = sourcetextfrm::edit(mode, box->toPlainText(), this))
+    if (const std::optional<QString> text = sourcetextfrm::edit(mode, box->toPlainText(), parent_->window()))
         box->setPlainText(withlf(*text));
 }
 
-void mainfrm::dividermoved(double share)
+void censusform::dividermoved(entrypanel* from, double share)
 {
-    divider_ = share;
     for (entrypanel* p : panel_)
-        if (p != sender())
+        if (p != from)
             p->setdivider(share);
 }
 
-std::vector<selectionrec> mainfrm::currentselection() const
-{
-    std::vector<selectionrec> out(rows_.selection.begin(),
-                                  rows_.selection.begin() + std::min<size_t>(rows_.selection.size(),
-                                                                             static_cast<size_t>(rows_.selectioncount)));
-    if (!file_.index())
-        return out;
-    // Details given before the row was deleted and chosen again still count.
-    for (selectionrec& r : out) {
-        if (r.birthedited || r.personindex < 0 || static_cast<size_t>(r.personindex) >= file_.index()->people.size())
-            continue;
-        const personrec& person = file_.index()->people[static_cast<size_t>(r.personindex)];
-        if (person.id == r.id && person.birthedited) {
-            r.birthedited = true;
-            r.birthdate = qs(person.birthdate);
-            r.birthplace = qs(person.birthplace);
-        }
-    }
-    return out;
-}
-
-void mainfrm::askbirthdetails(const QString& entrydate)
+void censusform::askbirthdetails(const QString& entrydate)
 {
     if (!file_.index())
         return;
-    const std::vector<selectionrec> current = currentselection();
+    gedcomindex& x = *file_.index();
+    const std::vector<selectionrec> current = household_->currentselection();
     for (size_t i = 0; i < current.size(); ++i) {
-        selectionrec& row = rows_.selection[i];
+        selectionrec& row = household_->rows().selection[i];
         row = current[i];
-        switch (checkbirth(row, *file_.index())) {
+        switch (checkbirth(row, x)) {
         case birthcheck::none:
             break;
         case birthcheck::idmismatch:
             prompts_.tell(idmismatchmessage());
             break;
         case birthcheck::ask: {
-            const std::optional<birthdetails> d = birthfrm::ask(row, entrydate, file_.index()->places, prompts_, this,
-                                                                [this] { prompts_.showhelp(30); });
+            const std::optional<birthdetails> d =
+                birthfrm::ask(row, entrydate, x.places, prompts_, parent_->window(), [this] { prompts_.showhelp(30); });
             if (!d)
                 break;
             d->applyto(row);
             // Kept with the individual until the file is read again, so that
             // the individual is not asked twice.
-            personrec& person = file_.index()->people[static_cast<size_t>(row.personindex)];
+            personrec& person = x.people[static_cast<size_t>(row.personindex)];
             person.birthedited = true;
-            person.birthdate = file_.index()->arena.store(u8(d->birthdate));
-            person.birthplace = file_.index()->arena.store(u8(d->birthplace));
+            person.birthdate = x.arena.store(u8(d->birthdate));
+            person.birthplace = x.arena.store(u8(d->birthplace));
             if (!d->birthplace.isEmpty())
-                insertplace(*file_.index(), u8(d->birthplace));
+                insertplace(x, u8(d->birthplace));
             break;
         }
         }
     }
 }
 
-void mainfrm::autotextclicked()
+void censusform::autotextclicked()
 {
-    if (!file_.index() || !checkages())
+    if (!file_.index() || !household_->checkages())
         return;
     entrypanel* p = panel();
     const QString censusdate = p->fixeddatetxt->text();
@@ -167,15 +335,15 @@ void mainfrm::autotextclicked()
             p->fixeddatetxt->setFocus();
         return;
     }
-    if (rows_.selectioncount < 1)
+    if (household_->rows().selectioncount < 1)
         return;
-    storerows();
+    household_->storerows();
     askbirthdetails(censusdate);
-    p->texttxt->setPlainText(
-        withlf(autotext(currentselection(), *file_.index(), censusdate, file_.currentsettings().country, file_.currentsettings())));
+    p->texttxt->setPlainText(withlf(autotext(household_->currentselection(), *file_.index(), censusdate,
+                                             file_.currentsettings().country, file_.currentsettings())));
 }
 
-entryform mainfrm::currentform() const
+entryform censusform::currentform() const
 {
     const entrypanel* p = panel();
     entryform f;
@@ -199,19 +367,19 @@ entryform mainfrm::currentform() const
     f.sourceid = p->sourceidlab->text();
     f.sourcetext = withcrlf(p->texttxt->toPlainText());
     f.notetext = withcrlf(p->notetxt->toPlainText());
-    f.selection = currentselection();
+    f.selection = household_->currentselection();
     return f;
 }
 
-censusentry mainfrm::gatherentry(const entryform& form, const QString& entrydate) const
+censusentry censusform::gatherentry(const entryform& form, const QString& entrydate) const
 {
     // The rows as they are now: birth details asked during the save are in them.
     censusentry e = entryfromform(form, entrydate);
-    e.selection = currentselection();
+    e.selection = household_->currentselection();
     return e;
 }
 
-bool mainfrm::checkform(entryform& form, QString& entrydate)
+bool censusform::checkform(entryform& form, QString& entrydate)
 {
     entrypanel* p = panel();
     const entrycheck check = validateentry(form, file_.currentsettings(), &prompts_);
@@ -249,19 +417,19 @@ bool mainfrm::checkform(entryform& form, QString& entrydate)
     return true;
 }
 
-void mainfrm::previewentry()
+void censusform::previewentry()
 {
-    if (!file_.index() || saving_ || !checkages())
+    if (!file_.index() || saving_ || !household_->checkages())
         return;
-    storerows();
+    household_->storerows();
     entryform form = currentform();
     QString entrydate;
-    if (checkform(form, entrydate) &&
-        !showentrypreview(*file_.index(), file_.currentsettings(), gatherentry(form, entrydate), prompts_, this))
-        reload();
+    if (checkform(form, entrydate) && !showentrypreview(*file_.index(), file_.currentsettings(),
+                                                        gatherentry(form, entrydate), prompts_, parent_->window()))
+        household_->reload();
 }
 
-void mainfrm::saveentry()
+void censusform::saveentry()
 {
     // Pending clicks are let through below: a second click on Save must not
     // start a second save of the same entry.
@@ -272,9 +440,9 @@ void mainfrm::saveentry()
         bool& flag;
         ~done() { flag = false; }
     } guard{saving_};
-    if (!checkages())
+    if (!household_->checkages())
         return;
-    storerows();
+    household_->storerows();
     QApplication::processEvents();
 
     entryform form = currentform();
@@ -288,19 +456,13 @@ void mainfrm::saveentry()
             findings = householdcheck(*file_.index(), file_.currentsettings(), gatherentry(form, entrydate));
         }
         // "Go back": the row of the finding is shown and its age box takes the focus.
-        if (const std::optional<int> back = householdcheckfrm::ask(findings, this)) {
-            if (*back < rows_.toprow || *back >= rows_.toprow + householdrows::visible) {
-                rows_.toprow = std::max(0, *back - householdrows::visible + 1);
-                showrows(rows_.toprow);
-            }
-            QLineEdit* age = household_->rows->agebox(*back - rows_.toprow);
-            age->setFocus();
-            age->selectAll();
+        if (const std::optional<int> back = householdcheckfrm::ask(findings, parent_->window())) {
+            household_->focusage(*back);
             return;
         }
     }
 
-    repaint();
+    parent_->window()->repaint();
     // The place typed is offered by the place completion from now on.
     insertplace(*file_.index(), u8(form.place.trimmed()));
     std::optional<pausewatch> paused;
@@ -311,15 +473,15 @@ void mainfrm::saveentry()
 
     std::vector<imagechoice> chosenimages;
     if (form.fullentry ? file_.currentsettings().requestimage : file_.currentsettings().requestimages2) {
-        if (!chooseentryimages(chosenimages))
+        if (chooseimages && !chooseimages(chosenimages))
             return;
     }
 
     busycursor busy(prompts_);
-    repaint();
+    parent_->window()->repaint();
     if (file_.changed()) {
         prompts_.tell(changedonsavemessage(file_.index()->gedcomfile, !chosenimages.empty()));
-        reload();
+        household_->reload();
         return;
     }
     paused.reset();
@@ -335,12 +497,12 @@ void mainfrm::saveentry()
         break;
     case aftersave::changed:
         prompts_.tell(out.message);
-        reload();
+        household_->reload();
         return;
     case aftersave::stay:
         return;
     case aftersave::fatal:
-        endprogram();
+        emit fatal();
         return;
     }
 
@@ -348,28 +510,19 @@ void mainfrm::saveentry()
         const pausewatch reading = file_.pause();
         file_.reload();
         clearentry();
-        household_->allpeoplelst->clearSelection();
+        household_->clearchoices();
     }
     raisecount();
-    milestone();
+    emit saved();
     panel()->yearcom->setFocus();
 }
 
-void mainfrm::raisecount()
+void censusform::raisecount()
 {
-    ++file_.currentsettings().count;
-    file_.store().write(QStringLiteral("Count"), QString::number(file_.currentsettings().count));
+    settings& s = file_.currentsettings();
+    ++s.count;
+    file_.store().write(QStringLiteral("Count"), QString::number(s.count));
     file_.store().sync();
-}
-
-void mainfrm::endprogram()
-{
-    ending_ = true;
-    idle_.emplace(file_);
-    close();
-    // Only a running event loop can be left (tests drive the window without one).
-    if (QThread::currentThread()->loopLevel() > 0)
-        QCoreApplication::exit(1);
 }
 
 } // namespace qm

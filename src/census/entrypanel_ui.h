@@ -1,8 +1,8 @@
 #pragma once
 // One of the two panels of the census entry form: panel 0 makes a new census
 // source with each entry, panel 1 cites an existing census source. The
-// controls carry their program names; the main window reaches them through
-// the members.
+// controls carry their program names; the entry form (entryform_ui.h)
+// reaches them through the members.
 
 #include <QWidget>
 

@@ -1,87 +1,159 @@
-// The main window's household: the people and family lists, choosing
-// individuals into the census rows, the rows themselves, and the reload that
-// keeps them.
-#include "app/mainfrm.h"
+#include "census/household_ui.h"
 
-#include "census/entrypanel_ui.h"
+#include "census/entryform_ui.h"
 #include "census/householdpanel_ui.h"
 #include "model/dates.h"
 #include "model/filechanged.h"
 #include "model/loadgedcom.h"
 #include "platform/encoding.h"
+#include "platform/formparts_ui.h"
 #include "platform/prompts.h"
+#include "writer/openfile.h"
 
-#include <QApplication>
 #include <QCheckBox>
-#include <QComboBox>
-#include <QFileInfo>
+#include <QFrame>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListView>
-#include <QPlainTextEdit>
 #include <QPushButton>
+
+#include <algorithm>
 
 namespace qm {
 
-void mainfrm::pullrows()
+householdform::householdform(openfile& file, prompts& p, censusform& form, QWidget* parent)
+    : QObject(parent), file_(file), prompts_(p), form_(form)
 {
-    rows_.rows = household_->rows->values();
+    findbut_ = new QPushButton(QStringLiteral("Find..."), parent);
+    findbut_->setObjectName(QStringLiteral("findbut"));
+    findbut_->setToolTip(
+        QStringLiteral("Click to find individuals by searching for name or browsing through relationships."));
+    connect(findbut_, &QPushButton::clicked, this, &householdform::findclicked);
+
+    infolab_ = showsvalue(new QLabel(parent), QStringLiteral("infolab"), QStringLiteral("Information"));
+    infolab_->setWordWrap(true);
+    infolab_->setTextFormat(Qt::PlainText);
+    infolab_->setFrameShape(QFrame::StyledPanel);
+    infolab_->setMinimumHeight(infolab_->fontMetrics().lineSpacing() * 2 + 6);
+    infolab_->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Fixed);
+
+    panel_ = new householdpanel(parent);
+    connect(panel_->allpeoplechk, &QCheckBox::clicked, this, &householdform::showallclicked);
+    connect(panel_, &householdpanel::personchosen, this, &householdform::peopleclicked);
+    connect(panel_, &householdpanel::familychosen, this, &householdform::familyclicked);
+    censusrowsview* rows = panel_->rows;
+    connect(rows, &censusrowsview::deleterequested, this, &householdform::deleterow);
+    connect(rows, &censusrowsview::inforequested, this, &householdform::inforow);
+    connect(rows, &censusrowsview::uprequested, this, &householdform::scrollup);
+    connect(rows, &censusrowsview::downrequested, this, &householdform::scrolldown);
+    file_.onread([this] { afterread(); });
 }
 
-void mainfrm::pushrows()
+void householdform::refill()
 {
-    household_->rows->show(rows_);
+    const gedcomindex& x = *file_.index();
+    panel_->family->clear();
+    panel_->people->clear();
+    QCheckBox* all = panel_->allpeoplechk;
+    if (peoplelistshown(x)) {
+        busycursor busy(prompts_);
+        const bool idonly = file_.currentsettings().idonly;
+        panel_->people->setpeople(file_.index(), sortedpeople(x, idonly), idonly);
+        panel_->showpeoplelist(true);
+        all->setChecked(true);
+        all->setEnabled(false);
+        findbut_->setEnabled(true);
+    } else {
+        panel_->showpeoplelist(false);
+        findbut_->setEnabled(false);
+        all->setChecked(false);
+        all->setEnabled(false);
+    }
 }
 
-void mainfrm::fillallpeople()
+void householdform::pullrows()
+{
+    rows_.rows = panel_->rows->values();
+}
+
+void householdform::pushrows()
+{
+    panel_->rows->show(rows_);
+}
+
+void householdform::fillallpeople()
 {
     busycursor busy(prompts_);
-    if (file_.index())
-        household_->people->setpeople(file_.index(), sortedpeople(*file_.index(), file_.currentsettings().idonly), file_.currentsettings().idonly);
-    household_->setpeoplecaption(QStringLiteral("All Individuals:"));
+    if (file_.index()) {
+        const bool idonly = file_.currentsettings().idonly;
+        panel_->people->setpeople(file_.index(), sortedpeople(*file_.index(), idonly), idonly);
+    }
+    panel_->setpeoplecaption(QStringLiteral("All Individuals:"));
 }
 
-void mainfrm::fillalivepeople()
+void householdform::fillalivepeople()
 {
     if (!file_.index())
         return;
     busycursor busy(prompts_);
-    entrypanel* p = panel();
-    const std::optional<QDate> day = recognisedate(p->fixeddatetxt->text());
+    const std::optional<QDate> day = recognisedate(form_.censusdate());
     if (!day)
         return;
+    const bool idonly = file_.currentsettings().idonly;
     const alivelist alive = couldbealive(*file_.index(), *day, localedateorder());
-    household_->people->setpeople(file_.index(), sortbylabel(*file_.index(), alive.people, file_.currentsettings().idonly),
-                                  file_.currentsettings().idonly);
-    household_->setpeoplecaption(QStringLiteral("Individuals in ") + p->yearcom->currentText().trimmed() +
-                                 QLatin1Char(':'));
+    panel_->people->setpeople(file_.index(), sortbylabel(*file_.index(), alive.people, idonly), idonly);
+    panel_->setpeoplecaption(QStringLiteral("Individuals in ") + form_.censusyear() + QLatin1Char(':'));
     if (alive.toomany)
         prompts_.tell(QStringLiteral("There are too many people to display them all in the list."));
     else
         findbut_->setEnabled(true);
-    household_->showpeoplelist(true);
+    panel_->showpeoplelist(true);
 }
 
-void mainfrm::fillfamily(int32_t k)
+void householdform::fillfamily(int32_t k)
 {
     if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size())
         return;
     busycursor busy(prompts_);
-    household_->family->setentries(immediatefamily(*file_.index(), k, file_.currentsettings().idonly));
-    household_->setfamilycaption(QStringLiteral("Immediate Family of ") +
-                                 qs(file_.index()->people[static_cast<size_t>(k)].name) + QLatin1Char(':'));
+    panel_->family->setentries(immediatefamily(*file_.index(), k, file_.currentsettings().idonly));
+    panel_->setfamilycaption(QStringLiteral("Immediate Family of ") +
+                             qs(file_.index()->people[static_cast<size_t>(k)].name) + QLatin1Char(':'));
 }
 
-void mainfrm::showallclicked()
+void householdform::yearchosen()
 {
-    QCheckBox* all = household_->allpeoplechk;
+    if (file_.index() && peoplelistshown(*file_.index())) {
+        QCheckBox* all = panel_->allpeoplechk;
+        all->setEnabled(true);
+        const bool was = all->isChecked();
+        all->setChecked(true);
+        panel_->setpeoplecaption(QStringLiteral("All Individuals:"));
+        if (!was)
+            fillallpeople();
+    } else {
+        fillalivepeople();
+    }
+}
+
+void householdform::datechanged()
+{
+    // The age of the individual chosen last, who may be hidden below the rows.
+    if (rows_.selectioncount > 0 && recognisedate(form_.censusdate())) {
+        storerows();
+        showpersoninfo(rows_.selection[static_cast<size_t>(rows_.selectioncount - 1)].personindex);
+    }
+}
+
+void householdform::showallclicked()
+{
+    QCheckBox* all = panel_->allpeoplechk;
     if (!all->isEnabled())
         return;
     if (all->isChecked()) {
         fillallpeople();
         return;
     }
-    if (!censusdateok(true)) {
+    if (!form_.censusdateok(true)) {
         prompts_.tell(QStringLiteral("The current census date is not valid. This must be corrected first."));
         // The list still holds everyone: the box says so too.
         all->setChecked(true);
@@ -90,7 +162,7 @@ void mainfrm::showallclicked()
     fillalivepeople();
 }
 
-void mainfrm::peopleclicked(int row)
+void householdform::peopleclicked(int row)
 {
     int32_t k = -1;
     if (reloading_ && rows_.selectioncount > 0)
@@ -98,7 +170,7 @@ void mainfrm::peopleclicked(int row)
     else if (findresult_ != -1)
         k = findresult_;
     else
-        k = household_->people->personat(row);
+        k = panel_->people->personat(row);
     if (k < 0)
         return;
     if (rows_.selectioncount == 0 || reloading_ || fromfind_)
@@ -107,37 +179,67 @@ void mainfrm::peopleclicked(int row)
         selectperson(k);
 }
 
-void mainfrm::familyclicked(int row)
+void householdform::familyclicked(int row)
 {
-    const int32_t k = household_->family->personat(row);
+    const int32_t k = panel_->family->personat(row);
     if (k >= 0)
         selectperson(k);
 }
 
-bool mainfrm::checkages()
+bool householdform::checkages()
 {
     pullrows();
     const int r = rows_.checkages();
     if (r < 0)
         return true;
     prompts_.tell(QStringLiteral("You must first enter an age for this individual"));
-    household_->rows->agebox(r)->setFocus();
+    panel_->rows->agebox(r)->setFocus();
     return false;
 }
 
-void mainfrm::storerows()
+void householdform::storerows()
 {
     pullrows();
     rows_.storerows();
 }
 
-void mainfrm::showrows(int t)
+std::vector<selectionrec> householdform::currentselection() const
+{
+    std::vector<selectionrec> out(rows_.selection.begin(),
+                                  rows_.selection.begin() + std::min<size_t>(rows_.selection.size(),
+                                                                             static_cast<size_t>(rows_.selectioncount)));
+    if (!file_.index())
+        return out;
+    // Details given before the row was deleted and chosen again still count.
+    for (selectionrec& r : out) {
+        if (r.birthedited || r.personindex < 0 || static_cast<size_t>(r.personindex) >= file_.index()->people.size())
+            continue;
+        const personrec& person = file_.index()->people[static_cast<size_t>(r.personindex)];
+        if (person.id == r.id && person.birthedited) {
+            r.birthedited = true;
+            r.birthdate = qs(person.birthdate);
+            r.birthplace = qs(person.birthplace);
+        }
+    }
+    return out;
+}
+
+void householdform::showrows(int t)
 {
     rows_.showrows(t);
     pushrows();
 }
 
-void mainfrm::selectperson(int32_t k)
+void householdform::focusage(int r)
+{
+    if (r < rows_.toprow || r >= rows_.toprow + householdrows::visible)
+        showrows(std::max(0, r - householdrows::visible + 1));
+    QLineEdit* age = panel_->rows->agebox(r - rows_.toprow);
+    age->setFocus();
+    age->selectAll();
+}
+
+void householdform::selectperson(int32_t k)
 {
     if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size())
         return;
@@ -149,7 +251,7 @@ void mainfrm::selectperson(int32_t k)
         prompts_.tell(QStringLiteral("This individual has already been selected"));
         return;
     }
-    const QString censustext = panel()->fixeddatetxt->text();
+    const QString censustext = form_.censusdate();
     const std::optional<QDate> censusday = recognisedate(censustext);
     for (const censusrec& c : person.census) {
         const std::optional<QDate> day = recognisedate(qs(c.date));
@@ -162,18 +264,18 @@ void mainfrm::selectperson(int32_t k)
         q += QStringLiteral(". Are you sure you want to select this individual?");
         if (!prompts_.yes(q, icon::exclamation, answer::yes)) {
             if (rows_.selectioncount == 0)
-                household_->family->clear();
+                panel_->family->clear();
             return;
         }
     }
     const int r = rows_.add(person, k);
     pushrows();
-    household_->rows->agebox(r)->setFocus();
-    Autosourcebut_->setEnabled(true);
+    panel_->rows->agebox(r)->setFocus();
+    form_.setautotext(true);
     showpersoninfo(k);
 }
 
-void mainfrm::scrollup()
+void householdform::scrollup()
 {
     if (!checkages())
         return;
@@ -182,7 +284,7 @@ void mainfrm::scrollup()
     pushrows();
 }
 
-void mainfrm::scrolldown()
+void householdform::scrolldown()
 {
     if (!checkages())
         return;
@@ -191,23 +293,23 @@ void mainfrm::scrolldown()
     pushrows();
 }
 
-void mainfrm::deleterow(int r)
+void householdform::deleterow(int r)
 {
     pullrows();
     const int32_t last = rows_.deleterow(r);
     pushrows();
     if (rows_.selectioncount == 0) {
-        household_->allpeoplelst->clearSelection();
+        panel_->allpeoplelst->clearSelection();
         infolab_->clear();
-        household_->family->clear();
-        household_->setfamilycaption(QStringLiteral("Immediate Family:"));
-        Autosourcebut_->setEnabled(false);
+        panel_->family->clear();
+        panel_->setfamilycaption(QStringLiteral("Immediate Family:"));
+        form_.setautotext(false);
         return;
     }
     showpersoninfo(last);
 }
 
-void mainfrm::inforow(int r)
+void householdform::inforow(int r)
 {
     if (!file_.index())
         return;
@@ -221,29 +323,41 @@ void mainfrm::inforow(int r)
     }
 }
 
-void mainfrm::showpersoninfo(int32_t k)
+void householdform::showpersoninfo(int32_t k)
 {
     if (!file_.index() || k < 0 || static_cast<size_t>(k) >= file_.index()->people.size()) {
         infolab_->clear();
         return;
     }
-    infolab_->setText(personinfo(file_.index()->people[static_cast<size_t>(k)], panel()->fixeddatetxt->text()));
+    infolab_->setText(personinfo(file_.index()->people[static_cast<size_t>(k)], form_.censusdate()));
 }
 
-void mainfrm::clearentry()
+void householdform::clear()
 {
     rows_.clear();
     findresult_ = -1;
     pushrows();
-    for (entrypanel* p : panel_)
-        p->clearfields(p->mode == 0 && file_.currentsettings().fullentry);
     infolab_->clear();
-    household_->setpeoplecaption(QStringLiteral("All Individuals"));
-    Autosourcebut_->setEnabled(false);
-    household_->setfamilycaption(QStringLiteral("Immediate Family:"));
+    panel_->setpeoplecaption(QStringLiteral("All Individuals"));
+    form_.setautotext(false);
+    panel_->setfamilycaption(QStringLiteral("Immediate Family:"));
 }
 
-void mainfrm::findclicked()
+void householdform::clearchoices()
+{
+    panel_->allpeoplelst->clearSelection();
+}
+
+void householdform::showfound(int32_t k)
+{
+    findresult_ = k;
+    fromfind_ = true;
+    peopleclicked(-1);
+    findresult_ = -1;
+    fromfind_ = false;
+}
+
+void householdform::findclicked()
 {
     if (!checkages())
         return;
@@ -257,14 +371,14 @@ void mainfrm::findclicked()
     {
         const pausewatch paused = file_.pause();
         fromfind_ = false;
-        const int32_t chosen = runfind(findresult_);
+        const int32_t chosen = find && file_.index() ? find(findresult_, fromfind_) : -1;
         // The file may have changed while Find was open: it is looked at now, and
         // the individual chosen found again by record number after a reload (not
         // in another file opened instead of one that has gone).
         chosenid = chosen >= 0 ? file_.index()->people[static_cast<size_t>(chosen)].id : -1;
     }
     const QString file = file_.path();
-    checkonactivate();
+    emit filecheck();
     findresult_ = -1;
     for (size_t k = 0; chosenid >= 0 && file_.path() == file && k < file_.index()->people.size() && findresult_ < 0; ++k)
         if (file_.index()->people[k].id == chosenid)
@@ -275,50 +389,33 @@ void mainfrm::findclicked()
     findresult_ = -1;
 }
 
-void mainfrm::checkonactivate()
-{
-    if (!file_.index() || file_.index()->people.empty() || checking_ || !file_.watching())
-        return;
-    checking_ = true;
-    repaint();
-    QApplication::processEvents();
-    const QString path = file_.index()->gedcomfile;
-    if (file_.missing()) {
-        // Reloading could only fail: the user is told once, and may open another file.
-        const bool told = gonetold_ == path;
-        gonetold_ = path;
-        checking_ = false;
-        if (!told && prompts_.yes(filegonequestion(path), icon::exclamation))
-            openfamilyfile(QStringLiteral("-1"));
-        return;
-    }
-    gonetold_.clear();
-    if (file_.changed()) {
-        prompts_.tell(changedmessage(path));
-        checking_ = false;
-        reload();
-        return;
-    }
-    checking_ = false;
-}
-
-void mainfrm::reload()
+void householdform::reload()
 {
     reloading_ = true;
     storerows();
     file_.reload();
-    if (censusdateok(false)) {
+    reloading_ = false;
+}
+
+void householdform::afterread()
+{
+    refill();
+    if (reloading_)
+        keepchoices();
+}
+
+void householdform::keepchoices()
+{
+    if (form_.censusdateok(false)) {
         if (file_.index() && peoplelistshown(*file_.index()))
-            household_->allpeoplechk->setEnabled(true);
+            panel_->allpeoplechk->setEnabled(true);
         else
             fillalivepeople();
     }
-    if (sourcemode_ == 1)
-        panel_[1]->sourceidlab->clear();
-    if (rows_.selectioncount == 0) {
-        reloading_ = false;
+    form_.forgetsource();
+    if (rows_.selectioncount == 0)
         return;
-    }
+    // The individuals chosen are found again by record number.
     for (selectionrec& s : rows_.selection)
         s.found = false;
     for (size_t k = 0; k < file_.index()->people.size(); ++k) {
@@ -342,13 +439,12 @@ void mainfrm::reload()
                                      "corruption."));
         rows_.clear();
         pushrows();
-        Autosourcebut_->setEnabled(false);
-        panel()->texttxt->setFocus();
+        form_.setautotext(false);
+        form_.focustext();
     } else {
         peopleclicked(-1);
         showrows(rows_.toprow);
     }
-    reloading_ = false;
 }
 
 } // namespace qm

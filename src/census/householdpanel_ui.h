@@ -1,7 +1,7 @@
 #pragma once
 // The lower half of the main window: the people list with its caption and
 // "Show All", the immediate family list, and the ten census rows. Controls
-// only; the main window fills them and handles their clicks.
+// only; the household (household_ui.h) fills them and handles their clicks.
 
 #include "census/censusrows_ui.h"
 #include "census/peoplelist_ui.h"

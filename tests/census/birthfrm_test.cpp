@@ -8,7 +8,6 @@
 #include <QLineEdit>
 #include <QPushButton>
 #include <QSignalSpy>
-#include <QTimer>
 #include <QtTest>
 
 using namespace qm;
@@ -41,6 +40,8 @@ class birthfrmtest : public QObject {
     Q_OBJECT
 
 private slots:
+    // The captions of the three units; the dates themselves are the
+    // calculation's (birthdate_test).
     void calculateddates_data()
     {
         QTest::addColumn<QString>("entrydate");
@@ -49,12 +50,8 @@ private slots:
         QTest::addColumn<QString>("agelab");
         QTest::addColumn<QString>("doblab");
         QTest::newRow("45 years") << "30 MAR 1851" << "45" << QChar(u'Y') << "45" << "1806";
-        QTest::newRow("0 years") << "30 MAR 1851" << "0" << QChar(u'Y') << "0" << "1851";
         QTest::newRow("3 months") << "7 APR 1861" << "3" << QChar(u'M') << "3 months" << "JAN 1861";
-        QTest::newRow("15 months") << "7 APR 1861" << "15" << QChar(u'M') << "15 months" << "JAN 1860";
-        QTest::newRow("6 months") << "30 MAR 1851" << "6" << QChar(u'M') << "6 months" << "SEP 1850";
         QTest::newRow("10 days") << "2 APR 1871" << "10" << QChar(u'D') << "10 days" << "23 MAR 1871";
-        QTest::newRow("45 days") << "30 MAR 1851" << "45" << QChar(u'D') << "45 days" << "13 FEB 1851";
     }
 
     void calculateddates()
@@ -179,28 +176,6 @@ private slots:
         typed(QStringLiteral("leeds, yorkshire"), "Leeds, Yorkshire", "");
         QTest::mouseClick(child<QPushButton>(d, "okbut"), Qt::LeftButton);
         QCOMPARE(d.details()->birthplace, QStringLiteral("Leeds, Yorkshire"));
-    }
-
-    void modalaskandcancel()
-    {
-        scriptedprompts asker;
-        std::optional<birthdetails> got;
-        for (const char* button : {"cancelbut", "okbut"}) {
-            bool done = false;
-            QTimer::singleShot(0, [&] {
-                auto* d = qobject_cast<birthfrm*>(QApplication::activeModalWidget());
-                QVERIFY(d);
-                QTest::keyClicks(child<QLineEdit>(*d, "birthplacetxt"), QStringLiteral("Wigan"));
-                QTest::mouseClick(child<QPushButton>(*d, button), Qt::LeftButton);
-                done = true;
-            });
-            got = birthfrm::ask(row(QStringLiteral("6"), u'M'), QStringLiteral("30 MAR 1851"), places, asker, nullptr);
-            QVERIFY(done);
-            QCOMPARE(bool(got), button == std::string_view("okbut"));
-        }
-        QCOMPARE(got->birthdate, QStringLiteral("SEP 1850"));
-        QCOMPARE(got->birthplace, QStringLiteral("Wigan"));
-        QCOMPARE(asker.unexpected(), 0);
     }
 };
 
