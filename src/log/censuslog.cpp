@@ -1,6 +1,7 @@
 #include "log/censuslog.h"
 
 #include "platform/clock.h"
+#include "platform/paths.h"
 #include "settings/settings.h"
 
 #include <QDir>
@@ -57,15 +58,6 @@ QString canonicalpath(const QString& path)
         return file;
     const QString folder = QFileInfo(info.absolutePath()).canonicalFilePath();
     return folder.isEmpty() ? info.absoluteFilePath() : QDir(folder).filePath(info.fileName());
-}
-
-bool samepath(const QString& a, const QString& b)
-{
-#ifdef Q_OS_WIN
-    return a.compare(b, Qt::CaseInsensitive) == 0;
-#else
-    return a == b;
-#endif
 }
 
 void modeonelines(const settings& s, const logentry& e, QStringList& out)
@@ -179,7 +171,7 @@ QString refuselogpath(const QString& logpath, const QString& familyfile, const Q
 {
     const QString log = canonicalpath(logpath.trimmed());
     const QString shown = native(logpath.trimmed());
-    if (!familyfile.isEmpty() && samepath(log, canonicalpath(familyfile)))
+    if (!familyfile.isEmpty() && samefilepath(log, canonicalpath(familyfile)))
         return QStringLiteral("The census log file %1 is the family file itself: Quillmark never writes its log into "
                               "a family file. Please choose another log file in the options.")
             .arg(shown);
@@ -188,7 +180,7 @@ QString refuselogpath(const QString& logpath, const QString& familyfile, const Q
                               "file. Please choose another log file (a .txt file) in the options.")
             .arg(shown);
     if (!backupfolder.trimmed().isEmpty()
-        && samepath(QFileInfo(log).absolutePath(), canonicalpath(backupfolder.trimmed())))
+        && samefilepath(QFileInfo(log).absolutePath(), canonicalpath(backupfolder.trimmed())))
         return QStringLiteral("The census log file %1 is in the backup folder, which holds only backups of family "
                               "files. Please choose a log file in another folder in the options.")
             .arg(shown);

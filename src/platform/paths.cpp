@@ -22,4 +22,13 @@ QString filenameof(const QString& path)
     return path.mid(lastseparator(path) + 1);
 }
 
+bool samefilepath(const QString& a, const QString& b)
+{
+#ifdef Q_OS_WIN
+    return a.compare(b, Qt::CaseInsensitive) == 0;
+#else
+    return a == b;
+#endif
+}
+
 } // namespace qm

@@ -13,4 +13,8 @@ QString folderof(const QString& path);
 // The file name of a path: the part after its last separator.
 QString filenameof(const QString& path);
 
+// Two full paths (already made canonical) name the same file: letter case
+// counts except on Windows, whose file names ignore it.
+bool samefilepath(const QString& a, const QString& b);
+
 } // namespace qm

@@ -4,6 +4,7 @@
 #include "model/gedcomindex.h"
 #include "platform/contenthash.h"
 #include "platform/familylock.h"
+#include "platform/paths.h"
 #include "platform/replacefile.h"
 #include "settings/settings.h"
 #include "writer/backups.h"
@@ -34,15 +35,6 @@ QString fullpath(const QString& path)
     const QFileInfo info(path);
     const QString canonical = info.canonicalFilePath();
     return canonical.isEmpty() ? info.absoluteFilePath() : canonical;
-}
-
-bool samepath(const QString& a, const QString& b)
-{
-#ifdef Q_OS_WIN
-    return a.compare(b, Qt::CaseInsensitive) == 0;
-#else
-    return a == b;
-#endif
 }
 
 QString notepath(const QString& familyfile, const QString& backupfolder)
@@ -98,11 +90,11 @@ QString writenote(const lastchange& c)
 // copy some other file over the family file).
 QString checknote(const lastchange& c, const QString& familyfile, const QString& backupfolder)
 {
-    if (!samepath(c.gedcomfile, fullpath(familyfile)))
+    if (!samefilepath(c.gedcomfile, fullpath(familyfile)))
         return QStringLiteral("it is the note of another file, %1").arg(native(c.gedcomfile));
     const QFileInfo backup(c.backuppath);
     if (c.mode < 1 || c.mode > 4 || !c.after.exists || !c.backupstamp.exists || !isbackupname(backup.fileName())
-        || !samepath(fullpath(backup.absolutePath()), fullpath(backupfolder.trimmed())))
+        || !samefilepath(fullpath(backup.absolutePath()), fullpath(backupfolder.trimmed())))
         return QStringLiteral("it does not hold what an undo needs");
     return QString();
 }
