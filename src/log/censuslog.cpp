@@ -49,17 +49,6 @@ QString appendlines(const settings& s, const QStringList& lines)
     return QString();
 }
 
-// Two paths name the same file (the log's file need not exist yet).
-QString canonicalpath(const QString& path)
-{
-    const QFileInfo info(path);
-    const QString file = info.canonicalFilePath();
-    if (!file.isEmpty())
-        return file;
-    const QString folder = QFileInfo(info.absolutePath()).canonicalFilePath();
-    return folder.isEmpty() ? info.absoluteFilePath() : QDir(folder).filePath(info.fileName());
-}
-
 void modeonelines(const settings& s, const logentry& e, QStringList& out)
 {
     out << QStringLiteral("Census entry added: ") + timestamp();

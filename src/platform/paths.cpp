@@ -1,5 +1,8 @@
 #include "platform/paths.h"
 
+#include <QDir>
+#include <QFileInfo>
+
 #include <algorithm>
 
 namespace qm {
@@ -20,6 +23,16 @@ QString folderof(const QString& path)
 QString filenameof(const QString& path)
 {
     return path.mid(lastseparator(path) + 1);
+}
+
+QString canonicalpath(const QString& path)
+{
+    const QFileInfo info(path);
+    const QString file = info.canonicalFilePath();
+    if (!file.isEmpty())
+        return file;
+    const QString folder = QFileInfo(info.absolutePath()).canonicalFilePath();
+    return folder.isEmpty() ? info.absoluteFilePath() : QDir(folder).filePath(info.fileName());
 }
 
 bool samefilepath(const QString& a, const QString& b)

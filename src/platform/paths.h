@@ -1,7 +1,7 @@
 #pragma once
-// The parts of a file path written with either separator ("/" or "\\"): the
+// File paths: their parts written with either separator ("/" or "\\"; the
 // settings keep Windows paths, and a family file moved between systems may
-// carry either.
+// carry either), and the one full path that every name of a file shares.
 
 #include <QString>
 
@@ -13,6 +13,10 @@ QString folderof(const QString& path);
 // The file name of a path: the part after its last separator.
 QString filenameof(const QString& path);
 
+// The full path of a file through any symbolic links, also when the file
+// does not exist yet (its folder's canonical path and its name): two names of
+// one file give one path.
+QString canonicalpath(const QString& path);
 // Two full paths (already made canonical) name the same file: letter case
 // counts except on Windows, whose file names ignore it.
 bool samefilepath(const QString& a, const QString& b);

@@ -28,18 +28,10 @@ QString native(const QString& path)
     return QDir::toNativeSeparators(path);
 }
 
-// The family file's full path, through any symbolic links: every name of the
-// file shares one note.
-QString fullpath(const QString& path)
-{
-    const QFileInfo info(path);
-    const QString canonical = info.canonicalFilePath();
-    return canonical.isEmpty() ? info.absoluteFilePath() : canonical;
-}
-
 QString notepath(const QString& familyfile, const QString& backupfolder)
 {
-    QString key = fullpath(familyfile);
+    // Every name of the file (through symbolic links) shares one note.
+    QString key = canonicalpath(familyfile);
 #ifdef Q_OS_WIN
     key = key.toLower(); // one file whatever the letter case it is named in
 #endif
@@ -90,11 +82,11 @@ QString writenote(const lastchange& c)
 // copy some other file over the family file).
 QString checknote(const lastchange& c, const QString& familyfile, const QString& backupfolder)
 {
-    if (!samefilepath(c.gedcomfile, fullpath(familyfile)))
+    if (!samefilepath(c.gedcomfile, canonicalpath(familyfile)))
         return QStringLiteral("it is the note of another file, %1").arg(native(c.gedcomfile));
     const QFileInfo backup(c.backuppath);
     if (c.mode < 1 || c.mode > 4 || !c.after.exists || !c.backupstamp.exists || !isbackupname(backup.fileName())
-        || !samefilepath(fullpath(backup.absolutePath()), fullpath(backupfolder.trimmed())))
+        || !samefilepath(canonicalpath(backup.absolutePath()), canonicalpath(backupfolder.trimmed())))
         return QStringLiteral("it does not hold what an undo needs");
     return QString();
 }
@@ -170,7 +162,7 @@ QString notelastchange(const gedcomindex& index, const settings& s, const rewrit
 {
     lastchange c;
     c.notepath = notepath(index.gedcomfile, s.backupfolder);
-    c.gedcomfile = fullpath(index.gedcomfile);
+    c.gedcomfile = canonicalpath(index.gedcomfile);
     c.mode = static_cast<int>(request.mode);
     c.summary = changesummary(request, out.rewrite);
     c.made = logtimestamp();
@@ -196,7 +188,7 @@ QString undoquestion(const lastchange& c)
 
 undooutcome undolast(const QString& familyfile, const settings& s)
 {
-    const QString family = native(fullpath(familyfile));
+    const QString family = native(canonicalpath(familyfile));
     familylock lock(familyfile);
     if (const QString busy = lock.acquire(); !busy.isEmpty())
         return refused(busy);
@@ -318,7 +310,7 @@ undooutcome undolast(const QString& familyfile, const settings& s)
         u.noteerror = QStringLiteral("Quillmark could not note the undo in %1 (%2).").arg(native(c.notepath), error);
     }
     if (s.keeplog) {
-        u.logerror = writeundoentry(s, fullpath(familyfile), c.summary, c.made, c.backuppath, backup.path);
+        u.logerror = writeundoentry(s, canonicalpath(familyfile), c.summary, c.made, c.backuppath, backup.path);
         u.logwritten = u.logerror.isEmpty();
     }
     return u;
