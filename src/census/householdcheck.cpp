@@ -3,7 +3,6 @@
 #include "model/dates.h"
 #include "model/gedcomindex.h"
 #include "platform/encoding.h"
-#include "platform/linereader.h"
 #include "settings/settings.h"
 
 #include <QHash>
@@ -18,69 +17,6 @@ namespace {
 
 // Ages may be typed as much as this many years from those the birth date allows.
 constexpr int agetolerance = 2;
-
-template <size_t N>
-bool startswith(std::string_view s, const char (&prefix)[N])
-{
-    return s.size() >= N - 1 && std::memcmp(s.data(), prefix, N - 1) == 0;
-}
-
-std::string_view lefttrim(std::string_view s)
-{
-    while (!s.empty() && (s.front() == ' ' || s.front() == '\t'))
-        s.remove_prefix(1);
-    return s;
-}
-
-// The digits from pos up to the first other character; -1 when there are none.
-int64_t numberat(std::string_view line, size_t pos)
-{
-    int64_t v = 0;
-    size_t i = pos;
-    for (; i < line.size() && i - pos < 12 && line[i] >= '0' && line[i] <= '9'; ++i)
-        v = v * 10 + (line[i] - '0');
-    return i > pos ? v : -1;
-}
-
-// One census event or residence fact: its date, place and cited sources.
-struct eventfacts {
-    QString date, place;
-    std::vector<int32_t> sources;
-};
-
-// The residence facts ("1 RESI") of the individuals with these record
-// numbers, read from the family file: the index does not keep them.
-QHash<int32_t, std::vector<eventfacts>> residences(const gedcomindex& ix, const QHash<int32_t, int>& ids)
-{
-    QHash<int32_t, std::vector<eventfacts>> out;
-    linereader in;
-    if (ids.isEmpty() || !in.open(ix.gedcomfile))
-        return out;
-    std::vector<eventfacts>* facts = nullptr; // of the current individual, when wanted
-    eventfacts* event = nullptr;
-    std::string_view line;
-    while (in.next(line)) {
-        const std::string_view t = lefttrim(line);
-        if (startswith(t, "0")) {
-            event = nullptr;
-            facts = nullptr;
-            const int64_t id = startswith(t, "0 @I") ? numberat(t, 4) : -1;
-            if (id >= 0 && ids.contains(static_cast<int32_t>(id)))
-                facts = &out[static_cast<int32_t>(id)];
-        } else if (!facts) {
-            continue;
-        } else if (startswith(t, "1")) {
-            event = startswith(t, "1 RESI") ? &facts->emplace_back() : nullptr;
-        } else if (event && startswith(t, "2 DATE ")) {
-            event->date = qs(toutf8(t.substr(7), in.encoding())).trimmed();
-        } else if (event && startswith(t, "2 PLAC ")) {
-            event->place = qs(toutf8(t.substr(7), in.encoding())).trimmed();
-        } else if (event && startswith(t, "2 SOUR @")) {
-            event->sources.push_back(static_cast<int32_t>(std::max<int64_t>(0, numberat(t, 9))));
-        }
-    }
-    return out;
-}
 
 // Union-find over family numbers: two individuals are related when their
 // families (as a child, as a spouse) fall into one set.
@@ -187,7 +123,7 @@ private:
     }
     const personrec* person(const selectionrec& r) const;
     void dates(int row, const selectionrec& r, const personrec& p);
-    void entered(int row, const selectionrec& r, const personrec& p, const std::vector<eventfacts>& resi);
+    void entered(int row, const selectionrec& r, const personrec& p);
     bool thiscensus(const QString& date, const std::vector<int32_t>& sources) const;
 
     const gedcomindex& ix_;
@@ -262,7 +198,7 @@ bool checker::thiscensus(const QString& date, const std::vector<int32_t>& source
     return !s_.fullentry && cited > 0 && std::find(sources.begin(), sources.end(), cited) != sources.end();
 }
 
-void checker::entered(int row, const selectionrec& r, const personrec& p, const std::vector<eventfacts>& resi)
+void checker::entered(int row, const selectionrec& r, const personrec& p)
 {
     const auto found = [&](const char* what, const QString& date, const QString& place) {
         QString where = date.isEmpty() ? QString() : QStringLiteral(" dated ") + date;
@@ -279,9 +215,12 @@ void checker::entered(int row, const selectionrec& r, const personrec& p, const 
             return;
         }
     }
-    for (const eventfacts& f : resi) {
-        if (thiscensus(f.date, f.sources)) {
-            found("residence fact", f.date, f.place);
+    if (!s_.residence)
+        return;
+    for (const residencerec& f : p.residences) {
+        const QString date = qs(f.date).trimmed();
+        if (thiscensus(date, std::vector<int32_t>(f.sourceids.begin(), f.sourceids.end()))) {
+            found("residence fact", date, qs(f.place).trimmed());
             return;
         }
     }
@@ -297,10 +236,6 @@ std::vector<householdfinding> checker::run()
         if (people.back() && !firstrow.contains(people.back()->id))
             firstrow.insert(people.back()->id, static_cast<int>(k));
     }
-    QHash<int32_t, std::vector<eventfacts>> resi;
-    if (s_.residence)
-        resi = residences(ix_, firstrow);
-
     // The parts of the tree the household's individuals belong to.
     std::vector<int> part(rows.size(), -1);
     if (firstrow.size() > 1) {
@@ -323,7 +258,7 @@ std::vector<householdfinding> checker::run()
         }
         if (census_)
             dates(row, r, *p);
-        entered(row, r, *p, resi.value(p->id));
+        entered(row, r, *p);
         if (firstrow.size() < 2)
             continue;
         bool related = false;

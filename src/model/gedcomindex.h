@@ -42,6 +42,7 @@ struct censusrec {
 struct residencerec {
     std::string_view date;  // "2 DATE" value (a later one replaces an earlier)
     std::string_view place; // "2 PLAC" value
+    indexlist<int32_t> sourceids; // sources cited under the fact, in file order
 };
 
 // One individual ("0 @I...").

@@ -187,6 +187,10 @@ private:
     void flagline(std::string_view s);
     template <typename T>
     void putlist(indexlist<T>& list, std::vector<T>& items);
+    // Gives each event its citations, cites[start[i]] up to the next event's
+    // start, copied into the arena.
+    template <class T>
+    void adoptcites(std::vector<T>& events, const std::vector<int32_t>& cites, std::vector<size_t>& start);
 
     personrec& person() { return ix_.people.back(); }
     censusrec& lastcensus() { return census_.back(); }
@@ -216,6 +220,8 @@ private:
     std::vector<residencerec> residences_;
     std::vector<int32_t> censuscites_;      // citations of all its census events, in order
     std::vector<size_t> censuscitestart_;   // where each event's citations start
+    std::vector<int32_t> residencecites_;    // the same for its residence facts
+    std::vector<size_t> residencecitestart_;
 
     // The place value of the current "2 PLAC " line (UTF-8, trimmed).
     std::string_view lastplace_;
@@ -425,21 +431,18 @@ void loader::endrecord()
     putlist(p.fams, fams_);
     putlist(p.sourceids, sourceids_);
     putlist(p.flagids, flagids_);
-    putlist(p.residences, residences_);
+    if (!residences_.empty()) {
+        adoptcites(residences_, residencecites_, residencecitestart_);
+        putlist(p.residences, residences_);
+    }
     if (!census_.empty()) {
-        censuscitestart_.push_back(censuscites_.size());
-        for (size_t i = 0; i < census_.size(); ++i) {
-            const size_t from = censuscitestart_[i], to = censuscitestart_[i + 1];
-            if (from == to)
-                continue;
-            auto* at = static_cast<int32_t*>(ix_.arena.allocate((to - from) * sizeof(int32_t), alignof(int32_t)));
-            std::memcpy(at, censuscites_.data() + from, (to - from) * sizeof(int32_t));
-            census_[i].sourceids.adopt(at, to - from);
-        }
+        adoptcites(census_, censuscites_, censuscitestart_);
         putlist(p.census, census_);
     }
     censuscites_.clear();
     censuscitestart_.clear();
+    residencecites_.clear();
+    residencecitestart_.clear();
 }
 
 void loader::sourceline(std::string_view s)
@@ -597,6 +600,7 @@ void loader::personline(std::string_view s)
             } else if (startswith(s, "1 RESI")) {
                 inresidence = true;
                 residences_.emplace_back();
+                residencecitestart_.push_back(residencecites_.size());
             }
         }
         return;
@@ -671,6 +675,22 @@ void loader::personline(std::string_view s)
         sourceids_.push_back(id);
         if (incensus)
             censuscites_.push_back(id);
+        else if (inresidence)
+            residencecites_.push_back(id);
+    }
+}
+
+template <class T>
+void loader::adoptcites(std::vector<T>& events, const std::vector<int32_t>& cites, std::vector<size_t>& start)
+{
+    start.push_back(cites.size());
+    for (size_t i = 0; i < events.size(); ++i) {
+        const size_t from = start[i], to = start[i + 1];
+        if (from == to)
+            continue;
+        auto* at = static_cast<int32_t*>(ix_.arena.allocate((to - from) * sizeof(int32_t), alignof(int32_t)));
+        std::memcpy(at, cites.data() + from, (to - from) * sizeof(int32_t));
+        events[i].sourceids.adopt(at, to - from);
     }
 }
 
