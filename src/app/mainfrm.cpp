@@ -1,39 +1,33 @@
 #include "app/mainfrm.h"
 
+#include "app/filechoice_ui.h"
 #include "app/startup.h"
 #include "census/entrypanel_ui.h"
 #include "census/householdpanel_ui.h"
 #include "flags/flagsmenu_ui.h"
-#include "flags/flagtable.h"
 #include "images/imagesmenu_ui.h"
 #include "log/clearlog.h"
 #include "log/logfrm.h"
-#include "model/dates.h"
 #include "model/filechanged.h"
 #include "model/loadgedcom.h"
-#include "platform/formparts_ui.h"
+#include "platform/editmenu_ui.h"
 #include "platform/prompts.h"
 #include "platform/settingsstore.h"
 #include "settings/optionsmenu_ui.h"
 #include "tools/coveragefrm.h"
 #include "tools/toolsmenu_ui.h"
 #include "writer/backups.h"
-#include "writer/maketitle.h"
 #include "writer/undoprompts.h"
 
 #include <QAction>
 #include <QApplication>
-#include <QCheckBox>
-#include <QClipboard>
 #include <QCloseEvent>
-#include <QComboBox>
 #include <QFileInfo>
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListView>
 #include <QMenuBar>
-#include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScreen>
 #include <QStackedWidget>
@@ -42,16 +36,6 @@
 #include <QVBoxLayout>
 
 namespace qm {
-
-namespace {
-const QString defaultfilename = QStringLiteral("Default File");
-const QString gedcomfoldername = QStringLiteral("Gedcom Folder");
-
-QString doesnotexist()
-{
-    return QStringLiteral("The file selected does not exist. Please try again.");
-}
-} // namespace
 
 mainfrm::mainfrm(prompts& p, settingsstore& store, QWidget* parent)
     : QMainWindow(parent), prompts_(p), file_(store, &p)
@@ -67,6 +51,11 @@ mainfrm::mainfrm(prompts& p, settingsstore& store, QWidget* parent)
 
 mainfrm::~mainfrm() = default;
 
+const recentfiles& mainfrm::recent() const
+{
+    return files_->recent();
+}
+
 void mainfrm::buildmenus()
 {
     const auto item = [this](QMenu* menu, const char* name, const QString& caption) {
@@ -80,57 +69,22 @@ void mainfrm::buildmenus()
             this, [this] { openfamilyfile(QStringLiteral("-1")); });
     connect(item(file, "savemen", QStringLiteral("&Save Census Entry")), &QAction::triggered, this,
             &mainfrm::saveentry);
-    recentseparator_ = file->addSeparator();
-    for (int i = 0; i < recentfiles::slotcount; ++i) {
-        QAction* a = item(file, "RecentFilesmen", QString());
-        a->setObjectName(QStringLiteral("RecentFilesmen%1").arg(i + 1));
-        a->setVisible(false);
-        connect(a, &QAction::triggered, this,
-                [this, i] { openfamilyfile(recent_.paths[static_cast<size_t>(i)]); });
-        RecentFilesmen_[static_cast<size_t>(i)] = a;
-    }
+    files_ = new filechoice(file_.store(), prompts_, file, this);
+    connect(files_, &filechoice::recentchosen, this, &mainfrm::openfamilyfile);
     file->addSeparator();
     connect(item(file, "exitmen", QStringLiteral("E&xit")), &QAction::triggered, this, &QWidget::close);
 
     QMenu* edit = menuBar()->addMenu(QStringLiteral("&Edit"));
     edit->setObjectName(QStringLiteral("editmen"));
     connect(item(edit, "undomen", QStringLiteral("&Undo Last Census Entry")), &QAction::triggered, this, [this] {
-        if (!file_.index() || form_->saving())
-            return;
-        bool undone = false;
-        {
-            const pausewatch paused = file_.pause();
-            undone = askundolast(file_.path(), file_.currentsettings(), prompts_);
-        }
-        endtool(undone ? toolend::reload : toolend::unchanged);
+        if (file_.index() && !form_->saving())
+            endtool(askundolast(file_, prompts_));
     });
     edit->addSeparator();
-    copymen_ = item(edit, "copymen", QStringLiteral("Copy"));
-    cutmen_ = item(edit, "cutmen", QStringLiteral("Cut"));
-    pastemen_ = item(edit, "pastemen", QStringLiteral("Paste"));
+    addclipboarditems(edit);
     edit->addSeparator();
     connect(item(edit, "clearallmen", QStringLiteral("Clear all textboxes and selections")), &QAction::triggered,
             this, &mainfrm::clearall);
-    connect(edit, &QMenu::aboutToShow, this, &mainfrm::editmenuopening);
-    const auto focused = [] { return QApplication::focusWidget(); };
-    connect(copymen_, &QAction::triggered, this, [focused] {
-        if (auto* l = qobject_cast<QLineEdit*>(focused()))
-            l->copy();
-        else if (auto* t = qobject_cast<QPlainTextEdit*>(focused()))
-            t->copy();
-    });
-    connect(cutmen_, &QAction::triggered, this, [focused] {
-        if (auto* l = qobject_cast<QLineEdit*>(focused()))
-            l->cut();
-        else if (auto* t = qobject_cast<QPlainTextEdit*>(focused()))
-            t->cut();
-    });
-    connect(pastemen_, &QAction::triggered, this, [focused] {
-        if (auto* l = qobject_cast<QLineEdit*>(focused()))
-            l->paste();
-        else if (auto* t = qobject_cast<QPlainTextEdit*>(focused()))
-            t->paste();
-    });
 
     QMenu* view = menuBar()->addMenu(QStringLiteral("&View"));
     view->setObjectName(QStringLiteral("viewmen"));
@@ -191,7 +145,9 @@ void mainfrm::buildform()
     household_ = new householdform(file_, prompts_, *form_, central);
     form_->sethousehold(household_);
     household_->find = [this](int32_t start, bool& refocus) { return runfind(start, refocus); };
-    form_->chooseimages = [this](std::vector<imagechoice>& chosen) { return chooseentryimages(chosen); };
+    form_->chooseimages = [this](const entrysource& e, std::vector<imagechoice>& chosen) {
+        return chooseentryimages(e, file_, prompts_, this, chosen);
+    };
     connect(household_, &householdform::filecheck, this, &mainfrm::checkonactivate);
     connect(form_, &censusform::saved, this, &mainfrm::milestone);
     connect(form_, &censusform::fatal, this, &mainfrm::endprogram);
@@ -218,41 +174,15 @@ void mainfrm::buildform()
 
 void mainfrm::placewindow()
 {
-    const double dpi = logicalDpiX() > 0 ? logicalDpiX() : 96;
     const QScreen* screen = QGuiApplication::primaryScreen();
-    const QRect avail = screen ? screen->availableGeometry() : QRect(0, 0, 1366, 728);
-    // Room for the frame and title bar of the window manager.
-    const QSize room(avail.width() - 16, avail.height() - 40);
-    // The classic 12000 x 8950 twips, grown to what the rows and lists need
-    // and to a comfortable 1280 x 760 where the screen allows.
-    QSize size(twipstopixels(12000, dpi), twipstopixels(8950, dpi));
-    size = size.expandedTo(sizeHint()).expandedTo(QSize(1280, 760));
-    resize(size.boundedTo(room));
-
     const placement p = readplacement(file_.store());
-    QPoint at = pos();
-    QSize s = this->size();
-    if (p.top)
-        at.setY(twipstopixels(*p.top, dpi));
-    if (p.left)
-        at.setX(twipstopixels(*p.left, dpi));
-    if (p.width)
-        s.setWidth(twipstopixels(*p.width, dpi));
-    if (p.height)
-        s.setHeight(twipstopixels(*p.height, dpi));
-    // A window restored onto a screen that is no longer there could not be
-    // reached: keep it within the screen.
-    s = s.boundedTo(room).expandedTo(minimumSizeHint());
-    at.setX(std::clamp(at.x(), avail.left(), std::max(avail.left(), avail.right() - s.width())));
-    at.setY(std::clamp(at.y(), avail.top(), std::max(avail.top(), avail.bottom() - s.height())));
-    if (p.top || p.left)
-        move(at);
-    resize(s);
-    if (p.complete()) {
-        maximise_ = p.maximised;
-        if (p.centre)
-            move(avail.center() - QPoint(s.width() / 2, s.height() / 2));
-    }
+    const windowplace w = qm::placewindow(p, pos(), sizeHint(), minimumSizeHint(),
+                                          screen ? screen->availableGeometry() : QRect(0, 0, 1366, 728),
+                                          logicalDpiX() > 0 ? logicalDpiX() : 96);
+    if (w.move)
+        move(w.at);
+    resize(w.size);
+    maximise_ = p.complete() && p.maximised;
     form_->setdivider(p.divider);
 }
 
@@ -264,91 +194,25 @@ void mainfrm::showplaced()
         show();
 }
 
-std::optional<QString> mainfrm::askforfile(bool)
-{
-    return prompts_.openfile(QStringLiteral("Open GEDCOM family history file"), gedcomfolder_, gedcomfilter());
-}
-
 bool mainfrm::start(const QStringList& arguments)
 {
     placewindow();
-    recent_.read(file_.store());
-    showrecentfiles();
-    defaultfile_ = file_.store().read(defaultfilename).value_or(QString()).trimmed();
-    gedcomfolder_ = file_.store().read(gedcomfoldername).value_or(QString()).trimmed();
-
-    std::optional<QString> named = commandlinefile(arguments);
-    QString file;
-    for (;;) {
-        bool fromdefault = false;
-        if (named) {
-            file = *named;
-            named.reset(); // first attempt only
-        } else if (defaultfile_.size() < 3) {
-            const std::optional<QString> chosen = askforfile(true);
-            if (!chosen)
-                return false;
-            file = *chosen;
-        } else {
-            file = defaultfile_;
-            fromdefault = true;
-        }
-        if (QFileInfo(file).isFile())
-            break;
-        // A missing default file is dropped silently; any other missing file
-        // is reported. A missing file named on the command line leaves the
-        // default file alone.
-        if (!fromdefault)
-            prompts_.tell(doesnotexist());
-        if (fromdefault || defaultfile_.isEmpty()) {
-            defaultfile_.clear();
-            file_.store().write(defaultfilename, QString());
-        }
-    }
-    rememberfile(file, false);
+    files_->read();
+    const std::optional<QString> chosen = files_->atstart(arguments);
+    if (!chosen)
+        return false;
+    files_->remember(*chosen, false, file_.currentsettings().fileopendefault);
 
     file_.readsettings();
-    settitleandpanel(file);
+    settitleandpanel(*chosen);
     if (qm::startoptions(file_, prompts_, [this] { donate(); }, this))
-        settitleandpanel(file);
-    file_.load(file);
+        settitleandpanel(*chosen);
+    file_.load(*chosen);
     if (file_.currentsettings().flagcheck)
         silentflagcheck();
     clearentry();
     idle_.reset();
     return true;
-}
-
-void mainfrm::rememberfile(const QString& path, bool fromopen)
-{
-    if (askdefaultfile(defaultfile_, fromopen, file_.currentsettings().fileopendefault) &&
-        prompts_.yes(QStringLiteral("Do you want to open this file by default whenever you use Quillmark?"),
-                     icon::question)) {
-        defaultfile_ = path;
-        file_.store().write(defaultfilename, path);
-    }
-    const QString folder = folderof(path);
-    if (!folder.isEmpty()) {
-        gedcomfolder_ = folder;
-        file_.store().write(gedcomfoldername, folder);
-    }
-    recent_.remember(path);
-    showrecentfiles();
-}
-
-void mainfrm::showrecentfiles()
-{
-    recent_.write(file_.store());
-    bool any = false;
-    for (int i = 0; i < recentfiles::slotcount; ++i) {
-        QAction* a = RecentFilesmen_[static_cast<size_t>(i)];
-        const bool used = recent_.inuse(i);
-        a->setVisible(used);
-        if (used)
-            a->setText(recent_.caption(i));
-        any = any || used;
-    }
-    recentseparator_->setVisible(any);
 }
 
 void mainfrm::settitleandpanel(const QString& path)
@@ -367,10 +231,7 @@ void mainfrm::afterload()
         coverage_->setindex(*file_.index(), file_.currentsettings()); // first: the grid must not read the index it had
     if (file_.index()->people.empty() && QFileInfo::exists(file_.path())) {
         prompts_.tell(nopeoplemessage());
-        if (file_.path() == defaultfile_) {
-            defaultfile_.clear();
-            file_.store().write(defaultfilename, QString());
-        }
+        files_->dropdefault(file_.path());
     }
 }
 
@@ -382,34 +243,14 @@ void mainfrm::openfamilyfile(const QString& path)
                       icon::exclamation, answer::no))
         return;
     const pausewatch paused = file_.pause();
-    QString chosen;
-    if (path != QLatin1String("-1")) {
-        if (!QFileInfo(path).isFile()) {
-            if (prompts_.yes(QStringLiteral("The recent file selected does not exist or can not be accessed. Do you "
-                                            "want to remove it from the recent files list?"),
-                             icon::exclamation, answer::no, QStringLiteral("Open Recent File")))
-                recent_.remove(path);
-            showrecentfiles();
-            return;
-        }
-        chosen = path;
-    } else {
-        for (;;) {
-            const std::optional<QString> f = askforfile(false);
-            if (!f)
-                return;
-            if (QFileInfo(*f).isFile()) {
-                chosen = *f;
-                break;
-            }
-            prompts_.tell(doesnotexist());
-        }
-    }
+    const std::optional<QString> chosen = files_->another(path);
+    if (!chosen)
+        return;
     const QString previous = file_.path();
-    rememberfile(chosen, true);
+    files_->remember(*chosen, true, file_.currentsettings().fileopendefault);
     household_->rows().clear();
-    settitleandpanel(chosen);
-    if (!file_.load(chosen).ok && !previous.isEmpty() && !file_.index()->gedcomfile.isEmpty()) {
+    settitleandpanel(*chosen);
+    if (!file_.load(*chosen).ok && !previous.isEmpty() && !file_.index()->gedcomfile.isEmpty()) {
         // The file could not be read: the one read before stays open.
         settitleandpanel(file_.path());
         afterload();
@@ -438,18 +279,6 @@ void mainfrm::closeEvent(QCloseEvent* event)
     file_.store().sync();
     idle_.emplace(file_);
     event->accept();
-}
-
-void mainfrm::editmenuopening()
-{
-    QWidget* w = QApplication::focusWidget();
-    auto* line = qobject_cast<QLineEdit*>(w);
-    auto* text = qobject_cast<QPlainTextEdit*>(w);
-    const bool selected = (line && line->hasSelectedText()) || (text && text->textCursor().hasSelection());
-    copymen_->setEnabled(selected);
-    cutmen_->setEnabled(selected && !(line && line->isReadOnly()) && !(text && text->isReadOnly()));
-    const bool editable = (line && !line->isReadOnly()) || (text && !text->isReadOnly());
-    pastemen_->setEnabled(editable && !QApplication::clipboard()->text().isEmpty());
 }
 
 void mainfrm::clearall()
@@ -517,24 +346,6 @@ void mainfrm::silentflagcheck()
         if (QThread::currentThread()->loopLevel() == 0)
             QTimer::singleShot(0, qApp, [] { QCoreApplication::exit(1); });
     }
-}
-
-// The entry's Census Images dialog offers titles built from the source the
-// entry makes or cites.
-bool mainfrm::chooseentryimages(std::vector<imagechoice>& chosen)
-{
-    const entrypanel* p = form_->panel();
-    entrysource e;
-    e.fullentry = form_->sourcemode() == 0;
-    e.date = p->fixeddatetxt->text();
-    if (e.fullentry) {
-        e.title = p->titletxt->text();
-        e.reference = p->referencetxt->text();
-    } else {
-        e.sourcetitle = p->sourcecom->currentText();
-        e.where = p->wherewithinsourcetxt->text();
-    }
-    return qm::chooseentryimages(e, file_, prompts_, this, chosen);
 }
 
 int32_t mainfrm::runfind(int32_t start, bool& refocus)

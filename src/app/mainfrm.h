@@ -32,6 +32,7 @@ class QPushButton;
 namespace qm {
 
 class coveragefrm;
+class filechoice;
 class entrypanel;
 class prompts;
 class settingsstore;
@@ -53,7 +54,7 @@ public:
     const gedcomindex* index() const { return file_.index(); }
     const householdrows& household() const { return household_->rows(); }
     const settings& currentsettings() const { return file_.currentsettings(); }
-    const recentfiles& recent() const { return recent_; }
+    const recentfiles& recent() const;
     QString gedcomfile() const { return file_.path(); }
     bool firststart() const { return file_.currentsettings().firststart; }
     bool watching() const { return file_.watching(); }
@@ -75,14 +76,11 @@ private:
     void buildmenus();
     void buildform();
     void placewindow();
-    void rememberfile(const QString& path, bool fromopen);
-    void showrecentfiles();
     // The title names `path`: the file about to be read, or the one open.
     void settitleandpanel(const QString& path);
     // After every read (an openfile listener): a file without individuals is
     // reported, and is no longer the default file.
     void afterload();
-    void editmenuopening();
     void clearall();
 
     // The menus' tools and dialogs are offered by their features' folders;
@@ -103,11 +101,8 @@ private:
     void helpkeys();           // app/helpmenu_ui.cpp: F1
     // After each saved entry, once Count has been raised (app/helpmenu_ui.cpp).
     void milestone();
-    std::optional<QString> askforfile(bool startup);
-    // Handed to the entry form and the household: the entry's Census Images
-    // dialog, and the Find dialog starting at people[start] (the individual
-    // chosen or -1, and whether the family is to be rebuilt around it).
-    bool chooseentryimages(std::vector<imagechoice>& chosen);
+    // Handed to the household: the Find dialog starting at people[start] (the
+    // individual chosen or -1, and whether the family is to be rebuilt around it).
     int32_t runfind(int32_t start, bool& refocus);
 
     // A failed rewrite: the message has been shown; the program ends.
@@ -121,9 +116,7 @@ private:
     // once the window is closing.
     std::optional<pausewatch> idle_;
 
-    QString defaultfile_;
-    QString gedcomfolder_;
-    recentfiles recent_;
+    filechoice* files_ = nullptr; // the family file to open, and the recent files
     bool maximise_ = false;
 
     bool checking_ = false;
@@ -135,13 +128,8 @@ private:
     censusform* form_ = nullptr;
     householdform* household_ = nullptr;
     QPushButton* reloadbut_ = nullptr;
-    std::array<QAction*, recentfiles::slotcount> RecentFilesmen_{};
-    QAction* recentseparator_ = nullptr;
     QAction* viewlogmen_ = nullptr;
     QAction* attachbut_ = nullptr;
-    QAction* copymen_ = nullptr;
-    QAction* cutmen_ = nullptr;
-    QAction* pastemen_ = nullptr;
 };
 
 } // namespace qm

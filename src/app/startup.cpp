@@ -6,6 +6,7 @@
 #include <QDir>
 #include <QFileInfo>
 
+#include <algorithm>
 #include <cmath>
 
 namespace qm {
@@ -84,6 +85,33 @@ void writeplacement(settingsstore& store, bool maximised, int top, int left, int
     store.write(QStringLiteral("Main Width"), QString::number(width));
     store.write(QStringLiteral("Main Height"), QString::number(height));
     store.write(QStringLiteral("Divider Percent"), QString::number(divider, 'g', 4));
+}
+
+windowplace placewindow(const placement& p, QPoint at, QSize hint, QSize minimum, const QRect& avail, double dpi)
+{
+    // Room for the frame and title bar of the window manager.
+    const QSize room(avail.width() - 16, avail.height() - 40);
+    QSize s = QSize(twipstopixels(12000, dpi), twipstopixels(8950, dpi))
+                  .expandedTo(hint)
+                  .expandedTo(QSize(1280, 760))
+                  .boundedTo(room);
+    if (p.top)
+        at.setY(twipstopixels(*p.top, dpi));
+    if (p.left)
+        at.setX(twipstopixels(*p.left, dpi));
+    if (p.width)
+        s.setWidth(twipstopixels(*p.width, dpi));
+    if (p.height)
+        s.setHeight(twipstopixels(*p.height, dpi));
+    s = s.boundedTo(room).expandedTo(minimum);
+    at.setX(std::clamp(at.x(), avail.left(), std::max(avail.left(), avail.right() - s.width())));
+    at.setY(std::clamp(at.y(), avail.top(), std::max(avail.top(), avail.bottom() - s.height())));
+    windowplace w{at, s, p.top || p.left};
+    if (p.complete() && p.centre) {
+        w.at = avail.center() - QPoint(s.width() / 2, s.height() / 2);
+        w.move = true;
+    }
+    return w;
 }
 
 int twipstopixels(int twips, double dpi)

@@ -3,6 +3,7 @@
 // the command line, the window title, the window placement kept in the
 // settings store, and when to ask about the default file.
 
+#include <QRect>
 #include <QString>
 #include <QStringList>
 
@@ -34,6 +35,19 @@ struct placement {
 
 placement readplacement(const settingsstore& store);
 void writeplacement(settingsstore& store, bool maximised, int top, int left, int width, int height, double divider);
+
+// Where the main window goes on a screen whose free area is `avail`: its own
+// size (the classic 12000 x 8950 twips, grown to `hint` and to a comfortable
+// 1280 x 760, within the screen), then as much of the placement kept as there
+// is, kept within the screen and no smaller than `minimum`, so that a window
+// last shown on a screen that is no longer there can still be reached.
+// `at` is where the window stands before; `move` says whether it is moved.
+struct windowplace {
+    QPoint at;
+    QSize size;
+    bool move = false;
+};
+windowplace placewindow(const placement& p, QPoint at, QSize hint, QSize minimum, const QRect& avail, double dpi);
 
 int twipstopixels(int twips, double dpi);
 int pixelstotwips(int pixels, double dpi);

@@ -22,7 +22,6 @@
 #include "writer/saveprompts.h"
 
 #include <QApplication>
-#include <QCollator>
 #include <QComboBox>
 #include <QEvent>
 #include <QLabel>
@@ -112,11 +111,7 @@ void censusform::refill()
 {
     const gedcomindex& x = *file_.index();
     // Existing census sources, by title.
-    std::vector<sourceitem> sources = censussourcelist(x);
-    QCollator collator;
-    collator.setCaseSensitivity(Qt::CaseInsensitive);
-    std::stable_sort(sources.begin(), sources.end(),
-                     [&](const sourceitem& a, const sourceitem& b) { return collator.compare(a.title, b.title) < 0; });
+    const std::vector<sourceitem> sources = censussourcelist(x);
     QComboBox* sourcecom = panel_[1]->sourcecom;
     const QSignalBlocker block(sourcecom);
     sourcecom->clear();
@@ -417,6 +412,23 @@ bool censusform::checkform(entryform& form, QString& entrydate)
     return true;
 }
 
+// The source as typed in the panel of the current mode.
+entrysource censusform::imagesource() const
+{
+    const entrypanel* p = panel();
+    entrysource e;
+    e.fullentry = sourcemode_ == 0;
+    e.date = p->fixeddatetxt->text();
+    if (e.fullentry) {
+        e.title = p->titletxt->text();
+        e.reference = p->referencetxt->text();
+    } else {
+        e.sourcetitle = p->sourcecom->currentText();
+        e.where = p->wherewithinsourcetxt->text();
+    }
+    return e;
+}
+
 void censusform::previewentry()
 {
     if (!file_.index() || saving_ || !household_->checkages())
@@ -473,7 +485,7 @@ void censusform::saveentry()
 
     std::vector<imagechoice> chosenimages;
     if (form.fullentry ? file_.currentsettings().requestimage : file_.currentsettings().requestimages2) {
-        if (chooseimages && !chooseimages(chosenimages))
+        if (chooseimages && !chooseimages(imagesource(), chosenimages))
             return;
     }
 

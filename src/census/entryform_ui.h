@@ -26,6 +26,7 @@ namespace qm {
 
 struct censusentry;
 struct entryform;
+struct entrysource;
 struct imagechoice;
 class entrypanel;
 class householdform;
@@ -82,9 +83,10 @@ public:
     // A save is running.
     bool saving() const { return saving_; }
 
-    // The Census Images dialog for the entry being saved: false when the user
-    // chose "Cancel saving census". Unset: no images are asked for.
-    std::function<bool(std::vector<imagechoice>& chosen)> chooseimages;
+    // The Census Images dialog for the entry being saved, given the source it
+    // makes or cites: false when the user chose "Cancel saving census".
+    // Unset: no images are asked for.
+    std::function<bool(const entrysource& source, std::vector<imagechoice>& chosen)> chooseimages;
 
 signals:
     void saved();
@@ -95,6 +97,7 @@ protected:
 
 private:
     void fillyears();
+    entrysource imagesource() const;
     void yearchosen(entrypanel* p, int item);
     void datechanged();
     void sourcechosen(int item);

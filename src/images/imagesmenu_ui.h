@@ -20,17 +20,6 @@ class prompts;
 // changed outside. Runs with the watch paused.
 toolend attachimages(openfile& file, prompts& p, QWidget* parent);
 
-// The source the entry being saved makes (a new one: its title and
-// reference) or cites (an existing one: its title and where within it).
-struct entrysource {
-    bool fullentry = true;
-    QString date;
-    QString title;
-    QString reference;
-    QString sourcetitle;
-    QString where;
-};
-
 // The Census Images dialog for the entry being saved, offering titles built
 // from its source. False when the user chose "Cancel saving census".
 bool chooseentryimages(const entrysource& e, openfile& file, prompts& p, QWidget* parent,

@@ -1,6 +1,7 @@
 #pragma once
 // The one order of every list of people: All Individuals, who could be alive
-// at a census, Immediate Family, Find, and the census date check's details.
+// at a census, Immediate Family, Find, and the census date check's details;
+// and of the list of existing census sources.
 // Ascending and ignoring letter case, as a sorted list box keeps its items,
 // and the same on every system whatever its locale: labels are compared by
 // their case-folded characters with accents set aside first ("Ébert" among

@@ -1,5 +1,9 @@
 // The loader: one pass over the family file's lines, recognising each by exact
-// prefixes after its indentation, filling a new index.
+// prefixes after its indentation, filling a new index. It stays one file above
+// the usual size on purpose: it is one state machine (`loader`) whose record
+// handlers share the record being read, the place and text tables and the
+// citations waiting for their event; split, that state would have to be
+// published in a header and the pass read across files.
 #include "model/loadgedcom.h"
 
 #include "platform/linereader.h"

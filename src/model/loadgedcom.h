@@ -46,7 +46,8 @@ std::string placekey(std::string_view name);
 // People list: an individual's label and the positions of individuals in label order.
 QString personlabel(const personrec& p, bool idonly);
 std::vector<int32_t> sortedpeople(const gedcomindex& index, bool idonly);
-// Census source list: titles of census sources with their positions in `sources`.
+// Census source list: titles of census sources with their positions in
+// `sources`, in the order of their titles (model/labelorder.h).
 struct sourceitem {
     QString title;
     int32_t source = 0; // position in `sources`

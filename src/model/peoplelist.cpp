@@ -1,4 +1,5 @@
-// What the main window lists from the index: individuals by label, census sources.
+// What the main window lists from the index: individuals by label, census
+// sources by title, both in the one list order (model/labelorder.h).
 #include "model/loadgedcom.h"
 
 #include "model/labelorder.h"
@@ -31,10 +32,14 @@ bool peoplelistshown(const gedcomindex& index)
 
 std::vector<sourceitem> censussourcelist(const gedcomindex& index)
 {
+    const std::vector<int32_t>& census = index.censussources;
+    const std::vector<size_t> order = labelorder(census.size(), [&](size_t k) {
+        return qs(index.sources[static_cast<size_t>(census[k])].title);
+    });
     std::vector<sourceitem> items;
-    items.reserve(index.censussources.size());
-    for (int32_t at : index.censussources)
-        items.push_back({qs(index.sources[static_cast<size_t>(at)].title), at});
+    items.reserve(order.size());
+    for (size_t k : order)
+        items.push_back({qs(index.sources[static_cast<size_t>(census[k])].title), census[k]});
     return items;
 }
 

@@ -1,3 +1,7 @@
+// The Options dialog: its five tabs built, the settings shown in them and read
+// back, the enabling rules, the file and folder choices and Save. One file a
+// little above the usual size: every part works on the same controls, which
+// are the dialog's members.
 #include "settings/optionsfrm.h"
 
 #include "platform/formparts_ui.h"

@@ -40,6 +40,18 @@ struct imagechoice {
     QString xref;         // an existing record: its identifier as the file writes it ("O0007"); "" = "O" + objectid
 };
 
+// The source the census entry being saved makes (a new one: its title and
+// reference) or cites (an existing one: its title and where within it), as
+// typed: the Census Images dialog builds its titles from it.
+struct entrysource {
+    bool fullentry = true;
+    QString date;
+    QString title;
+    QString reference;
+    QString sourcetitle;
+    QString where;
+};
+
 // One distinct census event date found by the census date check.
 struct datechange {
     QString founddate;  // the date as found after "2 DATE "

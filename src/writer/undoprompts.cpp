@@ -35,4 +35,10 @@ bool askundolast(const QString& familyfile, const settings& s, prompts& p)
     return true;
 }
 
+toolend askundolast(openfile& file, prompts& p)
+{
+    const pausewatch paused = file.pause();
+    return askundolast(file.path(), file.currentsettings(), p) ? toolend::reload : toolend::unchanged;
+}
+
 } // namespace qm

@@ -4,6 +4,8 @@
 // when it cannot be undone (none noted, already undone, the file changed
 // since, its backup gone) says why instead. The undo itself is undolast's.
 
+#include "writer/openfile.h"
+
 #include <QString>
 
 namespace qm {
@@ -13,5 +15,7 @@ struct settings;
 
 // True when the family file was put back (the caller reads it again).
 bool askundolast(const QString& familyfile, const settings& s, prompts& p);
+// The same for the open family file, with its watch for outside changes paused.
+toolend askundolast(openfile& file, prompts& p);
 
 } // namespace qm
