@@ -50,7 +50,12 @@ bool inoptions(const std::function<bool()>& open, const std::function<void(optio
 
 bool inoptions(mainfrm& w, const std::function<void(optionsfrm&)>& body)
 {
-    return inoptions([&] { return w.findChild<QAction*>(QStringLiteral("optionsmen"))->trigger(), true; }, body);
+    return inoptions(
+        [&] {
+            w.findChild<QAction*>(QStringLiteral("optionsmen"))->trigger();
+            return true;
+        },
+        body);
 }
 
 } // namespace

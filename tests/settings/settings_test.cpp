@@ -46,9 +46,9 @@ QStringList values(const settings& s)
     auto store = settingsstore::onfile(dir.filePath("values.ini"));
     savesettings(*store, s);
     saveflagsettings(*store, s);
-    QStringList out;
-    for (const QString& name : settingnames() << QStringLiteral("Household Check"))
-        out << name + u'=' + store->read(name).value_or(QStringLiteral("(none)"));
+    QStringList out = settingnames() << QStringLiteral("Household Check");
+    for (QString& name : out)
+        name += u'=' + store->read(name).value_or(QStringLiteral("(none)"));
     return out << QStringLiteral("Count=%1").arg(s.count) << QStringLiteral("Image Folder=") + s.imagefolder
                << QStringLiteral("Image Option=") + s.imageoption
                << QStringLiteral("Rename File=%1").arg(int(s.renamefile))
@@ -169,9 +169,10 @@ TEST_F(SettingsTest, RejectedValueResetsItsGroupAndAllLaterGroups)
         {"Alternate Separator Character", "ab", "Alternate Separator", false}, // at most one
         {"No Source Text Warning", nullptr, "Alternate Separator", false}, // an older version's store
     };
+    int n = 0;
     for (const auto& c : cases) {
         SCOPED_TRACE(c.name);
-        SetUp();
+        store = settingsstore::onfile(dir.filePath(QStringLiteral("case%1.ini").arg(++n)));
         fill(c.name, c.text);
         const settingsload l = loadsettings(*store);
         QStringList expected = resetfrom(c.reset);

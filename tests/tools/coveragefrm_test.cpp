@@ -5,6 +5,7 @@
 #include "tools/coveragefrm.h"
 
 #include "model/loadgedcom.h"
+#include "support/groupd_widgets.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 
@@ -20,12 +21,6 @@ using namespace qm;
 using namespace qmtest;
 
 namespace {
-
-template <class T>
-T* child(QWidget* w, const char* name)
-{
-    return w->findChild<T*>(QString::fromLatin1(name));
-}
 
 QTableView* grid(QWidget* w)
 {

@@ -7,6 +7,7 @@
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
 #include "settings/settings.h"
+#include "support/goldenfiles.h"
 #include "support/testfiles.h"
 
 #include <QDir>
@@ -257,25 +258,16 @@ TEST(DateCheck, Details)
 
 // The accepted replacements written to the file, with the occupation dates
 // that cite the census event's source (whatever lines come between), and
-// only those of an individual with that census event.
+// only those of an individual with that census event: tools/datechanges.ged,
+// from tools/datechanges_input.ged (a date refused, another country's, one
+// with a space at the line end, a family's event, an occupation citing another
+// source and one of an individual without the census event).
 TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
 {
     QTemporaryDir dir;
     ASSERT_TRUE(dir.isValid());
     const QString path = dir.filePath(QStringLiteral("family.ged"));
-    qmtest::writefile(path,
-                      "0 HEAD\r\n1 CHAR ANSI\r\n"
-                      "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
-                      "1 CENS\r\n2 DATE ABT 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
-                      "1 OCCU Weaver\r\n2 DATE ABT 1851\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"
-                      "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
-                      "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
-                      "1 CENS\r\n2 DATE ABT 1650\r\n"
-                      "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
-                      "0 @I3@ INDI\r\n1 CENS\r\n2 DATE ABT 1851 \r\n"
-                      "0 @I4@ INDI\r\n1 OCCU Miner\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
-                      "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE ABT 1851\r\n"
-                      "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
+    qmtest::writefile(path, qmtest::readfile(QStringLiteral(QM_TESTDATA_DIR "/tools/datechanges_input.ged")));
     loadresult r = loadgedcom(path, flagtable{});
     ASSERT_TRUE(r.index);
     settings s = defaultsettings();
@@ -294,22 +286,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
     EXPECT_EQ(out.rewrite.censusdateschanged, 3); // one line ended with a space; one a family's
     EXPECT_EQ(out.rewrite.occdateschanged, 1);
     EXPECT_TRUE(QFile::exists(out.backuppath));
-    EXPECT_EQ(qmtest::readfile(path),
-              "0 HEAD\r\n1 CHAR ANSI\r\n"
-              "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
-              "1 CENS\r\n2 DATE 30 MAR 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
-              "1 OCCU Weaver\r\n2 DATE 30 MAR 1851\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"
-              "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
-              "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
-              "1 CENS\r\n2 DATE ABT 1650\r\n"
-              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
-              "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
-              "0 @I3@ INDI\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
-              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
-              "0 @I4@ INDI\r\n1 OCCU Miner\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
-              "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
-              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
-              "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
+    EXPECT_TRUE(qmtest::matchesgolden(QStringLiteral("tools/datechanges.ged"), qmtest::readfile(path)));
     const std::string log = qmtest::readfile(s.logpath);
     EXPECT_NE(log.find("Changed 3 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
     EXPECT_EQ(log.find("1881"), std::string::npos) << log;

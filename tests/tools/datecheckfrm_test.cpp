@@ -8,6 +8,7 @@
 #include "platform/clock.h"
 #include "writer/saveroad.h"
 #include "support/mainfrmfixture.h"
+#include "support/groupd_widgets.h"
 #include "support/openfixture.h"
 
 #include <QAction>
@@ -45,30 +46,9 @@ bool editlines(const QString& path, const std::vector<std::tuple<int, const char
     return f.open(QIODevice::WriteOnly | QIODevice::Truncate) && f.write(lines.join(QStringLiteral("\r\n")).toUtf8()) > 0;
 }
 
-template <class T = QAbstractButton>
-T* control(QDialog* d, const char* name)
-{
-    return d->findChild<T*>(QString::fromLatin1(name));
-}
-
-QStringList rows(QDialog* d, const char* list)
-{
-    QStringList out;
-    for (auto* l = control<QListWidget>(d, list); l && out.size() < l->count();)
-        out << l->item(int(out.size()))->text();
-    return out;
-}
-
-void clickentry(QDialog* d, const char* list, int row)
-{
-    auto* l = control<QListWidget>(d, list);
-    l->scrollToItem(l->item(row));
-    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(l->item(row)).center());
-}
-
 QStringList details(QDialog* d)
 {
-    return static_cast<QStringListModel*>(control<QListView>(d, "peoplelst")->model())->stringList();
+    return static_cast<QStringListModel*>(child<QListView>(d, "peoplelst")->model())->stringList();
 }
 
 } // namespace
@@ -126,52 +106,52 @@ private slots:
         bool done = false;
         dialogs->expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
             done = true;
-            QVERIFY(control<QRadioButton>(d, "countryopt0")->isChecked());
+            QVERIFY(child<QRadioButton>(d, "countryopt0")->isChecked());
             // The lists as the check makes them (their texts: datecheck_test).
-            QCOMPARE(rows(d, "changelst").size(), 3);
-            QCOMPARE(rows(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
-            QCOMPARE(rows(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
-            auto* changebut = control<QPushButton>(d, "changebut");
-            auto* frame = control<QGroupBox>(d, "suggestionframe");
-            auto* combo = control<QComboBox>(d, "suggestcombo");
+            QCOMPARE(itemtexts(d, "changelst").size(), 3);
+            QCOMPARE(itemtexts(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
+            QCOMPARE(itemtexts(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
+            auto* changebut = child<QPushButton>(d, "changebut");
+            auto* frame = child<QGroupBox>(d, "suggestionframe");
+            auto* combo = child<QComboBox>(d, "suggestcombo");
             QVERIFY(changebut->isEnabled() && frame->isHidden());
-            control(d, "helpbut")->click();
+            child(d, "helpbut")->click();
             QCOMPARE(run->prompts.helpshown, QStringList{QStringLiteral("35")});
 
             // Another country's date: only "Don't make change" or "Change to:".
-            clickentry(d, "countrylst", 0);
+            clickitem(d, "countrylst", 0);
             QVERIFY(frame->isVisible() && !combo->isEnabled());
-            QVERIFY(!control<QRadioButton>(d, "suggestopt0")->isEnabled());
-            QVERIFY(control<QRadioButton>(d, "suggestopt1")->isChecked());
+            QVERIFY(!child<QRadioButton>(d, "suggestopt0")->isEnabled());
+            QVERIFY(child<QRadioButton>(d, "suggestopt1")->isChecked());
             QCOMPARE(details(d), QStringList{qs(w.index()->people[0].name) + QStringLiteral(" 43 Hebden Bridge, Yorkshire, England")});
             // ... left as it is.
-            control(d, "OKbut")->click();
-            QVERIFY(frame->isHidden() && rows(d, "countrylst").size() == 1);
+            child(d, "OKbut")->click();
+            QVERIFY(frame->isHidden() && itemtexts(d, "countrylst").size() == 1);
 
             // Refuse the first proposal.
-            clickentry(d, "changelst", 0);
-            QVERIFY(control<QRadioButton>(d, "suggestopt0")->isChecked());
-            control(d, "suggestopt1")->click();
-            control(d, "OKbut")->click();
-            QCOMPARE(rows(d, "changelst")[0],
+            clickitem(d, "changelst", 0);
+            QVERIFY(child<QRadioButton>(d, "suggestopt0")->isChecked());
+            child(d, "suggestopt1")->click();
+            child(d, "OKbut")->click();
+            QCOMPARE(itemtexts(d, "changelst")[0],
                      QStringLiteral("ABT 1841 (1 occurence) : [User has requested Quillmark not to replace this date]"));
 
             // Change the second to another census: first without choosing one.
-            clickentry(d, "changelst", 1);
-            control(d, "suggestopt2")->click();
+            clickitem(d, "changelst", 1);
+            child(d, "suggestopt2")->click();
             QVERIFY(combo->isEnabled());
             run->prompts.expect(answer::ok, QStringLiteral("You must choose a census date from the 'change to' drop-down list"));
-            control(d, "OKbut")->click();
+            child(d, "OKbut")->click();
             QVERIFY(frame->isVisible());
             combo->setCurrentIndex(combo->findText(QStringLiteral("Canada 1861 Census (14 JAN 1861)")));
-            control(d, "OKbut")->click();
-            QCOMPARE(rows(d, "changelst")[1],
+            child(d, "OKbut")->click();
+            QCOMPARE(itemtexts(d, "changelst")[1],
                      QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with Canada 1861 Census date 14 JAN 1861]"));
 
             // Places of a date.
-            clickentry(d, "currentlst", 0);
-            QVERIFY(rows(d, "changelst").size() == 3 && control<QListWidget>(d, "changelst")->selectedItems().isEmpty());
-            control(d, "peopleopt1")->click();
+            clickitem(d, "currentlst", 0);
+            QVERIFY(itemtexts(d, "changelst").size() == 3 && child<QListWidget>(d, "changelst")->selectedItems().isEmpty());
+            child(d, "peopleopt1")->click();
             QCOMPARE(details(d), QStringList{QStringLiteral("Heptonstall, Yorkshire, England (in 5 census events)")});
 
             // Confirm; "No" first changes nothing.
@@ -228,7 +208,7 @@ private slots:
                                                    "changed as a precaution to ensure there is no data loss. This "
                                                    "form will now close and the file will be reloaded.")
                                              : QStringLiteral("An error occurred"));
-                control<QPushButton>(d, "changebut")->click();
+                child<QPushButton>(d, "changebut")->click();
             });
             const toolend end = censusdatecheck(*open.file, p, nullptr);
             setinputfaultfortests(false);

@@ -5,6 +5,7 @@
 #include "tools/findfrm.h"
 
 #include "model/loadgedcom.h"
+#include "support/groupd_widgets.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 #include "tools/findindividual.h"
@@ -18,30 +19,9 @@ using namespace qmtest;
 
 namespace {
 
-template <class T = QPushButton>
-T* child(QWidget* w, const char* name)
-{
-    return w->findChild<T*>(QString::fromLatin1(name));
-}
-
 QString text(QWidget* d, const char* name)
 {
     return child<QLineEdit>(d, name)->text();
-}
-
-QStringList items(QWidget* d, const char* name)
-{
-    QStringList out;
-    auto* l = child<QListWidget>(d, name);
-    for (int i = 0; i < l->count(); ++i)
-        out << l->item(i)->text();
-    return out;
-}
-
-void clickitem(QWidget* d, const char* list, int row)
-{
-    auto* l = child<QListWidget>(d, list);
-    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(l->item(row)).center());
 }
 
 QStringList familytexts(mainfrm& w)
@@ -96,8 +76,8 @@ private slots:
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("lee, a"));
         QCOMPARE((QStringList{text(&d, "nametxt"), text(&d, "idtxt"), text(&d, "dobtxt"), text(&d, "placetxt")}),
                  (QStringList{"Lee, Ann", "1", "ABT 1850", "Leeds"}));
-        QCOMPARE(items(&d, "censuslst"), QStringList{"1881: aged 30 at York (4 High St)"});
-        QCOMPARE((QStringList{items(&d, "parentlst") + items(&d, "spouselst") + items(&d, "childrenlst")}),
+        QCOMPARE(itemtexts(&d, "censuslst"), QStringList{"1881: aged 30 at York (4 High St)"});
+        QCOMPARE((QStringList{itemtexts(&d, "parentlst") + itemtexts(&d, "spouselst") + itemtexts(&d, "childrenlst")}),
                  (QStringList{"Lee, Bob", "Lee, Bob", "Lee, Cy"}));
         QVERIFY(child(&d, "okbut")->isEnabled());
 
@@ -105,8 +85,8 @@ private slots:
         clickitem(&d, "spouselst", 0);
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
         QCOMPARE(text(&d, "dobtxt"), QString());
-        QCOMPARE(items(&d, "spouselst"), QStringList{"Lee, Ann"});
-        QCOMPARE(items(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
+        QCOMPARE(itemtexts(&d, "spouselst"), QStringList{"Lee, Ann"});
+        QCOMPARE(itemtexts(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("x"));
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
 
@@ -162,7 +142,7 @@ private slots:
             QVERIFY(!child(d, "okbut")->isEnabled());
             QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("ASHWORTH, JOHN (3"));
             QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
-            QCOMPARE(items(d, "spouselst"), QStringList{"Kershaw, Ellen"});
+            QCOMPARE(itemtexts(d, "spouselst"), QStringList{"Kershaw, Ellen"});
             QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/", "1 NAME Johnny /Ashworth/"));
             QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
         });
