@@ -92,8 +92,9 @@ TEST(Findcensus, OfficialDateAndTheReferenceFilledInOnlyWhileUntouched)
             found += QStringLiteral(" ref=") + r.referencetext.left(r.cursor) + u'|' + r.referencetext.mid(r.cursor);
         EXPECT_EQ(found + QStringLiteral(" last=") + r.lastrefprefix, QString::fromLatin1(c.found))
             << c.country << " " << c.year;
-        if (!r.error.isEmpty())
+        if (!r.error.isEmpty()) {
             EXPECT_EQ(r.error, "Serious Error - the year and country chosen are not supported by Quillmark - please "
                                "contact the author");
+        }
     }
 }
