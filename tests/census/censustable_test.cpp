@@ -5,6 +5,12 @@
 using namespace qm;
 using namespace Qt::StringLiterals;
 
+// Shows texts readably in failure messages.
+[[maybe_unused]] static void PrintTo(const QString& s, std::ostream* os)
+{
+    *os << '"' << s.toStdString() << '"';
+}
+
 TEST(Censustable, TheThirtyThreeCensusesInTheirFixedOrder)
 {
     // Country, year, official day, reference prefix. Canada's 1851 census was

@@ -18,6 +18,12 @@
 
 using namespace qm;
 
+// Shows texts readably in failure messages.
+[[maybe_unused]] static void PrintTo(const QString& s, std::ostream* os)
+{
+    *os << '"' << s.toStdString() << '"';
+}
+
 namespace {
 
 // Every value of a complete store as a current version writes it, in reading
