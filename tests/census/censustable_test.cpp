@@ -5,6 +5,12 @@
 using namespace qm;
 using namespace Qt::StringLiterals;
 
+// Shows texts readably in failure messages.
+[[maybe_unused]] static void PrintTo(const QString& s, std::ostream* os)
+{
+    *os << '"' << s.toStdString() << '"';
+}
+
 TEST(Censustable, TheThirtyThreeCensusesInTheirFixedOrder)
 {
     // Country, year, official day, reference prefix. Canada's 1851 census was
@@ -52,77 +58,49 @@ TEST(Censustable, YearListsAndLookupsTakeTheCountrysRows)
     EXPECT_FALSE(lookupcensus(u"USA"_s, 1851));
 }
 
-namespace {
-censuschoice choose(const QString& country, const QString& year, const QString& reference,
-                    const QString& lastprefix, bool autoreference = true)
+// A year chosen in the form: the official date, an error or not, the
+// reference field ("ref=" its new text, "|" the cursor, when it is set) and
+// the prefix the form then holds as filled in last.
+TEST(Findcensus, OfficialDateAndTheReferenceFilledInOnlyWhileUntouched)
 {
-    censuschoice c;
-    c.country = country;
-    c.yeartext = year;
-    c.autoreference = autoreference;
-    c.referencetext = reference;
-    c.lastrefprefix = lastprefix;
-    return c;
-}
-} // namespace
-
-TEST(Findcensus, OfficialDateOrError)
-{
-    auto r = findcensus(choose(u"Canada"_s, u"1851"_s, u""_s, u""_s, false));
-    EXPECT_EQ(r.date, "12 JAN 1852");
-    EXPECT_EQ(r.error, "");
-    EXPECT_FALSE(r.setreference);
-
-    r = findcensus(choose(u"UK"_s, u" 1881 "_s, u""_s, u""_s, false));
-    EXPECT_EQ(r.date, "3 APR 1881");
-
-    r = findcensus(choose(u"   "_s, u""_s, u""_s, u""_s));
-    EXPECT_EQ(r.date, "");
-    EXPECT_EQ(r.error, "");
-
-    for (const QString& year : {u"1850"_s, u"18x1"_s}) {
-        r = findcensus(choose(u"UK"_s, year, u""_s, u"RG9/"_s));
-        EXPECT_EQ(r.date, "");
-        EXPECT_EQ(r.error, "Serious Error - the year and country chosen are not supported by Quillmark - please "
-                           "contact the author");
-        EXPECT_FALSE(r.setreference);
-        EXPECT_EQ(r.lastrefprefix, "RG9/");
+    const struct {
+        const char* country;
+        const char* year;
+        const char* reference;
+        const char* lastprefix;
+        bool autoreference;
+        const char* found;
+    } cases[] = {
+        {"Canada", "1851", "", "", false, "12 JAN 1852 last="},
+        {"UK", " 1881 ", "", "", false, "3 APR 1881 last="},
+        {"   ", "", "", "", true, " last="},
+        {"UK", "1850", "", "RG9/", true, " error last=RG9/"},
+        {"UK", "18x1", "", "RG9/", true, " error last=RG9/"},
+        {"UK", "1861", "", "", true, "7 APR 1861 ref=RG9/| last=RG9/"},     // empty: the prefix goes in
+        {"UK", "1871", "RG9/", "RG9/", true, "2 APR 1871 ref=RG10/| last=RG10/"}, // the prefix filled in last
+        {"UK", "1881", "RG9/123", "RG9/", true, "3 APR 1881 last=RG9/"},    // typed into: left alone
+        {"UK", "1841", "  ", "RG9/", true, "6 JUN 1841 ref=HO107/| last=HO107/"}, // blank counts as empty
+        {"USA", "1880", "HO107/", "HO107/", true, "1 JUN 1880 ref=| last="},  // no prefixes: emptied
+        {"UK", "1861", "", "", false, "7 APR 1861 last="},                    // without "Auto Reference"
+    };
+    for (const auto& c : cases) {
+        censuschoice choice;
+        choice.country = QString::fromLatin1(c.country);
+        choice.yeartext = QString::fromLatin1(c.year);
+        choice.referencetext = QString::fromLatin1(c.reference);
+        choice.lastrefprefix = QString::fromLatin1(c.lastprefix);
+        choice.autoreference = c.autoreference;
+        const censusfound r = findcensus(choice);
+        QString found = r.date;
+        if (!r.error.isEmpty())
+            found += QStringLiteral(" error");
+        if (r.setreference)
+            found += QStringLiteral(" ref=") + r.referencetext.left(r.cursor) + u'|' + r.referencetext.mid(r.cursor);
+        EXPECT_EQ(found + QStringLiteral(" last=") + r.lastrefprefix, QString::fromLatin1(c.found))
+            << c.country << " " << c.year;
+        if (!r.error.isEmpty()) {
+            EXPECT_EQ(r.error, "Serious Error - the year and country chosen are not supported by Quillmark - please "
+                               "contact the author");
+        }
     }
-}
-
-TEST(Findcensus, AutoReferenceFillsOnlyUntouchedFields)
-{
-    // Empty field: the prefix goes in with the cursor after the slash.
-    auto r = findcensus(choose(u"UK"_s, u"1861"_s, u""_s, u""_s));
-    EXPECT_EQ(r.date, "7 APR 1861");
-    ASSERT_TRUE(r.setreference);
-    EXPECT_EQ(r.referencetext, "RG9/");
-    EXPECT_EQ(r.cursor, 4);
-    EXPECT_EQ(r.lastrefprefix, "RG9/");
-
-    // Still the prefix filled in last: replaced.
-    r = findcensus(choose(u"UK"_s, u"1871"_s, u"RG9/"_s, r.lastrefprefix));
-    ASSERT_TRUE(r.setreference);
-    EXPECT_EQ(r.referencetext, "RG10/");
-    EXPECT_EQ(r.cursor, 5);
-    EXPECT_EQ(r.lastrefprefix, "RG10/");
-
-    // Typed into: left alone.
-    r = findcensus(choose(u"UK"_s, u"1881"_s, u"RG9/123"_s, u"RG9/"_s));
-    EXPECT_EQ(r.date, "3 APR 1881");
-    EXPECT_FALSE(r.setreference);
-    EXPECT_EQ(r.lastrefprefix, "RG9/");
-
-    // Blank counts as empty; a country without prefixes empties the field.
-    r = findcensus(choose(u"UK"_s, u"1841"_s, u"  "_s, u"RG9/"_s));
-    EXPECT_EQ(r.referencetext, "HO107/");
-    r = findcensus(choose(u"USA"_s, u"1880"_s, u"HO107/"_s, u"HO107/"_s));
-    ASSERT_TRUE(r.setreference);
-    EXPECT_EQ(r.referencetext, "");
-    EXPECT_EQ(r.cursor, 0);
-    EXPECT_EQ(r.lastrefprefix, "");
-
-    // Without "Auto Reference" nothing is filled in.
-    r = findcensus(choose(u"UK"_s, u"1861"_s, u""_s, u""_s, false));
-    EXPECT_FALSE(r.setreference);
 }

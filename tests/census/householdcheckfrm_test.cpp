@@ -3,6 +3,7 @@
 // anyway" saves.
 #include "census/householdcheckfrm.h"
 
+#include "support/groupd_widgets.h"
 #include "support/mainfrmfixture.h"
 
 #include <QPlainTextEdit>
@@ -18,11 +19,6 @@ householdfinding finding(int row, findingkind kind, const char* message)
 {
     return {row, kind, kind == findingkind::unrelated ? findingseverity::information : findingseverity::warning,
             QString::fromUtf8(message)};
-}
-
-QPushButton* button(QWidget* w, const char* name)
-{
-    return w->findChild<QPushButton*>(QString::fromLatin1(name));
 }
 
 } // namespace
@@ -52,7 +48,7 @@ private slots:
             QCOMPARE(list->topLevelItem(1)->text(1), QStringLiteral("Note"));
             QCOMPARE(list->topLevelItem(0)->text(1), QStringLiteral("Warning"));
             QCOMPARE(list->topLevelItem(0)->text(2), found[0].message);
-            QVERIFY(button(&d, "backbut")->isDefault());
+            QVERIFY(child<QPushButton>(&d, "backbut")->isDefault());
             QCOMPARE(d.chosenrow(), 0);
             list->setCurrentItem(list->topLevelItem(1));
             QCOMPARE(d.chosenrow(), 3);
@@ -66,11 +62,11 @@ private slots:
                 return std::optional<int>(-99);
             return back;
         };
-        QCOMPARE(run([](QDialog* d) { button(d, "savebut")->click(); }), std::optional<int>());
+        QCOMPARE(run([](QDialog* d) { child(d, "savebut")->click(); }), std::optional<int>());
         QCOMPARE(run([](QDialog* d) {
                      auto* list = d->findChild<QTreeWidget*>();
                      QTest::keyClick(list, Qt::Key_Down);
-                     button(d, "backbut")->click();
+                     child(d, "backbut")->click();
                  }),
                  std::optional<int>(3));
         QCOMPARE(run([](QDialog* d) { QTest::keyClick(d, Qt::Key_Escape); }), std::optional<int>(0));
@@ -101,7 +97,7 @@ private slots:
             answers.expect(QStringLiteral("householdcheckfrm"), [&](QDialog* d) {
                 auto* list = d->findChild<QTreeWidget*>(QStringLiteral("findingslst"));
                 shown = list->topLevelItem(0)->text(0) + u' ' + list->topLevelItem(0)->text(2);
-                button(d, "backbut")->click();
+                child(d, "backbut")->click();
             });
             QPushButton* save = w.findChild<QPushButton*>(QStringLiteral("addbut"));
             save->click();
@@ -115,7 +111,7 @@ private slots:
         }
         {
             dialoganswers answers;
-            answers.expect(QStringLiteral("householdcheckfrm"), [](QDialog* d) { button(d, "savebut")->click(); });
+            answers.expect(QStringLiteral("householdcheckfrm"), [](QDialog* d) { child(d, "savebut")->click(); });
             w.findChild<QPushButton*>(QStringLiteral("addbut"))->click();
             QCOMPARE(answers.unexpected, 0);
             QVERIFY(readfile(file) != before);

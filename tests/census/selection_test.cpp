@@ -50,30 +50,23 @@ householdrows chosen(family& f, int n)
     return h;
 }
 
-// Ages shown in the visible rows, "" for empty rows.
-std::vector<QString> shownages(const householdrows& h)
+// The rows as the window shows them: the up arrow, the position of the top
+// row and the count chosen, the down arrow, then the ages in the visible
+// rows ("_" for a row in use without one, "." for a row not in use).
+std::string state(const householdrows& h)
 {
-    std::vector<QString> out;
-    for (const auto& r : h.rows)
-        out.push_back(r.age);
+    std::string out = (h.upshown() ? "^ " : "") + std::to_string(h.toprow) + "/"
+        + std::to_string(h.selectioncount) + (h.downshown() ? " v" : "") + ":";
+    for (const rowvalues& r : h.rows)
+        out += " " + (!r.shown() ? std::string(".") : r.age.isEmpty() ? std::string("_") : r.age.toStdString());
     return out;
 }
 
+// The visible rows hold what is stored for their individuals.
 void expectconsistent(const householdrows& h)
 {
-    // Rows may be hidden below (after scrolling up), never empty rows shown
-    // while rows are hidden above.
-    if (h.toprow >= 1) {
-        EXPECT_GE(h.selectioncount, h.toprow + 10);
-    }
-    for (int r = 0; r < 10; ++r) {
-        const int i = h.toprow + r;
-        if (i < h.selectioncount) {
-            EXPECT_EQ(h.rows[static_cast<size_t>(r)].age, h.selection[static_cast<size_t>(i)].age) << "row " << r;
-        } else {
-            EXPECT_FALSE(h.rows[static_cast<size_t>(r)].shown()) << "row " << r;
-        }
-    }
+    for (int r = 0; r < 10 && h.toprow + r < h.selectioncount; ++r)
+        EXPECT_EQ(h.rows[static_cast<size_t>(r)].age, h.selection[static_cast<size_t>(h.toprow + r)].age) << r;
 }
 
 } // namespace
@@ -106,42 +99,35 @@ TEST(HouseholdRows, EleventhScrollsAndScrollingKeepsTypedValues)
 {
     family f;
     householdrows h = chosen(f, 10);
-    EXPECT_FALSE(h.upshown());
+    EXPECT_EQ(state(h), "0/10: 1 2 3 4 5 6 7 8 9 10");
     const int32_t k = f.add("Eleventh");
     EXPECT_EQ(h.add(f.index.people[static_cast<size_t>(k)], k), 9);
-    EXPECT_EQ(h.toprow, 1);
-    EXPECT_TRUE(h.upshown());
-    EXPECT_FALSE(h.downshown());
-    EXPECT_EQ(h.rows[0].age, "2");
+    EXPECT_EQ(state(h), "^ 1/11: 2 3 4 5 6 7 8 9 10 _");
     h.rows[9].age = QStringLiteral("11");
     h.storerows();
     h.scrollup();
-    EXPECT_EQ(h.toprow, 0);
-    EXPECT_TRUE(h.downshown());
-    EXPECT_EQ(h.rows[0].age, "1");
+    EXPECT_EQ(state(h), "0/11 v: 1 2 3 4 5 6 7 8 9 10");
     h.rows[0].age = QStringLiteral("99"); // typed while scrolled up
     h.storerows();
     h.scrolldown();
-    EXPECT_EQ(h.rows[9].age, "11");
+    EXPECT_EQ(state(h), "^ 1/11: 2 3 4 5 6 7 8 9 10 11");
     h.scrollup();
-    EXPECT_EQ(h.rows[0].age, "99");
+    EXPECT_EQ(state(h), "0/11 v: 99 2 3 4 5 6 7 8 9 10");
     expectconsistent(h);
 }
 
-TEST(HouseholdRows, DeleteWithNothingHiddenAbove)
+TEST(HouseholdRows, Delete)
 {
     family o;
     householdrows only = chosen(o, 1);
     EXPECT_EQ(only.deleterow(0), -1);
-    EXPECT_EQ(only.selectioncount, 0);
-    EXPECT_FALSE(only.rows[0].shown());
+    EXPECT_EQ(state(only), "0/0: . . . . . . . . . .");
 
     family f;
     householdrows h = chosen(f, 4);
     h.rows[3].age = QStringLiteral("44"); // typed but not stored: rows move as they are
     EXPECT_EQ(h.deleterow(1), 3);
-    EXPECT_EQ(h.selectioncount, 3);
-    EXPECT_EQ(shownages(h), (std::vector<QString>{"1", "3", "44", "", "", "", "", "", "", ""}));
+    EXPECT_EQ(state(h), "0/3: 1 3 44 . . . . . . .");
     h.storerows();
     expectconsistent(h);
 
@@ -150,37 +136,28 @@ TEST(HouseholdRows, DeleteWithNothingHiddenAbove)
     householdrows s = chosen(g, 12);
     s.scrollup();
     s.scrollup();
-    ASSERT_EQ(s.toprow, 0);
-    ASSERT_TRUE(s.downshown());
+    ASSERT_EQ(state(s), "0/12 v: 1 2 3 4 5 6 7 8 9 10");
     s.deleterow(0);
-    EXPECT_EQ(s.selectioncount, 11);
-    EXPECT_EQ(s.rows[0].age, "2");
-    EXPECT_EQ(s.rows[9].age, "11");
-    EXPECT_TRUE(s.downshown());
+    EXPECT_EQ(state(s), "0/11 v: 2 3 4 5 6 7 8 9 10 11");
     s.storerows();
     expectconsistent(s);
     s.scrolldown();
-    EXPECT_EQ(s.rows[9].age, "12");
+    EXPECT_EQ(state(s), "^ 1/11: 3 4 5 6 7 8 9 10 11 12");
     expectconsistent(s);
-}
 
-TEST(HouseholdRows, DeleteWithRowsHiddenAbovePullsWindowDown)
-{
-    family f;
-    householdrows h = chosen(f, 12); // toprow 2
-    ASSERT_EQ(h.toprow, 2);
-    EXPECT_EQ(h.deleterow(4), 11); // the individual shown last
-    EXPECT_EQ(h.toprow, 1);
-    EXPECT_EQ(h.selectioncount, 11);
-    EXPECT_EQ(shownages(h), (std::vector<QString>{"2", "3", "4", "5", "6", "8", "9", "10", "11", "12"}));
-    h.storerows();
-    expectconsistent(h);
-    h.deleterow(0);
-    EXPECT_EQ(h.toprow, 0);
-    EXPECT_FALSE(h.upshown());
-    h.storerows();
-    expectconsistent(h);
-    EXPECT_EQ(h.selection.size(), 10u);
+    // Rows hidden above: the window is pulled down.
+    family d;
+    householdrows t = chosen(d, 12);
+    ASSERT_EQ(state(t), "^ 2/12: 3 4 5 6 7 8 9 10 11 12");
+    EXPECT_EQ(t.deleterow(4), 11); // the individual shown last
+    EXPECT_EQ(state(t), "^ 1/11: 2 3 4 5 6 8 9 10 11 12");
+    t.storerows();
+    expectconsistent(t);
+    t.deleterow(0);
+    EXPECT_EQ(state(t), "0/10: 1 3 4 5 6 8 9 10 11 12");
+    t.storerows();
+    expectconsistent(t);
+    EXPECT_EQ(t.selection.size(), 10u);
 }
 
 TEST(ImmediateFamily, KindsAndOrder)

@@ -53,24 +53,21 @@ TEST(OptionsCertainty, AssessmentButtonsRecordPrimaryToUnreliable)
 
 TEST(OptionsEnabling, DependentControlsFollowTheirBoxes)
 {
+    // Enabled or not: log path, entry date today, image 2 event, separator, auto reference.
+    const auto enabled = [](const settings& s) {
+        const optionsenabling e = enablingof(s);
+        return std::string{char('0' + e.logpath), char('0' + e.entrydatetoday), char('0' + e.image2event),
+                           char('0' + e.separator), char('0' + e.autoreference)};
+    };
     settings s = defaultsettings();
     s.keeplog = s.opt1entrydate = s.requestimages2 = s.alternateseparator = false;
     s.country = "USA";
-    optionsenabling e = enablingof(s);
-    EXPECT_FALSE(e.logpath);
-    EXPECT_FALSE(e.entrydatetoday); // method 1 without the entry date
-    EXPECT_TRUE(e.image2event);
-    EXPECT_FALSE(e.separator);
-    EXPECT_FALSE(e.autoreference); // UK only
-
+    EXPECT_EQ(enabled(s), "00100"); // method 1 without the entry date; auto reference is the UK's only
     s.fullentry = false; // method 2
-    e = enablingof(s);
-    EXPECT_TRUE(e.entrydatetoday);
-    EXPECT_FALSE(e.image2event);
+    EXPECT_EQ(enabled(s), "01000");
     s.requestimages2 = s.keeplog = s.alternateseparator = true;
     s.country = "UK";
-    e = enablingof(s);
-    EXPECT_TRUE(e.image2event && e.logpath && e.separator && e.autoreference);
+    EXPECT_EQ(enabled(s), "11111");
 }
 
 TEST(OptionsDefaults, DefaultSettingsButtonKeepsWhatItDoesNotSet)

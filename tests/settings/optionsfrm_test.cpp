@@ -1,6 +1,8 @@
 // End-to-end tests of the options dialog on the offscreen platform: opened at
 // first start and when the paths fail their checks, and from "Options..." of
-// the main window, answered through its own controls.
+// the main window, answered through its own controls. What Save checks and
+// writes is the options' own tests' (options_test); here what the controls
+// pass to it and what the windows do with the result.
 #include "settings/optionsfrm.h"
 
 #include "app/mainfrm.h"
@@ -31,12 +33,29 @@ QString native(const QString& path)
     return QDir::toNativeSeparators(path);
 }
 
-int questions(const scriptedprompts& p)
+// Runs `open` and `body` in the options dialog it opens; a dialog left open
+// is cancelled. False when the dialog did not open, or another did.
+bool inoptions(const std::function<bool()>& open, const std::function<void(optionsfrm&)>& body)
 {
-    int n = 0;
-    for (const auto& shown : p.history())
-        n += shown.m.title == QLatin1String("Save Options");
-    return n;
+    dialoganswers answers;
+    bool shown = false;
+    answers.expect(QStringLiteral("optionsfrm"), [&](QDialog* d) {
+        shown = true;
+        body(*static_cast<optionsfrm*>(d));
+        if (d->isVisible())
+            d->reject();
+    });
+    return open() && shown && answers.unexpected == 0;
+}
+
+bool inoptions(mainfrm& w, const std::function<void(optionsfrm&)>& body)
+{
+    return inoptions(
+        [&] {
+            w.findChild<QAction*>(QStringLiteral("optionsmen"))->trigger();
+            return true;
+        },
+        body);
 }
 
 } // namespace
@@ -47,12 +66,12 @@ class optionsfrm_test : public QObject {
 private:
     windowfiles files_;
 
-    // A start of the program on a copy of the sample: with `s` written to the
-    // store first, or with an empty store. `script` queues the prompts after
-    // the default-file question; `dialog` is run in the options dialog when
-    // it opens at start (it is cancelled afterwards if left open).
-    std::unique_ptr<session> begin(const settings* s, const std::function<void(scriptedprompts&)>& script,
-                                   const std::function<void(optionsfrm&, session&)>& dialog, bool& shown)
+    // A start of the program on a copy of the sample, with `s` written to the
+    // store first (or an empty store), the default-file question answered No,
+    // a message at start when `atstart` is given, and `body` run in the
+    // options dialog that opens at start.
+    std::unique_ptr<session> started(const settings* s, const std::function<void(optionsfrm&, session&)>& body,
+                                     const QString& atstart = {})
     {
         auto r = std::make_unique<session>(files_.ini(), false);
         if (s) {
@@ -61,43 +80,20 @@ private:
         }
         r->make();
         r->prompts.expect(answer::no, QStringLiteral("by default"));
-        script(r->prompts);
-        dialoganswers answers;
-        shown = false;
-        answers.expect(QStringLiteral("optionsfrm"), [&](QDialog* d) {
-            shown = true;
-            dialog(*static_cast<optionsfrm*>(d), *r);
-            if (d->isVisible())
-                d->reject();
-        });
-        if (!r->w->start({QLatin1Char('"') + files_.sample() + QLatin1Char('"')}))
-            return nullptr;
-        return r;
+        if (!atstart.isEmpty())
+            r->prompts.expect(answer::ok, atstart);
+        const bool ok = inoptions([&] { return r->w->start({QLatin1Char('"') + files_.sample() + QLatin1Char('"')}); },
+                                  [&](optionsfrm& f) { body(f, *r); });
+        return ok ? std::move(r) : nullptr;
     }
 
-    // Opens "Options..." and runs `body` in the dialog; a dialog left open is
-    // cancelled. False when the dialog did not open.
-    static bool inoptions(mainfrm& w, const std::function<void(optionsfrm&)>& body)
-    {
-        dialoganswers answers;
-        bool shown = false;
-        answers.expect(QStringLiteral("optionsfrm"), [&](QDialog* d) {
-            shown = true;
-            body(*static_cast<optionsfrm*>(d));
-            if (d->isVisible())
-                d->reject();
-        });
-        w.findChild<QAction*>(QStringLiteral("optionsmen"))->trigger();
-        return shown && answers.unexpected == 0;
-    }
-
-    static settings withpaths(const QString& folder)
+    settings withpaths()
     {
         settings s = defaultsettings();
-        s.logpath = native(folder + QStringLiteral("/censuslog.txt"));
+        s.logpath = native(files_.filepath(QStringLiteral("censuslog.txt")));
         // The census log is never kept among the backups.
-        QDir().mkpath(folder + QStringLiteral("/start"));
-        s.backupfolder = native(folder + QStringLiteral("/start"));
+        QDir().mkpath(files_.filepath(QStringLiteral("start")));
+        s.backupfolder = native(files_.filepath(QStringLiteral("start")));
         return s;
     }
 
@@ -112,8 +108,7 @@ private slots:
     // cannot be left without saving; Save writes the store.
     void firststart()
     {
-        bool shown = false;
-        auto s = begin(nullptr, [](scriptedprompts&) {}, [&](optionsfrm& f, session& run) {
+        auto s = started(nullptr, [&](optionsfrm& f, session& run) {
             QVERIFY(!f.Cancelbut->isEnabled());
             QCOMPARE(f.SSTab1->currentIndex(), 0);
             QCOMPARE(f.findChild<QGroupBox*>(QStringLiteral("idonlyfra"))->title(),
@@ -131,17 +126,13 @@ private slots:
             f.methodopt[0]->click();
             f.savebut->click();
             QVERIFY(!f.isVisible());
-        }, shown);
+        });
         QVERIFY(s);
-        QVERIFY(shown);
         QCOMPARE(s->prompts.unexpected(), 0);
-        mainfrm& w = *s->w;
-        QVERIFY(!w.firststart());
-        QVERIFY(w.currentsettings().occage);
+        QVERIFY(!s->w->firststart());
+        QVERIFY(s->w->currentsettings().occage);
         QCOMPARE(s->read("Occ Age"), QStringLiteral("1"));
-        QCOMPARE(w.index()->people.size(), size_t(40));
-        QCOMPARE(questions(s->prompts), 1);
-        QCOMPARE(s->prompts.history().back().m.defaultanswer, answer::no);
+        QCOMPARE(s->w->index()->people.size(), size_t(40));
     }
 
     // A backup folder that is gone: the message at start, then the dialog,
@@ -149,46 +140,44 @@ private slots:
     // which refuses a folder that is not there); nothing is written before.
     void pathsfailatstart()
     {
-        settings bad = withpaths(files_.path());
+        settings bad = withpaths();
         bad.backupfolder = files_.filepath(QStringLiteral("gone"));
-        bool shown = false;
-        auto s = begin(&bad, [&](scriptedprompts& p) { p.expect(answer::ok, QStringLiteral("does not exist. ")); },
-                       [&](optionsfrm& f, session& run) {
-                           f.occagechk->click();
-                           run.prompts.expect(answer::ok, QStringLiteral("does not exist. "));
-                           f.savebut->click();
-                           QVERIFY(f.isVisible());
-                           // The folder is chosen, never typed; one that is not there is refused.
-                           QVERIFY(f.folderpathtxt->isReadOnly());
-                           run.prompts.expectfile(files_.filepath(QStringLiteral("nothere")));
-                           run.prompts.expect(answer::ok, QStringLiteral(
-                                                  "You are not able to select that location for the backup folder."));
-                           f.folderpathbut->click();
-                           const QString start = files_.filepath(QStringLiteral("start"));
-                           run.prompts.expectfile(start + QLatin1Char('/'));
-                           f.folderpathbut->click();
-                           QCOMPARE(f.folderpathtxt->text(), native(start + QLatin1Char('/')));
-                           f.savebut->click();
-                           QVERIFY(!f.isVisible());
-                       },
-                       shown);
+        const QString start = files_.filepath(QStringLiteral("start"));
+        auto s = started(&bad, [&](optionsfrm& f, session& run) {
+            f.occagechk->click();
+            run.prompts.expect(answer::ok, QStringLiteral("does not exist. "));
+            f.savebut->click();
+            QVERIFY(f.isVisible());
+            // The folder is chosen, never typed; one that is not there is refused.
+            QVERIFY(f.folderpathtxt->isReadOnly());
+            run.prompts.expectfile(files_.filepath(QStringLiteral("nothere")));
+            run.prompts.expect(answer::ok,
+                               QStringLiteral("You are not able to select that location for the backup folder."));
+            f.folderpathbut->click();
+            run.prompts.expectfile(start + QLatin1Char('/'));
+            f.folderpathbut->click();
+            QCOMPARE(f.folderpathtxt->text(), native(start + QLatin1Char('/')));
+            f.savebut->click();
+            QVERIFY(!f.isVisible());
+        }, QStringLiteral("does not exist. "));
         QVERIFY(s);
-        QVERIFY(shown);
         QCOMPARE(s->prompts.unexpected(), 0);
         QVERIFY(!s->w->firststart());
-        QCOMPARE(s->read("Backup Folder"), native(files_.filepath(QStringLiteral("start"))));
+        QCOMPARE(s->read("Backup Folder"), native(start));
         QCOMPARE(s->read("Occ Age"), QStringLiteral("1"));
     }
 
+    // From "Options...": a declined method change keeps the dialog and the
+    // entry; a change that needs no reload keeps the entry; method and
+    // country changed read the file again for them.
     void methodchange()
     {
-        const settings paths = withpaths(files_.path());
+        const settings paths = withpaths();
         auto s = files_.opened(files_.sample(), &paths);
         QVERIFY(s);
         mainfrm& w = *s->w;
         chooseyear(w, QStringLiteral("1881"));
         clickid(w, peoplelist(w), 11);
-        QCOMPARE(w.household().selectioncount, 1);
 
         QVERIFY(inoptions(w, [&](optionsfrm& f) {
             f.SSTab1->setCurrentIndex(1);
@@ -204,9 +193,7 @@ private slots:
         }));
         QVERIFY(w.currentsettings().fullentry);
         QCOMPARE(w.household().selectioncount, 1);
-        QCOMPARE(questions(s->prompts), 1);
 
-        // A change that needs no reload keeps the entry.
         QVERIFY(inoptions(w, [&](optionsfrm& f) {
             f.occagechk->click();
             QVERIFY(f.householdcheckchk->isChecked());
@@ -214,13 +201,10 @@ private slots:
             f.savebut->click();
             QVERIFY(!f.isVisible());
         }));
-        QVERIFY(w.currentsettings().occage);
-        QVERIFY(!w.currentsettings().householdcheck);
+        QVERIFY(w.currentsettings().occage && !w.currentsettings().householdcheck);
         QCOMPARE(s->read("Household Check"), QStringLiteral("0"));
         QCOMPARE(w.household().selectioncount, 1);
 
-        // Method and country changed: only the method question, then the file
-        // is read again for the new method and country.
         QVERIFY(inoptions(w, [&](optionsfrm& f) {
             QVERIFY(f.methodopt[0]->isChecked());
             f.methodopt[1]->click();
@@ -230,7 +214,6 @@ private slots:
             f.savebut->click();
             QVERIFY(!f.isVisible());
         }));
-        QCOMPARE(questions(s->prompts), 2);
         QCOMPARE(s->prompts.unexpected(), 0);
         QVERIFY(!w.currentsettings().fullentry);
         QCOMPARE(w.currentsettings().country, QStringLiteral("USA"));
@@ -238,15 +221,18 @@ private slots:
         QCOMPARE(w.panel()->mode, 1);
         QVERIFY(!w.findChild<QAction*>(QStringLiteral("attachbut"))->isEnabled());
         QCOMPARE(w.panel()->yearcom->itemText(0), fillyears(QStringLiteral("USA")).front());
-        QCOMPARE(s->read("Country"), QStringLiteral("USA"));
     }
 
-    void emptyseparator()
+    // An empty separator: the tab and the box are shown with the message; the
+    // log: its box follows "Keep Log", the chooser's refusal and Cancel keep
+    // the path, the log file is made and "View Log" follows.
+    void separatorandlog()
     {
-        const settings paths = withpaths(files_.path());
+        const settings paths = withpaths();
         auto s = files_.opened(files_.sample(), &paths);
         QVERIFY(s);
-        QVERIFY(inoptions(*s->w, [&](optionsfrm& f) {
+        mainfrm& w = *s->w;
+        QVERIFY(inoptions(w, [&](optionsfrm& f) {
             QVERIFY(!f.separatortxt->isEnabled());
             f.SSTab1->setCurrentIndex(1);
             f.separatorchk->click();
@@ -262,48 +248,30 @@ private slots:
             QVERIFY(f.SSTab1->currentWidget()->isAncestorOf(f.separatortxt));
             QCOMPARE(f.focusWidget(), f.separatortxt);
             QTest::keyClicks(f.separatortxt, QStringLiteral("|"));
-            f.savebut->click();
-            QVERIFY(!f.isVisible());
-        }));
-        QCOMPARE(s->prompts.unexpected(), 0);
-        QCOMPARE(s->read("Alternate Separator Character"), QStringLiteral("|"));
-        QCOMPARE(s->w->currentsettings().alternateseparatorcharacter, QStringLiteral("|"));
-    }
 
-    void logfile()
-    {
-        const settings paths = withpaths(files_.path());
-        auto s = files_.opened(files_.sample(), &paths);
-        QVERIFY(s);
-        mainfrm& w = *s->w;
-        const QString nolog = native(files_.filepath(QStringLiteral("nolog.txt")));
-        QVERIFY(inoptions(w, [&](optionsfrm& f) {
             QVERIFY(f.pathtxt->isEnabled() && f.pathbut->isEnabled());
             f.keeplogchk->click();
             QVERIFY(!f.pathtxt->isEnabled() && !f.pathbut->isEnabled());
-            f.pathtxt->setText(nolog);
             f.savebut->click();
             QVERIFY(!f.isVisible());
         }));
-        QVERIFY(!QFileInfo::exists(nolog));
+        QCOMPARE(s->w->currentsettings().alternateseparatorcharacter, QStringLiteral("|"));
         QVERIFY(!w.findChild<QAction*>(QStringLiteral("viewlogmen"))->isEnabled());
 
         const QString mylog = native(files_.filepath(QStringLiteral("mylog.txt")));
         QVERIFY(inoptions(w, [&](optionsfrm& f) {
+            const QString before = f.pathtxt->text();
             f.keeplogchk->click();
             QVERIFY(f.pathtxt->isEnabled() && f.pathbut->isEnabled());
             s->prompts.expectfile(files_.filepath(QStringLiteral("family.GED")));
             s->prompts.expect(answer::ok, gedcomlogmessage());
             f.pathbut->click();
-            QCOMPARE(f.pathtxt->text(), nolog);
             s->prompts.expectfile(std::nullopt);
             f.pathbut->click();
-            QCOMPARE(f.pathtxt->text(), nolog);
+            QCOMPARE(f.pathtxt->text(), before);
             s->prompts.expectfile(files_.filepath(QStringLiteral("mylog")));
             f.pathbut->click();
             QCOMPARE(f.pathtxt->text(), mylog);
-
-            f.pathtxt->setText(QStringLiteral("  ") + mylog);
             f.savebut->click();
             QVERIFY(!f.isVisible());
         }));
@@ -317,15 +285,9 @@ private slots:
     // settings in use. The title template's example and placeholders; Help.
     void defaultsandtitle()
     {
-        settings custom = withpaths(files_.path());
+        settings custom = withpaths();
         custom.certainty = 2;
-        custom.occage = true;
-        custom.marriagecondition = true;
-        custom.alternateseparator = true;
-        custom.alternateseparatorcharacter = QStringLiteral("|");
         custom.title = QStringLiteral("{YEAR}");
-        custom.sourcetype = QStringLiteral("Return");
-        custom.keeplog = false;
         custom.opt1entrydate = false;
         auto s = files_.opened(files_.sample(), &custom);
         QVERIFY(s);
@@ -336,7 +298,6 @@ private slots:
             f.opt1entrydatechk->click();
             QVERIFY(f.entrydatetodaychk->isEnabled());
             QCOMPARE(f.titleoutputlab->text(), QStringLiteral("1851"));
-            // What the button sets and keeps, and the example: the options' own tests.
             f.defaultbut->click();
             QVERIFY(f.Norecordopt->isChecked());
             QCOMPARE(f.titletxt->text(), defaulttitletemplate());
@@ -375,14 +336,13 @@ private slots:
         scriptedprompts prompts;
         auto store = settingsstore::onfile(files_.ini());
         int donations = 0;
-        optionsfrm f(prompts, *store, withpaths(files_.path()), [&] { ++donations; });
+        optionsfrm f(prompts, *store, withpaths(), [&] { ++donations; });
         f.show();
         QVERIFY(QTest::qWaitForWindowExposed(&f));
         f.donatebut->click();
         QCOMPARE(donations, 1);
         // Clicking a wrapped caption clicks its box.
-        QLabel* caption = f.findChild<QLabel*>(QStringLiteral("IDonlychklab"));
-        QTest::mouseClick(caption, Qt::LeftButton);
+        QTest::mouseClick(f.findChild<QLabel*>(QStringLiteral("IDonlychklab")), Qt::LeftButton);
         QVERIFY(f.IDonlychk->isChecked());
 
         for (QWidget* c : f.findChildren<QWidget*>()) {

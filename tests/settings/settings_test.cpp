@@ -1,3 +1,6 @@
+// The settings store: each value read by its rules (a value not accepted
+// resets its group and every later group), the values outside the groups,
+// and the values a save writes.
 #include "settings/settings.h"
 
 #include "platform/settingsstore.h"
@@ -14,6 +17,12 @@
 #include <vector>
 
 using namespace qm;
+
+// Shows texts readably in failure messages.
+[[maybe_unused]] static void PrintTo(const QString& s, std::ostream* os)
+{
+    *os << '"' << s.toStdString() << '"';
+}
 
 namespace {
 
@@ -35,6 +44,23 @@ std::vector<std::pair<QString, QString>> fullstore()
     };
 }
 
+// Every value of s as "Name=text" (the text a save writes) in reading order,
+// then those a save does not write: whole settings in one comparison.
+QStringList values(const settings& s)
+{
+    QTemporaryDir dir;
+    auto store = settingsstore::onfile(dir.filePath("values.ini"));
+    savesettings(*store, s);
+    saveflagsettings(*store, s);
+    QStringList out = settingnames() << QStringLiteral("Household Check");
+    for (QString& name : out)
+        name += u'=' + store->read(name).value_or(QStringLiteral("(none)"));
+    return out << QStringLiteral("Count=%1").arg(s.count) << QStringLiteral("Image Folder=") + s.imagefolder
+               << QStringLiteral("Image Option=") + s.imageoption
+               << QStringLiteral("Rename File=%1").arg(int(s.renamefile))
+               << QStringLiteral("first start=%1").arg(int(s.firststart));
+}
+
 class SettingsTest : public ::testing::Test {
 protected:
     static void SetUpTestSuite() { QStandardPaths::setTestModeEnabled(true); }
@@ -46,19 +72,30 @@ protected:
         store = settingsstore::onfile(path);
     }
 
-    void fill(const std::vector<std::pair<QString, QString>>& values)
+    // The full store, with one value replaced, or left out when `text` is null.
+    void fill(const QString& name = {}, const char* text = nullptr)
     {
-        for (const auto& [name, text] : values)
-            store->write(name, text);
+        for (const auto& [n, t] : fullstore())
+            if (n != name)
+                store->write(n, t);
+            else if (text)
+                store->write(n, QString::fromUtf8(text));
     }
-    void fillexcept(const QString& left, const QString& replacement = {}, bool drop = true)
+
+    // The values of the full store read, with every value from `first` on
+    // reset to its default and the options due at start.
+    static QStringList resetfrom(const QString& first)
     {
-        for (const auto& [name, text] : fullstore()) {
-            if (name != left)
-                store->write(name, text);
-            else if (!drop)
-                store->write(name, replacement);
-        }
+        QTemporaryDir other;
+        auto full = settingsstore::onfile(other.filePath("full.ini"));
+        for (const auto& [n, t] : fullstore())
+            full->write(n, t);
+        QStringList out = values(loadsettings(*full).values);
+        const QStringList defaults = values(defaultsettings());
+        for (qsizetype i = settingnames().indexOf(first); i < settingnames().size(); ++i)
+            out[i] = defaults[i];
+        out.last() = QStringLiteral("first start=1");
+        return out;
     }
 
     QTemporaryDir dir;
@@ -66,41 +103,21 @@ protected:
     std::unique_ptr<settingsstore> store;
 };
 
-void expectgroupsfrom7default(const settings& s)
-{
-    const settings d = defaultsettings();
-    EXPECT_EQ(s.flaguse, d.flaguse);
-    EXPECT_EQ(s.occplace, d.occplace);
-    EXPECT_EQ(s.title, defaulttitletemplate());
-    EXPECT_EQ(s.asid, d.asid);
-    EXPECT_EQ(s.occscholar, d.occscholar);
-    EXPECT_EQ(s.birthsecondaryevidence, d.birthsecondaryevidence);
-    EXPECT_EQ(s.alternateseparatorcharacter, QStringLiteral("-"));
-    EXPECT_EQ(s.nosourcetextwarning, d.nosourcetextwarning);
-}
-
 TEST_F(SettingsTest, NoStoreGivesDefaultsWritesFlagValuesAndAsksForOptions)
 {
     const settingsload l = loadsettings(*store);
     const settings& s = l.values;
-    EXPECT_TRUE(s.fullentry);
-    EXPECT_FALSE(s.sourceinnote);
-    EXPECT_TRUE(s.keeplog);
-    EXPECT_EQ(s.logpath, defaultlogpath());
-    EXPECT_TRUE(s.logpath.endsWith(QDir::toNativeSeparators("Quillmark/censuslog.txt")));
-    EXPECT_EQ(s.country, "UK");
-    EXPECT_TRUE(s.birthdate);
+    settings declared; // the defaults as declared, with the program folder's paths
+    declared.logpath = defaultlogpath();
+    declared.backupfolder = defaultbackupfolder();
+    declared.firststart = true;
+    EXPECT_EQ(values(s), values(declared));
+    EXPECT_TRUE(s.fullentry && s.keeplog && s.birthdate && s.requestimage && !s.sourceinnote && !s.renamefile);
+    EXPECT_EQ(QStringList({s.country, s.sourcetype, s.title, s.alternateseparatorcharacter, s.imageoption}),
+              QStringList({"UK", "Census", defaulttitletemplate(), "-", "0"}));
     EXPECT_EQ(s.certainty, -1);
-    EXPECT_EQ(s.sourcetype, "Census");
-    EXPECT_TRUE(s.requestimage);
-    EXPECT_EQ(s.backupfolder, defaultbackupfolder());
+    EXPECT_TRUE(s.logpath.endsWith(QDir::toNativeSeparators("Quillmark/censuslog.txt")));
     EXPECT_TRUE(QDir(programfolder()).exists());
-    expectgroupsfrom7default(s);
-    EXPECT_EQ(s.count, 0);
-    EXPECT_EQ(s.imagefolder, "");
-    EXPECT_EQ(s.imageoption, "0");
-    EXPECT_FALSE(s.renamefile);
-    EXPECT_TRUE(s.firststart);
     EXPECT_FALSE(l.pathchecksdue);
     EXPECT_EQ(store->read("Flag Use"), QString("0"));
     EXPECT_EQ(store->read("Flag Check"), QString("0"));
@@ -129,7 +146,7 @@ TEST(ProgramFolder, IsQuillmarkInTheUsersLocalApplicationData)
 // trip of SaveWritesEveryDialogValueTrimmedAndReadsBack; here the others.
 TEST_F(SettingsTest, CompleteStoreIsReadWithConversions)
 {
-    fill(fullstore());
+    fill();
     const settingsload l = loadsettings(*store);
     const settings& s = l.values;
     EXPECT_EQ(s.logpath, "/tmp/my log.txt");
@@ -142,86 +159,59 @@ TEST_F(SettingsTest, CompleteStoreIsReadWithConversions)
     EXPECT_TRUE(l.pathchecksdue);
 }
 
-TEST_F(SettingsTest, BooleanTextsOtherThanZeroOrOne)
-{
-    fillexcept("Full Entry", "x", false);
-    store->write("Birthdate", "x");
-    store->write("Occ Scholar", " ");
-    const settings s = loadsettings(*store).values;
-    EXPECT_TRUE(s.fullentry);
-    EXPECT_FALSE(s.birthdate);
-    EXPECT_FALSE(s.occscholar);
-    EXPECT_FALSE(s.firststart);
-}
-
+// A value not accepted (or absent) takes its default with every later value
+// of its group and of the later groups; the earlier groups keep what was read.
 TEST_F(SettingsTest, RejectedValueResetsItsGroupAndAllLaterGroups)
 {
-    fill(fullstore());
-    store->write("Birthdate", "10");
-    const settingsload l = loadsettings(*store);
-    const settings& s = l.values;
-    // group 1 keeps what was read
-    EXPECT_FALSE(s.fullentry);
-    EXPECT_TRUE(s.sourceinnote);
-    EXPECT_EQ(s.logpath, "/tmp/my log.txt");
-    // group 2, read before the failing value, is reset as a whole
-    EXPECT_EQ(s.country, "UK");
-    EXPECT_TRUE(s.birthdate);
-    EXPECT_EQ(s.certainty, -1);
-    EXPECT_FALSE(s.residence);
-    EXPECT_EQ(s.sourcetype, "Census");
-    // "Request Image" follows the method read in group 1
-    EXPECT_FALSE(s.requestimage);
-    EXPECT_FALSE(s.idonly);
-    EXPECT_EQ(s.backupfolder, defaultbackupfolder());
-    expectgroupsfrom7default(s);
-    EXPECT_TRUE(s.firststart);
-    EXPECT_FALSE(l.pathchecksdue);
-    // group 7 took defaults, so the flag values are written back
-    EXPECT_EQ(store->read("Flag Use"), QString("0"));
-    EXPECT_EQ(store->read("Flag Check"), QString("0"));
+    const struct {
+        const char* name;
+        const char* text; // null: absent
+        const char* reset; // the first value reset
+        bool flagswritten; // group 7 reset: its flag values written back
+    } cases[] = {
+        {"Birthdate", "10", "Country", true},               // one character only
+        {"Log Path", "", "Full Entry", true},               // one at least
+        {"Backup Folder", "C", "Backup Folder", true},      // two at least
+        {"Alternate Separator Character", "ab", "Alternate Separator", false}, // at most one
+        {"No Source Text Warning", nullptr, "Alternate Separator", false}, // an older version's store
+    };
+    int n = 0;
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.name);
+        store = settingsstore::onfile(dir.filePath(QStringLiteral("case%1.ini").arg(++n)));
+        fill(c.name, c.text);
+        const settingsload l = loadsettings(*store);
+        QStringList expected = resetfrom(c.reset);
+        if (QLatin1String(c.reset) == "Country") // "Request Image" follows the method read in group 1
+            expected[settingnames().indexOf("Request Image")] = QStringLiteral("Request Image=0");
+        EXPECT_EQ(values(l.values), expected);
+        EXPECT_EQ(l.defaulted, settingnames().mid(settingnames().indexOf(c.reset)));
+        EXPECT_FALSE(l.pathchecksdue);
+        EXPECT_EQ(store->read("Flag Use"), QString(c.flagswritten ? "0" : "1"));
+    }
 }
 
-TEST_F(SettingsTest, TextValueLengthRules)
+// Texts that are accepted without being the usual ones.
+TEST_F(SettingsTest, BooleanAndEmptyTextsAccepted)
 {
-    {
-        fillexcept("Backup Folder", "C", false);
-        const settings s = loadsettings(*store).values;
-        EXPECT_TRUE(s.idonly);                     // group 5 read
-        EXPECT_EQ(s.backupfolder, defaultbackupfolder()); // group 6 reset
-        EXPECT_FALSE(s.flaguse);
-        EXPECT_TRUE(s.firststart);
-    }
-    {
-        fillexcept("Alternate Separator Character", "", false);
-        store->write("Source Type", "");
-        const settings s = loadsettings(*store).values;
-        EXPECT_EQ(s.alternateseparatorcharacter, "");
-        EXPECT_EQ(s.sourcetype, "");
-        EXPECT_FALSE(s.firststart);
-        store->write("Alternate Separator Character", "ab");
-        EXPECT_EQ(loadsettings(*store).values.alternateseparatorcharacter, "-");
-    }
-    {
-        fillexcept("Title", "", false);
-        const settings s = loadsettings(*store).values;
-        EXPECT_EQ(s.title, defaulttitletemplate());
-        EXPECT_FALSE(s.asid); // later groups still read
-    }
-    {
-        fillexcept("Log Path", "", false);
-        const settings s = loadsettings(*store).values;
-        EXPECT_EQ(s.logpath, defaultlogpath());
-        EXPECT_TRUE(s.fullentry); // read as "0", reset with its group
-        EXPECT_TRUE(s.keeplog);
-        EXPECT_TRUE(s.requestimage);
-        EXPECT_EQ(s.country, "UK");
-    }
+    fill("Full Entry", "x");
+    store->write("Birthdate", "x");
+    store->write("Occ Scholar", " ");
+    store->write("Alternate Separator Character", "");
+    store->write("Source Type", "");
+    store->write("Title", "");
+    const settingsload l = loadsettings(*store);
+    const settings& s = l.values;
+    EXPECT_TRUE(s.fullentry);
+    EXPECT_FALSE(s.birthdate || s.occscholar || s.firststart);
+    EXPECT_EQ(QStringList({s.alternateseparatorcharacter, s.sourcetype, s.title}),
+              QStringList({"", "", defaulttitletemplate()}));
+    EXPECT_TRUE(l.defaulted.isEmpty());
 }
 
 TEST_F(SettingsTest, CountryAndCertaintyConversions)
 {
-    fill(fullstore());
+    fill();
     for (const char* c : {"UK", "USA", "Ireland", "Canada"}) {
         store->write("Country", c);
         EXPECT_EQ(loadsettings(*store).values.country, c);
@@ -236,55 +226,30 @@ TEST_F(SettingsTest, CountryAndCertaintyConversions)
         store->write("Certainty", text);
         const settings s = loadsettings(*store).values;
         EXPECT_EQ(s.certainty, value) << text;
-        EXPECT_TRUE(s.residence) << "values after Certainty still read";
-        EXPECT_FALSE(s.nosourcetextwarning);
+        EXPECT_TRUE(s.residence && !s.nosourcetextwarning) << "values after Certainty still read";
     }
-}
-
-TEST_F(SettingsTest, OlderVersionWithoutLastValueGetsGroupElevenDefaults)
-{
-    fillexcept("No Source Text Warning");
-    const settingsload l = loadsettings(*store);
-    const settings& s = l.values;
-    EXPECT_TRUE(s.birthsecondaryevidence); // group 10 kept
-    EXPECT_FALSE(s.occscholar);
-    EXPECT_FALSE(s.alternateseparator);      // group 11 reset, though read
-    EXPECT_EQ(s.alternateseparatorcharacter, "-");
-    EXPECT_FALSE(s.marriagecondition);
-    EXPECT_TRUE(s.nosourcetextwarning);
-    EXPECT_TRUE(s.firststart);
-    EXPECT_FALSE(l.pathchecksdue);
-    EXPECT_EQ(store->read("Flag Use"), QString("1")) << "group 7 was read: nothing written";
 }
 
 TEST_F(SettingsTest, ValuesOutsideTheGroupsAreReadAfterAFailure)
 {
-    store->write("Full Entry", "10");
-    store->write("Count", "123456789012");
     QTemporaryDir images;
-    store->write("Image Folder", " " + images.path() + " ");
-    store->write("Image Option", "2");
-    store->write("Rename File", "1");
-    settings s = loadsettings(*store).values;
-    EXPECT_EQ(s.count, 123456789012LL);
-    EXPECT_EQ(s.imagefolder, images.path());
-    EXPECT_EQ(s.imageoption, "2");
-    EXPECT_TRUE(s.renamefile);
-
-    store->write("Count", "lots");
-    store->write("Image Folder", images.path() + "/gone");
-    store->write("Image Option", "12");
-    store->write("Rename File", "11");
-    s = loadsettings(*store).values;
-    EXPECT_EQ(s.count, 0);
-    EXPECT_EQ(s.imagefolder, "");
-    EXPECT_EQ(s.imageoption, "0");
-    EXPECT_FALSE(s.renamefile);
+    const auto read = [&](const char* count, const QString& folder, const char* option, const char* rename) {
+        store->write("Full Entry", "10");
+        store->write("Count", count);
+        store->write("Image Folder", folder);
+        store->write("Image Option", option);
+        store->write("Rename File", rename);
+        return values(loadsettings(*store).values).mid(settingnames().size() + 1, 4);
+    };
+    EXPECT_EQ(read("123456789012", " " + images.path() + " ", "2", "1"),
+              QStringList({"Count=123456789012", "Image Folder=" + images.path(), "Image Option=2", "Rename File=1"}));
+    EXPECT_EQ(read("lots", images.path() + "/gone", "12", "11"),
+              QStringList({"Count=0", "Image Folder=", "Image Option=0", "Rename File=0"}));
 }
 
 TEST_F(SettingsTest, SaveWritesEveryDialogValueTrimmedAndReadsBack)
 {
-    fill(fullstore());
+    fill();
     settings s = loadsettings(*store).values;
     s.sourcetype = "  Census Return ";
     s.title = " {YEAR} ";
@@ -308,12 +273,10 @@ TEST_F(SettingsTest, SaveWritesEveryDialogValueTrimmedAndReadsBack)
     auto saved = settingsstore::onfile(otherpath);
     saveflagsettings(*saved, s);
     const settingsload back = loadsettings(*saved);
+    s.sourcetype = "Census Return";
+    s.title = "{YEAR}";
+    EXPECT_EQ(values(back.values), values(s));
     EXPECT_FALSE(back.values.firststart);
-    EXPECT_EQ(back.values.sourcetype, "Census Return");
-    EXPECT_EQ(back.values.title, "{YEAR}");
-    EXPECT_EQ(back.values.certainty, -1);
-    EXPECT_EQ(back.values.flaguse, s.flaguse);
-    EXPECT_EQ(back.values.alternateseparatorcharacter, s.alternateseparatorcharacter);
 }
 
 TEST_F(SettingsTest, SaveFlagSettingsWritesOnlyTheTwoFlagValues)
@@ -327,11 +290,9 @@ TEST_F(SettingsTest, SaveFlagSettingsWritesOnlyTheTwoFlagValues)
     EXPECT_EQ(raw.value("Flag Check").toString(), "0");
 }
 
-} // namespace
-
 TEST_F(SettingsTest, HouseholdCheckIsOnUnlessTurnedOff)
 {
-    fill(fullstore());
+    fill();
     EXPECT_TRUE(loadsettings(*store).values.householdcheck) << "a store of an older version keeps the check on";
     store->write("Household Check", "0");
     settings s = loadsettings(*store).values;
@@ -340,3 +301,5 @@ TEST_F(SettingsTest, HouseholdCheckIsOnUnlessTurnedOff)
     savesettings(*store, s);
     EXPECT_TRUE(loadsettings(*store).values.householdcheck);
 }
+
+} // namespace

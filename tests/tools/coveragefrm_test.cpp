@@ -5,6 +5,7 @@
 #include "tools/coveragefrm.h"
 
 #include "model/loadgedcom.h"
+#include "support/groupd_widgets.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 
@@ -20,12 +21,6 @@ using namespace qm;
 using namespace qmtest;
 
 namespace {
-
-template <class T>
-T* child(QWidget* w, const char* name)
-{
-    return w->findChild<T*>(QString::fromLatin1(name));
-}
 
 QTableView* grid(QWidget* w)
 {
@@ -103,13 +98,10 @@ private slots:
 
         // In name order: Alone, Brown, Smith John, Smith Tom.
         QCOMPARE(shownids(d, *x), (QList<int32_t>{4, 2, 1, 3}));
-        QCOMPARE(d.model().columnCount(), coveragemodel::firstcensuscolumn + 7);
         QCOMPARE(child<QLabel>(&d, "countlab")->text(), QStringLiteral("4 of 4 individuals shown"));
-        QCOMPARE(celltext(d, *x, 1, "1841"), QStringLiteral("\u2718 missing"));
-        QCOMPARE(celltext(d, *x, 1, "1871"), QStringLiteral("\u2013 not alive"));
-        QCOMPARE(celltext(d, *x, 2, "1851"), QStringLiteral("\u2714 recorded"));
-        QCOMPARE(celltext(d, *x, 3, "1871"), QStringLiteral("\u2192 elsewhere"));
-        QCOMPARE(celltext(d, *x, 4, "1881"), QStringLiteral("? uncertain"));
+        QCOMPARE((QStringList{celltext(d, *x, 1, "1841"), celltext(d, *x, 1, "1871"), celltext(d, *x, 2, "1851"),
+                              celltext(d, *x, 3, "1871"), celltext(d, *x, 4, "1881")}),
+                 (QStringList{"\u2718 missing", "\u2013 not alive", "\u2714 recorded", "\u2192 elsewhere", "? uncertain"}));
         // Readable without colour, and by a screen reader: the census and the word.
         const QModelIndex gap = gotocell(d, *x, 1, "1841");
         QCOMPARE(gap.data(Qt::AccessibleTextRole).toString(), QStringLiteral("1841: missing"));
@@ -138,8 +130,6 @@ private slots:
         // Gaps only: Zoe, uncertain everywhere, goes.
         QTest::mouseClick(child<QCheckBox>(&d, "gapschk"), Qt::LeftButton);
         QCOMPARE(shownids(d, *x), (QList<int32_t>{2, 1, 3}));
-        QCOMPARE(d.model().headerData(censuscolumn(d, "1851"), Qt::Horizontal).toString(),
-                 QStringLiteral("1851\n1 recorded\n2 missing"));
         child<QCheckBox>(&d, "gapschk")->click();
         // A name, as typed: letter case does not matter.
         QTest::keyClicks(child<QLineEdit>(&d, "nametxt"), QStringLiteral("SMITH"));

@@ -7,6 +7,7 @@
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
 #include "settings/settings.h"
+#include "support/goldenfiles.h"
 #include "support/testfiles.h"
 
 #include <QDir>
@@ -64,10 +65,11 @@ int row(const char* country, int year)
     return findcensusrow(QLatin1String(country), year) + 1;
 }
 
-QStringList texts(const std::vector<datelistentry>& list)
+template <class List>
+QStringList texts(const List& list)
 {
     QStringList out;
-    for (const datelistentry& e : list)
+    for (const auto& e : list)
         out << e.text;
     return out;
 }
@@ -238,10 +240,7 @@ TEST(DateCheck, Details)
     const auto people = s.details(0, false);
     ASSERT_EQ(people.size(), 7u);
     const QString name1 = qs(ix->people[0].name), name2 = qs(ix->people[1].name), name3 = qs(ix->people[2].name);
-    QStringList texts;
-    for (size_t i = 0; i < 6; ++i)
-        texts << people[i].text;
-    EXPECT_EQ(texts, (QStringList{name3 + QStringLiteral(" 7 bath"), name1 + QStringLiteral(" 3 York"),
+    EXPECT_EQ(texts(people).mid(0, 6), (QStringList{name3 + QStringLiteral(" 7 bath"), name1 + QStringLiteral(" 3 York"),
                                   name2 + QStringLiteral("  York"), // no age
                                   name2 + QStringLiteral(" 40 <no place recorded>"),
                                   QStringLiteral("Family F2 <no place recorded>"),
@@ -249,12 +248,8 @@ TEST(DateCheck, Details)
                                       + QStringLiteral(" York")}));
     EXPECT_TRUE(people[0].person == 2 && people[4].person == -1 && people[6].person == 3);
 
-    const auto places = s.details(0, true);
     // Letters with accents among their plain letters, not after Z.
-    QStringList placetexts;
-    for (const auto& p : places)
-        placetexts << p.text;
-    EXPECT_EQ(placetexts, (QStringList{QStringLiteral("<no place recorded> (in 2 census events)"),
+    EXPECT_EQ(texts(s.details(0, true)), (QStringList{QStringLiteral("<no place recorded> (in 2 census events)"),
                                        QStringLiteral("bath (in 1 census events)"),
                                        QString::fromUtf8("\xC3\x93mey (in 1 census events)"),
                                        QStringLiteral("York (in 3 census events)")}));
@@ -263,25 +258,16 @@ TEST(DateCheck, Details)
 
 // The accepted replacements written to the file, with the occupation dates
 // that cite the census event's source (whatever lines come between), and
-// only those of an individual with that census event.
+// only those of an individual with that census event: tools/datechanges.ged,
+// from tools/datechanges_input.ged (a date refused, another country's, one
+// with a space at the line end, a family's event, an occupation citing another
+// source and one of an individual without the census event).
 TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
 {
     QTemporaryDir dir;
     ASSERT_TRUE(dir.isValid());
     const QString path = dir.filePath(QStringLiteral("family.ged"));
-    qmtest::writefile(path,
-                      "0 HEAD\r\n1 CHAR ANSI\r\n"
-                      "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
-                      "1 CENS\r\n2 DATE ABT 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
-                      "1 OCCU Weaver\r\n2 DATE ABT 1851\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"
-                      "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
-                      "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
-                      "1 CENS\r\n2 DATE ABT 1650\r\n"
-                      "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
-                      "0 @I3@ INDI\r\n1 CENS\r\n2 DATE ABT 1851 \r\n"
-                      "0 @I4@ INDI\r\n1 OCCU Miner\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
-                      "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE ABT 1851\r\n"
-                      "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
+    qmtest::writefile(path, qmtest::readfile(QStringLiteral(QM_TESTDATA_DIR "/tools/datechanges_input.ged")));
     loadresult r = loadgedcom(path, flagtable{});
     ASSERT_TRUE(r.index);
     settings s = defaultsettings();
@@ -300,22 +286,7 @@ TEST(DateCheck, MakesTheChangesWithLinkedOccupationDates)
     EXPECT_EQ(out.rewrite.censusdateschanged, 3); // one line ended with a space; one a family's
     EXPECT_EQ(out.rewrite.occdateschanged, 1);
     EXPECT_TRUE(QFile::exists(out.backuppath));
-    EXPECT_EQ(qmtest::readfile(path),
-              "0 HEAD\r\n1 CHAR ANSI\r\n"
-              "0 @I1@ INDI\r\n1 NAME A /B/\r\n"
-              "1 CENS\r\n2 DATE 30 MAR 1851\r\n2 PLAC Leeds\r\n2 SOUR @S1@\r\n"
-              "1 OCCU Weaver\r\n2 DATE 30 MAR 1851\r\n2 NOTE x\r\n2 SOUR @S1@\r\n"
-              "1 OCCU Carter\r\n2 DATE ABT 1851\r\n2 SOUR @S2@\r\n"
-              "1 CENS\r\n2 DATE 1 JUN 1850\r\n2 SOUR @S2@\r\n"
-              "1 CENS\r\n2 DATE ABT 1650\r\n"
-              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
-              "0 @I2@ INDI\r\n1 CENS\r\n2 DATE 1881\r\n"
-              "0 @I3@ INDI\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
-              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
-              "0 @I4@ INDI\r\n1 OCCU Miner\r\n2 DATE ABT 1851\r\n2 SOUR @S1@\r\n"
-              "0 @F1@ FAM\r\n1 HUSB @I1@\r\n1 CENS\r\n2 DATE 30 MAR 1851\r\n"
-              "1 CHAN\r\n2 DATE 06 DEC 2026\r\n3 TIME 10:00:00\r\n"
-              "0 @S1@ SOUR\r\n1 TITL Census 1851\r\n0 @S2@ SOUR\r\n1 TITL Census 1850\r\n0 TRLR\r\n");
+    EXPECT_TRUE(qmtest::matchesgolden(QStringLiteral("tools/datechanges.ged"), qmtest::readfile(path)));
     const std::string log = qmtest::readfile(s.logpath);
     EXPECT_NE(log.find("Changed 3 census events dated ABT 1851 to 30 MAR 1851"), std::string::npos) << log;
     EXPECT_EQ(log.find("1881"), std::string::npos) << log;

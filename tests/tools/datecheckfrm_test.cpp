@@ -8,6 +8,7 @@
 #include "platform/clock.h"
 #include "writer/saveroad.h"
 #include "support/mainfrmfixture.h"
+#include "support/groupd_widgets.h"
 #include "support/openfixture.h"
 
 #include <QAction>
@@ -45,43 +46,9 @@ bool editlines(const QString& path, const std::vector<std::tuple<int, const char
     return f.open(QIODevice::WriteOnly | QIODevice::Truncate) && f.write(lines.join(QStringLiteral("\r\n")).toUtf8()) > 0;
 }
 
-template <class T>
-T* control(QDialog* d, const QString& name)
-{
-    return d->findChild<T*>(name);
-}
-
-QStringList rows(QDialog* d, const char* list)
-{
-    QStringList out;
-    auto* l = control<QListWidget>(d, QString::fromLatin1(list));
-    for (int i = 0; l && i < l->count(); ++i)
-        out << l->item(i)->text();
-    return out;
-}
-
-void clickentry(QDialog* d, const char* list, int row)
-{
-    auto* l = control<QListWidget>(d, QString::fromLatin1(list));
-    QListWidgetItem* item = l->item(row);
-    l->scrollToItem(item);
-    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(item).center());
-}
-
-void click(QDialog* d, const QString& name)
-{
-    control<QAbstractButton>(d, name)->click();
-}
-
 QStringList details(QDialog* d)
 {
-    auto* v = control<QListView>(d, QStringLiteral("peoplelst"));
-    return static_cast<QStringListModel*>(v->model())->stringList();
-}
-
-void opendatecheck(mainfrm& w)
-{
-    w.menuBar()->findChild<QAction*>(QStringLiteral("datecheckmen"))->trigger();
+    return static_cast<QStringListModel*>(child<QListView>(d, "peoplelst")->model())->stringList();
 }
 
 } // namespace
@@ -139,56 +106,52 @@ private slots:
         bool done = false;
         dialogs->expect(QStringLiteral("Datecheckfrm"), [&](QDialog* d) {
             done = true;
-            QVERIFY(control<QRadioButton>(d, QStringLiteral("countryopt0"))->isChecked());
-            QCOMPARE(rows(d, "changelst"),
-                     (QStringList{
-                         QStringLiteral("ABT 1841 (1 occurence) : [Suggest replacing with UK 1841 Census date 6 JUN 1841]"),
-                         QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with UK 1861 Census date 7 APR 1861]"),
-                         QStringLiteral("ABT 1851 (1 occurence) : [Suggest replacing with UK 1851 Census date 30 MAR 1851]")}));
-            QCOMPARE(rows(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
-            QCOMPARE(rows(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
-            auto* changebut = control<QPushButton>(d, QStringLiteral("changebut"));
-            auto* frame = control<QGroupBox>(d, QStringLiteral("suggestionframe"));
+            QVERIFY(child<QRadioButton>(d, "countryopt0")->isChecked());
+            // The lists as the check makes them (their texts: datecheck_test).
+            QCOMPARE(itemtexts(d, "changelst").size(), 3);
+            QCOMPARE(itemtexts(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
+            QCOMPARE(itemtexts(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
+            auto* changebut = child<QPushButton>(d, "changebut");
+            auto* frame = child<QGroupBox>(d, "suggestionframe");
+            auto* combo = child<QComboBox>(d, "suggestcombo");
             QVERIFY(changebut->isEnabled() && frame->isHidden());
-            auto* combo = control<QComboBox>(d, QStringLiteral("suggestcombo"));
-            click(d, QStringLiteral("helpbut"));
+            child(d, "helpbut")->click();
             QCOMPARE(run->prompts.helpshown, QStringList{QStringLiteral("35")});
 
             // Another country's date: only "Don't make change" or "Change to:".
-            clickentry(d, "countrylst", 0);
+            clickitem(d, "countrylst", 0);
             QVERIFY(frame->isVisible() && !combo->isEnabled());
-            QVERIFY(!control<QRadioButton>(d, QStringLiteral("suggestopt0"))->isEnabled());
-            QVERIFY(control<QRadioButton>(d, QStringLiteral("suggestopt1"))->isChecked());
+            QVERIFY(!child<QRadioButton>(d, "suggestopt0")->isEnabled());
+            QVERIFY(child<QRadioButton>(d, "suggestopt1")->isChecked());
             QCOMPARE(details(d), QStringList{qs(w.index()->people[0].name) + QStringLiteral(" 43 Hebden Bridge, Yorkshire, England")});
             // ... left as it is.
-            click(d, QStringLiteral("OKbut"));
-            QVERIFY(frame->isHidden() && rows(d, "countrylst").size() == 1);
+            child(d, "OKbut")->click();
+            QVERIFY(frame->isHidden() && itemtexts(d, "countrylst").size() == 1);
 
             // Refuse the first proposal.
-            clickentry(d, "changelst", 0);
-            QVERIFY(control<QRadioButton>(d, QStringLiteral("suggestopt0"))->isChecked());
-            click(d, QStringLiteral("suggestopt1"));
-            click(d, QStringLiteral("OKbut"));
-            QCOMPARE(rows(d, "changelst")[0],
+            clickitem(d, "changelst", 0);
+            QVERIFY(child<QRadioButton>(d, "suggestopt0")->isChecked());
+            child(d, "suggestopt1")->click();
+            child(d, "OKbut")->click();
+            QCOMPARE(itemtexts(d, "changelst")[0],
                      QStringLiteral("ABT 1841 (1 occurence) : [User has requested Quillmark not to replace this date]"));
 
             // Change the second to another census: first without choosing one.
-            clickentry(d, "changelst", 1);
-            click(d, QStringLiteral("suggestopt2"));
+            clickitem(d, "changelst", 1);
+            child(d, "suggestopt2")->click();
             QVERIFY(combo->isEnabled());
             run->prompts.expect(answer::ok, QStringLiteral("You must choose a census date from the 'change to' drop-down list"));
-            click(d, QStringLiteral("OKbut"));
-            QCOMPARE(run->prompts.unexpected(), 0);
+            child(d, "OKbut")->click();
             QVERIFY(frame->isVisible());
             combo->setCurrentIndex(combo->findText(QStringLiteral("Canada 1861 Census (14 JAN 1861)")));
-            click(d, QStringLiteral("OKbut"));
-            QCOMPARE(rows(d, "changelst")[1],
+            child(d, "OKbut")->click();
+            QCOMPARE(itemtexts(d, "changelst")[1],
                      QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with Canada 1861 Census date 14 JAN 1861]"));
 
             // Places of a date.
-            clickentry(d, "currentlst", 0);
-            QVERIFY(rows(d, "changelst").size() == 3 && control<QListWidget>(d, QStringLiteral("changelst"))->selectedItems().isEmpty());
-            click(d, QStringLiteral("peopleopt1"));
+            clickitem(d, "currentlst", 0);
+            QVERIFY(itemtexts(d, "changelst").size() == 3 && child<QListWidget>(d, "changelst")->selectedItems().isEmpty());
+            child(d, "peopleopt1")->click();
             QCOMPARE(details(d), QStringList{QStringLiteral("Heptonstall, Yorkshire, England (in 5 census events)")});
 
             // Confirm; "No" first changes nothing.
@@ -198,18 +161,18 @@ private slots:
             run->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to make the changes to dates"));
             changebut->click();
         });
-        opendatecheck(w);
+        w.menuBar()->findChild<QAction*>(QStringLiteral("datecheckmen"))->trigger();
         QTRY_VERIFY(done);
         QVERIFY(dialogs->unexpected == 0 && run->prompts.unexpected() == 0);
         dialogs.reset();
         QCOMPARE(backupcount(), before + 1);
 
+        // Refused; another country's census left; changed to the census chosen;
+        // the proposal agreed, and the occupation citing the same source.
         const QStringList lines = filelines(file);
-        QCOMPARE(lines[22], QStringLiteral("2 DATE ABT 1841"));   // refused
-        QCOMPARE(lines[29], QStringLiteral("2 DATE 1 JUN 1850"));  // another country's census: left
-        QCOMPARE(lines[36], QStringLiteral("2 DATE 14 JAN 1861")); // changed to the census chosen
-        QCOMPARE(lines[114], QStringLiteral("2 DATE 30 MAR 1851")); // the proposal agreed
-        QCOMPARE(lines[121], QStringLiteral("2 DATE 30 MAR 1851")); // and the occupation citing the same source
+        QCOMPARE((QStringList{lines[22], lines[29], lines[36], lines[114], lines[121]}),
+                 (QStringList{"2 DATE ABT 1841", "2 DATE 1 JUN 1850", "2 DATE 14 JAN 1861", "2 DATE 30 MAR 1851",
+                              "2 DATE 30 MAR 1851"}));
         // The file was read again: the index holds the new dates.
         QCOMPARE(qs(w.index()->people[2].census[1].date), QStringLiteral("30 MAR 1851"));
         QVERIFY(w.watching());
@@ -245,7 +208,7 @@ private slots:
                                                    "changed as a precaution to ensure there is no data loss. This "
                                                    "form will now close and the file will be reloaded.")
                                              : QStringLiteral("An error occurred"));
-                control<QPushButton>(d, QStringLiteral("changebut"))->click();
+                child<QPushButton>(d, "changebut")->click();
             });
             const toolend end = censusdatecheck(*open.file, p, nullptr);
             setinputfaultfortests(false);

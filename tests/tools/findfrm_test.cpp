@@ -1,9 +1,11 @@
 // The Find Individual dialog: on its own over a small index (what it shows of
-// an individual and its relatives), and from the main window's Find button
-// (searches, browsing, OK and the immediate family, large files).
+// an individual and its relatives, browsing, the searches), and from the main
+// window's Find button (OK adds the individual; the immediate family is built
+// around it or kept). What is found and listed is findindividual_test's.
 #include "tools/findfrm.h"
 
 #include "model/loadgedcom.h"
+#include "support/groupd_widgets.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 #include "tools/findindividual.h"
@@ -17,29 +19,9 @@ using namespace qmtest;
 
 namespace {
 
-template <class T>
-T* child(QWidget* w, const char* name)
-{
-    return w->findChild<T*>(QString::fromLatin1(name));
-}
-
 QString text(QWidget* d, const char* name)
 {
     return child<QLineEdit>(d, name)->text();
-}
-
-QStringList items(QWidget* d, const char* name)
-{
-    QStringList out;
-    auto* l = child<QListWidget>(d, name);
-    for (int i = 0; i < l->count(); ++i)
-        out << l->item(i)->text();
-    return out;
-}
-
-void clickitem(QListWidget* l, int row)
-{
-    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(l->item(row)).center());
 }
 
 QStringList familytexts(mainfrm& w)
@@ -56,10 +38,15 @@ QString familycaption(mainfrm& w)
     return w.findChild<QLabel*>(QStringLiteral("immediatefamilylab"))->text();
 }
 
-QPushButton* findbut(mainfrm& w)
-{
-    return w.findChild<QPushButton*>(QStringLiteral("findbut"));
-}
+// Ann has a birth and a census; Bob is her parent and her spouse; Cy a child
+// of their family.
+const char* const family =
+    "0 HEAD\r\n1 CHAR UTF-8\r\n"
+    "0 @I1@ INDI\r\n1 NAME Ann /Lee/\r\n1 BIRT\r\n2 DATE ABT 1850\r\n2 PLAC Leeds\r\n"
+    "1 CENS\r\n2 DATE 3 APR 1881\r\n2 PLAC York\r\n2 ADDR 4 High St\r\n2 AGE 30y\r\n"
+    "1 FAMC @F1@\r\n1 FAMS @F1@\r\n"
+    "0 @I2@ INDI\r\n1 NAME Bob /Lee/\r\n1 FAMS @F1@\r\n"
+    "0 @I3@ INDI\r\n1 NAME Cy /Lee/\r\n1 FAMC @F1@\r\n0 TRLR\r\n";
 
 } // namespace
 
@@ -72,45 +59,34 @@ private:
 private slots:
     void initTestCase() { QVERIFY(files_.valid()); }
 
-    // The panel of the individual shown: birth, census lines, and a relative
-    // who is both parent and spouse.
+    // The panel of the individual shown, browsing to relatives by mouse and
+    // keyboard, the search by record number, Help and Cancel.
     void showsindividual()
     {
-        const auto x = loadgedcombytes(
-            "0 HEAD\r\n1 CHAR UTF-8\r\n"
-            "0 @I1@ INDI\r\n1 NAME Ann /Lee/\r\n1 BIRT\r\n2 DATE ABT 1850\r\n2 PLAC Leeds\r\n"
-            "1 CENS\r\n2 DATE 3 APR 1881\r\n2 PLAC York\r\n2 ADDR 4 High St\r\n2 AGE 30y\r\n"
-            "1 FAMC @F1@\r\n1 FAMS @F1@\r\n"
-            "0 @I2@ INDI\r\n1 NAME Bob /Lee/\r\n1 FAMS @F1@\r\n"
-            "0 @I3@ INDI\r\n1 NAME Cy /Lee/\r\n1 FAMC @F1@\r\n0 TRLR\r\n",
-            flagtable{});
+        const auto x = loadgedcombytes(family, flagtable{});
         QVERIFY(x);
         scriptedprompts asker;
         findfrm d(*x, findlist(*x, false, {}), -1, asker);
         d.show();
         QCOMPARE(child<QLabel>(&d, "countlab")->text(), QStringLiteral("3 individuals."));
         QCOMPARE(accessiblename(child<QLabel>(&d, "countlab")), QStringLiteral("3 individuals."));
-        QVERIFY(!child<QPushButton>(&d, "okbut")->isEnabled());
-        QVERIFY(!child<QPushButton>(&d, "IDfindbut")->isEnabled());
+        QVERIFY(!child(&d, "okbut")->isEnabled());
+        QVERIFY(!child(&d, "IDfindbut")->isEnabled());
 
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("lee, a"));
-        QStringList shown;
-        for (const char* name : {"nametxt", "idtxt", "dobtxt", "placetxt"})
-            shown << text(&d, name);
-        QCOMPARE(shown, (QStringList{"Lee, Ann", "1", "ABT 1850", "Leeds"}));
-        QCOMPARE(items(&d, "censuslst"), QStringList{"1881: aged 30 at York (4 High St)"});
-        // Bob is parent and spouse, never a child; Cy is a child (and a sibling).
-        QCOMPARE(items(&d, "parentlst"), QStringList{"Lee, Bob"});
-        QCOMPARE(items(&d, "spouselst"), QStringList{"Lee, Bob"});
-        QCOMPARE(items(&d, "childrenlst"), QStringList{"Lee, Cy"});
-        QVERIFY(child<QPushButton>(&d, "okbut")->isEnabled());
+        QCOMPARE((QStringList{text(&d, "nametxt"), text(&d, "idtxt"), text(&d, "dobtxt"), text(&d, "placetxt")}),
+                 (QStringList{"Lee, Ann", "1", "ABT 1850", "Leeds"}));
+        QCOMPARE(itemtexts(&d, "censuslst"), QStringList{"1881: aged 30 at York (4 High St)"});
+        QCOMPARE((QStringList{itemtexts(&d, "parentlst") + itemtexts(&d, "spouselst") + itemtexts(&d, "childrenlst")}),
+                 (QStringList{"Lee, Bob", "Lee, Bob", "Lee, Cy"}));
+        QVERIFY(child(&d, "okbut")->isEnabled());
 
         // Browsing to Bob; a search text that matches nothing leaves him shown.
-        clickitem(child<QListWidget>(&d, "spouselst"), 0);
+        clickitem(&d, "spouselst", 0);
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
         QCOMPARE(text(&d, "dobtxt"), QString());
-        QCOMPARE(items(&d, "spouselst"), QStringList{"Lee, Ann"});
-        QCOMPARE(items(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
+        QCOMPARE(itemtexts(&d, "spouselst"), QStringList{"Lee, Ann"});
+        QCOMPARE(itemtexts(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("x"));
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
 
@@ -122,10 +98,32 @@ private slots:
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Cy"));
         QVERIFY(d.isVisible());
 
-        // Help, and Cancel gives nothing back.
-        QTest::mouseClick(child<QPushButton>(&d, "helpbut"), Qt::LeftButton);
+        // Record numbers: digits only; not found -> message and the button off
+        // until the number changes; found -> shown and the box emptied; Enter
+        // finds and does not press OK.
+        auto* box = child<QLineEdit>(&d, "IDfindtxt");
+        auto* but = child(&d, "IDfindbut");
+        QTest::keyClicks(box, QStringLiteral("9x9-"));
+        QCOMPARE(box->text(), QStringLiteral("99"));
+        QVERIFY(but->isEnabled());
+        asker.expect(answer::ok, QStringLiteral("No individuals have this ID"));
+        QTest::mouseClick(but, Qt::LeftButton);
+        QVERIFY(!but->isEnabled());
+        QCOMPARE(text(&d, "idtxt"), QStringLiteral("3"));
+        box->clear();
+        QTest::keyClicks(box, QStringLiteral("2"));
+        QVERIFY(but->isEnabled());
+        QTest::mouseClick(but, Qt::LeftButton);
+        QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
+        QVERIFY(box->text().isEmpty() && !but->isEnabled());
+        QTest::keyClicks(box, QStringLiteral("1"));
+        QTest::keyClick(box, Qt::Key_Return);
+        QVERIFY(d.isVisible());
+        QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Ann"));
+
+        QTest::mouseClick(child(&d, "helpbut"), Qt::LeftButton);
         QCOMPARE(asker.helpshown, QStringList{QStringLiteral("14")});
-        QTest::mouseClick(child<QPushButton>(&d, "Cancelbut"), Qt::LeftButton);
+        QTest::mouseClick(child(&d, "Cancelbut"), Qt::LeftButton);
         QCOMPARE(d.result(), -1);
         QCOMPARE(asker.unexpected(), 0);
     }
@@ -141,18 +139,16 @@ private slots:
         mainfrm& w = *run->w;
         dialoganswers dialogs;
         dialogs.expect(QStringLiteral("findfrm"), [&](QDialog* d) {
-            QVERIFY(!child<QPushButton>(d, "okbut")->isEnabled());
+            QVERIFY(!child(d, "okbut")->isEnabled());
             QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("ASHWORTH, JOHN (3"));
             QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
-            QCOMPARE(items(d, "spouselst"), QStringList{"Kershaw, Ellen"});
-            QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("x"));
-            QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
+            QCOMPARE(itemtexts(d, "spouselst"), QStringList{"Kershaw, Ellen"});
             QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/", "1 NAME Johnny /Ashworth/"));
-            QTest::mouseClick(child<QPushButton>(d, "okbut"), Qt::LeftButton);
+            QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
         });
         run->prompts.expect(answer::ok,
                             QDir::toNativeSeparators(file) + QStringLiteral(" has been modified by another application"));
-        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QTest::mouseClick(child(&w, "findbut"), Qt::LeftButton);
         QCOMPARE(dialogs.seen, QStringList{QStringLiteral("findfrm")});
         QCOMPARE(dialogs.unexpected, 0);
         QCOMPARE(shownnames(w), QStringList{QStringLiteral("Ashworth, Johnny")});
@@ -175,18 +171,17 @@ private slots:
 
         dialoganswers dialogs;
         dialogs.expect(QStringLiteral("findfrm"), [](QDialog* d) {
-            auto* ok = child<QPushButton>(d, "okbut");
             QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
-            QVERIFY(!ok->isEnabled());
-            clickitem(child<QListWidget>(d, "parentlst"), 0);
+            QVERIFY(!child(d, "okbut")->isEnabled());
+            clickitem(d, "parentlst", 0);
             QCOMPARE(text(d, "idtxt"), QStringLiteral("1"));
-            QVERIFY(ok->isEnabled());
+            QVERIFY(child(d, "okbut")->isEnabled());
             QCOMPARE(child<QListView>(d, "peoplelst")->currentIndex().data().toString(),
                      QStringLiteral("Ashworth, William (ABT 1808)"));
             child<QCheckBox>(d, "refocuschk")->setChecked(true);
-            QTest::mouseClick(ok, Qt::LeftButton);
+            QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
         });
-        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QTest::mouseClick(child(&w, "findbut"), Qt::LeftButton);
         QCOMPARE(dialogs.unexpected, 0);
         QCOMPARE(shownnames(w), (QStringList{"Ashworth, John", "Ashworth, William"}));
         QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, William:"));
@@ -199,58 +194,20 @@ private slots:
         dialogs.expect(QStringLiteral("findfrm"), [](QDialog* d) {
             auto* list = child<QListView>(d, "peoplelst");
             QCOMPARE(text(d, "idtxt"), QStringLiteral("1"));
-            QVERIFY(!child<QPushButton>(d, "okbut")->isEnabled());
+            QVERIFY(!child(d, "okbut")->isEnabled());
             clickrow(list, list->currentIndex().row());
             QCOMPARE(text(d, "idtxt"), QStringLiteral("1"));
-            QVERIFY(child<QPushButton>(d, "okbut")->isEnabled());
+            QVERIFY(child(d, "okbut")->isEnabled());
             auto* search = child<QLineEdit>(d, "searchnametxt");
             QTest::keyClicks(search, QStringLiteral("greenwood"));
             QTest::keyClick(search, Qt::Key_Return);
         });
-        QTest::mouseClick(findbut(w), Qt::LeftButton);
+        QTest::mouseClick(child(&w, "findbut"), Qt::LeftButton);
         QCOMPARE(dialogs.unexpected, 0);
         QCOMPARE(shownnames(w).last(), QStringLiteral("Greenwood, Hannah"));
         QCOMPARE(familycaption(w), QStringLiteral("Immediate Family of Ashworth, William:"));
         QCOMPARE(run->prompts.unexpected(), 0);
     }
-
-    // Record numbers: digits only; not found -> message and the button off
-    // until the number changes; found -> shown and the box emptied. Cancel
-    // adds nothing.
-    void findbyrecordnumber()
-    {
-        auto run = files_.opened(files_.sample());
-        QVERIFY(run);
-        mainfrm& w = *run->w;
-        run->prompts.expect(answer::ok, QStringLiteral("No individuals have this ID"));
-        dialoganswers dialogs;
-        dialogs.expect(QStringLiteral("findfrm"), [&](QDialog* d) {
-            auto* box = child<QLineEdit>(d, "IDfindtxt");
-            auto* but = child<QPushButton>(d, "IDfindbut");
-            QTest::keyClicks(box, QStringLiteral("9x9-"));
-            QCOMPARE(box->text(), QStringLiteral("99"));
-            QVERIFY(but->isEnabled());
-            QTest::mouseClick(but, Qt::LeftButton);
-            QVERIFY(!but->isEnabled());
-            QCOMPARE(text(d, "idtxt"), QString());
-            box->clear();
-            QTest::keyClicks(box, QStringLiteral("2"));
-            QVERIFY(but->isEnabled());
-            QTest::mouseClick(but, Qt::LeftButton);
-            QCOMPARE(text(d, "nametxt"), QStringLiteral("Greenwood, Hannah"));
-            QVERIFY(box->text().isEmpty() && !but->isEnabled());
-            QTest::keyClicks(box, QStringLiteral("40"));
-            QTest::keyClick(box, Qt::Key_Return); // finds, does not press OK
-            QVERIFY(d->isVisible());
-            QCOMPARE(text(d, "nametxt"), QStringLiteral("Ashworth, Zoë"));
-            QTest::mouseClick(child<QPushButton>(d, "Cancelbut"), Qt::LeftButton);
-        });
-        QTest::mouseClick(findbut(w), Qt::LeftButton);
-        QCOMPARE(dialogs.unexpected, 0);
-        QCOMPARE(w.household().selectioncount, 0);
-        QCOMPARE(run->prompts.unexpected(), 0);
-    }
-
 };
 
 QTEST_MAIN(findfrm_test)
