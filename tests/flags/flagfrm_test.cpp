@@ -1,19 +1,19 @@
 // The Census Flags dialog and its two choosers on the offscreen platform: the
-// allocation rules as the user meets them, deletion, the "Flag Use" setting,
-// the flag check hand-off, and one allocation made from the main window's menu.
+// controls, the "Flag Use" question and setting, deletion, the choosers'
+// refusals, and one allocation made from the main window's menu. Which dates,
+// names and deletions the rules allow: flagalloc_test.
 #include "flags/flagdatefrm.h"
 #include "flags/flagfrm.h"
 #include "flags/flagnamefrm.h"
 
 #include "flags/flagalloc.h"
 #include "model/gedcomindex.h"
+#include "support/b_dialogs.h"
 #include "support/fixedpitch.h"
 #include "support/mainfrmfixture.h"
 
 #include <QAction>
 #include <QCheckBox>
-#include <QDir>
-#include <QListWidget>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QtTest>
@@ -22,31 +22,6 @@ using namespace qm;
 using namespace qmtest;
 
 namespace {
-
-template <class T = QPushButton>
-T* child(const QWidget* w, const char* name)
-{
-    T* c = w->findChild<T*>(QString::fromLatin1(name));
-    if (!c)
-        qWarning("no control %s", name);
-    return c;
-}
-
-QStringList rows(const QWidget* w, const char* list = "flagslst")
-{
-    QStringList out;
-    const auto* l = child<QListWidget>(w, list);
-    for (int i = 0; i < l->count(); ++i)
-        out << l->item(i)->text();
-    return out;
-}
-
-void clickrow(QListWidget* l, const QString& text)
-{
-    const QList<QListWidgetItem*> found = l->findItems(text, Qt::MatchExactly);
-    QVERIFY2(!found.isEmpty(), qPrintable(text));
-    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(found.front()).center());
-}
 
 personrec holding(std::initializer_list<int32_t> flags)
 {
@@ -69,14 +44,13 @@ struct bench {
                     {"__UNUSED", "Unused", "5 APR 1891", 0, "UK"},
                     {"__C1901", "Census 1901", "31 MAR 1901", 1, "Ireland"},
                     {"__OLD", "Old flag", "", 1, ""}};
-        ix.people.push_back(holding({0, 2}));
-        ix.people.push_back(holding({0}));
-        ix.people.push_back(holding({3}));
+        ix.people = {holding({0, 2}), holding({0}), holding({3})};
     }
     QString stored(int n, const char* value) const
     {
         return store->read(QStringLiteral("Flags/%1").arg(n), QString::fromLatin1(value)).value_or(QString());
     }
+    QString flaguse() const { return store->read(QStringLiteral("Flag Use")).value_or(QStringLiteral("(none)")); }
 };
 
 } // namespace
@@ -84,126 +58,104 @@ struct bench {
 class flagfrmtest : public QObject {
     Q_OBJECT
 
-private:
     windowfiles files_;
 
 private slots:
+    // The list in a fixed-pitch font (also run with a proportional "monospace"),
+    // the setting stored on a click only, deleting a row, and the definitions
+    // written on Escape.
     void controlsandsetting()
     {
         bench b;
         b.s.flaguse = true;
         flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
         d.show();
-        QCOMPARE(rows(&d), (QStringList{"1881           UK             Census 1881",
-                                        "5 APR 1891     UK             Unused",
-                                        "31 MAR 1901    Ireland        Census 1901"}));
+        QVERIFY(QTest::qWaitForWindowExposed(&d));
+        QCOMPARE(rows(&d, "flagslst"), (QStringList{"1881           UK             Census 1881",
+                                                    "5 APR 1891     UK             Unused",
+                                                    "31 MAR 1901    Ireland        Census 1901"}));
         QVERIFY(linesupcolumns(child<QListWidget>(&d, "flagslst")->font()));
-        QVERIFY(!child(&d, "delbut")->isEnabled());
-        QVERIFY(child(&d, "flagcheckbut")->isEnabled());
+        QVERIFY(!child(&d, "delbut")->isEnabled() && child(&d, "flagcheckbut")->isEnabled());
 
-        // Shown from the setting without storing it; a click stores it at once.
         auto* flagschk = child<QCheckBox>(&d, "flagschk");
-        QVERIFY(flagschk->isChecked() && !b.store->read(QStringLiteral("Flag Use")));
+        QVERIFY(flagschk->isChecked() && b.flaguse() == QStringLiteral("(none)"));
         QTest::mouseClick(flagschk, Qt::LeftButton);
-        QCOMPARE(b.store->read(QStringLiteral("Flag Use")), QStringLiteral("0"));
-
+        QCOMPARE(b.flaguse(), QStringLiteral("0"));
         QTest::mouseClick(child(&d, "helpbut"), Qt::LeftButton);
         QCOMPARE(b.prompts.helpshown, QStringList{"45"});
 
-        // Escape closes, and the definitions are written.
+        // A flag held by two individuals leaves the list (it keeps its place
+        // in the table without a census: flagalloc_test).
+        clickitem(child<QListWidget>(&d, "flagslst"), QStringLiteral("1881"));
+        QVERIFY(child(&d, "delbut")->isEnabled());
+        QTest::mouseClick(child(&d, "delbut"), Qt::LeftButton);
+        QCOMPARE(rows(&d, "flagslst").size(), 2);
+        QCOMPARE(b.ix.flags.size(), size_t(4));
+
         QTest::keyClick(&d, Qt::Key_Escape);
         QVERIFY(!d.isVisible());
-        QCOMPARE(b.stored(3, "Country"), QStringLiteral("Ireland"));
+        QCOMPARE(b.stored(1, "Code") + b.stored(2, "Country"), QStringLiteral("__UNUSEDIreland"));
+        QVERIFY(!b.store->groupexists(QStringLiteral("Flags/3")));
 
         // No individuals: nothing for the flag check to do.
         b.ix.people.clear();
         flagfrm e(b.ix, b.s, *b.store, b.prompts, {});
         QVERIFY(!child(&e, "flagcheckbut")->isEnabled());
-        QCOMPARE(b.prompts.unexpected(), 0);
+        QVERIFY(answered(b.prompts));
     }
 
     // Allocating with "Flag Use" off asks whether to record flags: No leaves
-    // the setting, Yes ticks and stores it.
+    // the setting, Yes ticks and stores it; with it on, nothing is asked.
     void allocateasksforflaguse()
     {
         bench b;
         flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
         d.setcensus(QStringLiteral("Canada"), QStringLiteral("4 APR 1881"));
-        QCOMPARE(rows(&d).size(), 3); // no name yet: nothing allocated
-
+        QCOMPARE(rows(&d, "flagslst").size(), 3); // no name yet: nothing allocated
         b.prompts.expect(answer::no, flaguseprompt());
         d.setflagname(QStringLiteral("Canada 1881"));
-        QCOMPARE(b.prompts.unexpected(), 0);
-        QCOMPARE(rows(&d).back(), QStringLiteral("4 APR 1881     Canada         Canada 1881"));
+        QCOMPARE(rows(&d, "flagslst").back(), QStringLiteral("4 APR 1881     Canada         Canada 1881"));
         QVERIFY(child<QLineEdit>(&d, "datelab")->text().isEmpty());
-        QVERIFY(!child<QCheckBox>(&d, "flagschk")->isChecked() && !b.store->read(QStringLiteral("Flag Use")));
+        QVERIFY(!child<QCheckBox>(&d, "flagschk")->isChecked() && b.flaguse() == QStringLiteral("(none)"));
 
-        // An existing name first, the census second; Yes this time.
+        // An existing name first, the census second.
         b.prompts.expect(answer::yes, flaguseprompt());
         d.setflagname(QStringLiteral("Old flag"), 3);
         d.setcensus(QStringLiteral("UK"), QStringLiteral("30 MAR 1851"));
         QCOMPARE(b.ix.flags[3].date, "30 MAR 1851");
-        QCOMPARE(b.store->read(QStringLiteral("Flag Use")), QStringLiteral("1"));
+        QCOMPARE(b.flaguse(), QStringLiteral("1"));
 
-        // With "Flag Use" on, no question.
         d.setflagname(QStringLiteral("USA 1900"));
         d.setcensus(QStringLiteral("USA"), QStringLiteral("1900"));
-        QCOMPARE(b.prompts.unexpected(), 0);
         QCOMPARE(b.prompts.history().size(), size_t(2));
+        QVERIFY(answered(b.prompts));
         d.accept();
         QCOMPARE(b.stored(6, "Name"), QStringLiteral("USA 1900"));
     }
 
-    // A flag held by two individuals loses its census only: it leaves the
-    // list, is offered by Census Flag Names, and is not stored on close.
-    void deleteheldflag()
-    {
-        bench b;
-        flagfrm d(b.ix, b.s, *b.store, b.prompts, {});
-        d.show();
-        QVERIFY(QTest::qWaitForWindowExposed(&d));
-        auto* list = child<QListWidget>(&d, "flagslst");
-        clickrow(list, rows(&d)[0]);
-        QVERIFY(child(&d, "delbut")->isEnabled());
-        QTest::mouseClick(child(&d, "delbut"), Qt::LeftButton);
-        QCOMPARE(rows(&d), (QStringList{"5 APR 1891     UK             Unused",
-                                        "31 MAR 1901    Ireland        Census 1901"}));
-        QCOMPARE(b.ix.flags.size(), size_t(4));
-
-        flagnamefrm names(b.ix.flags, b.prompts);
-        QCOMPARE(rows(&names), (QStringList{"Census 1881", "Old flag"}));
-
-        QTest::mouseClick(child(&d, "okbut"), Qt::LeftButton);
-        QCOMPARE(b.stored(1, "Code"), QStringLiteral("__UNUSED"));
-        QVERIFY(!b.store->groupexists(QStringLiteral("Flags/3")));
-        QCOMPARE(b.prompts.unexpected(), 0);
-    }
-
-    // A UK flag for the year 1881 refuses the UK census of 3 APR 1881 but not
-    // the Canadian one of 4 APR 1881.
+    // The country option from the setting, the rows offered, a refused date
+    // or year told with the dialog left open, a date or a year chosen.
     void datechooser()
     {
         bench b;
-        b.s.country = QStringLiteral("Ireland");
-        flagdatefrm d(b.ix.flags, b.s.country, b.prompts);
+        flagdatefrm d(b.ix.flags, QStringLiteral("Ireland"), b.prompts);
         d.show();
         QVERIFY(QTest::qWaitForWindowExposed(&d));
         QVERIFY(child<QRadioButton>(&d, "IrelandOpt")->isChecked());
-        QCOMPARE(rows(&d, "datelst"), QStringList{"2 APR 1911"});
+        QCOMPARE(rows(&d, "datelst"), flagdates(b.ix.flags, QStringLiteral("Ireland")));
         QVERIFY(!child(&d, "datebut")->isEnabled() && !child(&d, "Yearbut")->isEnabled());
 
-        QTest::mouseClick(child<QRadioButton>(&d, "ukopt"), Qt::LeftButton);
+        QTest::mouseClick(child(&d, "ukopt"), Qt::LeftButton);
         QCOMPARE(rows(&d, "datelst"), flagdates(b.ix.flags, QStringLiteral("UK")));
-        clickrow(child<QListWidget>(&d, "datelst"), QStringLiteral("3 APR 1881"));
+        clickitem(child<QListWidget>(&d, "datelst"), QStringLiteral("3 APR 1881"));
         b.prompts.expect(answer::ok, QStringLiteral("with UK 3 APR 1881."));
         QTest::mouseClick(child(&d, "datebut"), Qt::LeftButton);
         b.prompts.expect(answer::ok, QStringLiteral("with UK 1881."));
         QTest::mouseClick(child(&d, "Yearbut"), Qt::LeftButton);
-        QCOMPARE(b.prompts.unexpected(), 0);
         QVERIFY(d.isVisible() && !d.chosen());
 
-        QTest::mouseClick(child<QRadioButton>(&d, "CanadaOpt"), Qt::LeftButton);
-        clickrow(child<QListWidget>(&d, "datelst"), QStringLiteral("4 APR 1881"));
+        QTest::mouseClick(child(&d, "CanadaOpt"), Qt::LeftButton);
+        clickitem(child<QListWidget>(&d, "datelst"), QStringLiteral("4 APR 1881"));
         QTest::mouseClick(child(&d, "datebut"), Qt::LeftButton);
         QVERIFY(!d.isVisible() && d.chosen());
         QCOMPARE(d.chosen()->country + QLatin1Char(' ') + d.chosen()->date, QStringLiteral("Canada 4 APR 1881"));
@@ -212,14 +164,17 @@ private slots:
         flagdatefrm y(b.ix.flags, QStringLiteral("France"), b.prompts);
         y.show();
         QVERIFY(child<QRadioButton>(&y, "ukopt")->isChecked());
-        clickrow(child<QListWidget>(&y, "datelst"), QStringLiteral("7 APR 1861"));
+        clickitem(child<QListWidget>(&y, "datelst"), QStringLiteral("7 APR 1861"));
         QTest::mouseClick(child(&y, "Yearbut"), Qt::LeftButton);
         QCOMPARE(y.chosen().value().date, QStringLiteral("1861"));
-        QCOMPARE(b.prompts.history().size(), size_t(2));
         QTest::mouseClick(child(&y, "helpbut"), Qt::LeftButton);
         QCOMPARE(b.prompts.helpshown, QStringList{"45"});
+        QCOMPARE(b.prompts.history().size(), size_t(2));
+        QVERIFY(answered(b.prompts));
     }
 
+    // The two options follow the list and the text box, by mouse and by
+    // keyboard; a refused name keeps the dialog open on the text box.
     void namechooser()
     {
         bench b;
@@ -228,7 +183,7 @@ private slots:
         QVERIFY(QTest::qWaitForWindowExposed(&d));
         const QList<QRadioButton*> opt = d.findChildren<QRadioButton*>(QStringLiteral("optflag"));
         QVERIFY(opt.size() == 2 && opt[0]->isChecked());
-        QCOMPARE(rows(&d), QStringList{"Old flag"});
+        QCOMPARE(rows(&d, "flagslst"), QStringList{"Old flag"});
         auto* ok = child(&d, "okbut");
         QVERIFY(!ok->isEnabled());
 
@@ -242,27 +197,23 @@ private slots:
         QTest::mouseClick(ok, Qt::LeftButton);
         QVERIFY(d.isVisible() && text->hasFocus());
 
-        // A row clicked chooses the existing flag again.
-        clickrow(child<QListWidget>(&d, "flagslst"), QStringLiteral("Old flag"));
+        clickitem(child<QListWidget>(&d, "flagslst"), QStringLiteral("Old flag"));
         QVERIFY(opt[0]->isChecked() && ok->isEnabled());
         QTest::mouseClick(text, Qt::LeftButton);
         QVERIFY(opt[1]->isChecked());
         // (on the button's indicator: the stretched button reacts only there and on its text)
         QTest::mouseClick(opt[0], Qt::LeftButton, {}, QPoint(6, opt[0]->height() / 2));
-        QVERIFY(opt[0]->isChecked() && ok->isEnabled());
-        QVERIFY(child<QListWidget>(&d, "flagslst")->hasFocus());
+        QVERIFY(opt[0]->isChecked() && ok->isEnabled() && child<QListWidget>(&d, "flagslst")->hasFocus());
         QTest::mouseClick(ok, Qt::LeftButton);
-        QVERIFY(d.chosen());
-        QCOMPARE(d.chosen()->name, QStringLiteral("Old flag"));
+        QVERIFY(d.chosen() && d.chosen()->name == QStringLiteral("Old flag"));
         QCOMPARE(d.chosen()->existing, std::optional<size_t>(3));
-        QCOMPARE(b.prompts.unexpected(), 0);
+        QVERIFY(answered(b.prompts));
 
-        // No unallocated flag: only a new name, given back trimmed.
+        // No unallocated flag: only a new name, given back trimmed on Return.
         b.ix.flags.pop_back();
         flagnamefrm n(b.ix.flags, b.prompts);
         n.show();
-        const QList<QRadioButton*> nopt = n.findChildren<QRadioButton*>(QStringLiteral("optflag"));
-        QVERIFY(!nopt[0]->isEnabled() && nopt[1]->isChecked());
+        QVERIFY(!n.findChildren<QRadioButton*>(QStringLiteral("optflag"))[0]->isEnabled());
         QTest::keyClicks(child<QLineEdit>(&n, "flagnametxt"), QStringLiteral(" Census 1891 "));
         QTest::keyClick(child<QLineEdit>(&n, "flagnametxt"), Qt::Key_Return);
         QVERIFY(n.result() == QDialog::Accepted && n.chosen() && !n.chosen()->existing);
@@ -274,28 +225,24 @@ private slots:
     // the main window reads the file again, with the new definition stored.
     void fromthemenu()
     {
-        settings s = defaultsettings();
-        QDir().mkpath(files_.filepath(QStringLiteral("backups")));
-        s.backupfolder = files_.filepath(QStringLiteral("backups"));
-        s.logpath = files_.filepath(QStringLiteral("censuslog.txt"));
         const QString file = files_.sample();
-        auto run = files_.opened(file, &s);
+        auto run = files_.opened(file);
         QVERIFY(run);
         const QString name = QStringLiteral("Census 1871");
-        bool checked = false, closed = false;
+        bool listed = false, closed = false;
         dialoganswers answers;
         answers.expect(QStringLiteral("flagfrm"), [&](QDialog* d) {
             QTimer::singleShot(0, d, [&, d] {
                 QTest::mouseClick(child(d, "Datebut"), Qt::LeftButton);
                 QTest::mouseClick(child(d, "flagbut"), Qt::LeftButton);
-                checked = rows(d).contains(QStringLiteral("2 APR 1871     UK             ") + name);
+                listed = rows(d, "flagslst").contains(QStringLiteral("2 APR 1871     UK             ") + name);
                 QTest::mouseClick(child(d, "flagcheckbut"), Qt::LeftButton);
                 closed = !d->isVisible() && qobject_cast<flagfrm*>(d)->reloadneeded();
             });
         });
         answers.expect(QStringLiteral("flagdatefrm"), [](QDialog* d) {
-            QTest::mouseClick(child<QRadioButton>(d, "ukopt"), Qt::LeftButton);
-            clickrow(child<QListWidget>(d, "datelst"), QStringLiteral("2 APR 1871"));
+            QTest::mouseClick(child(d, "ukopt"), Qt::LeftButton);
+            clickitem(child<QListWidget>(d, "datelst"), QStringLiteral("2 APR 1871"));
             QTest::mouseClick(child(d, "datebut"), Qt::LeftButton);
         });
         answers.expect(QStringLiteral("flagnamefrm"), [&](QDialog* d) {
@@ -309,22 +256,20 @@ private slots:
         run->prompts.expect(answer::no, flaguseprompt());
         run->prompts.expect(answer::yes, QStringLiteral("Are you sure you want to set/unset flags as suggested?"));
         run->w->findChild<QAction*>(QStringLiteral("flagsmen"))->trigger();
-        QVERIFY(answers.unexpected == 0 && answers.pending() == 0 && run->prompts.unexpected() == 0);
-        QVERIFY(checked && closed && run->w->watching());
+        QVERIFY(answered(answers) && answered(run->prompts));
+        QVERIFY(listed && closed && run->w->watching());
         QStringList stored;
         for (const char* key : {"Code", "Name", "Date", "Country"})
             stored << run->store->read(QStringLiteral("Flags/1"), QString::fromLatin1(key)).value_or(QString());
         QCOMPARE(stored, (QStringList{"__CENSUS_1871", name, "2 APR 1871", "UK"}));
 
-        QFile f(file);
-        QVERIFY(f.open(QIODevice::ReadOnly));
-        const int given = static_cast<int>(f.readAll().count("\r\n2 __CENSUS_1871 Census 1871\r\n"));
+        // Written, and read again: the index counts the individuals given it.
+        const auto given = static_cast<int>(QByteArray::fromStdString(readfile(file)).count("\r\n2 __CENSUS_1871 Census 1871\r\n"));
         QVERIFY(given > 0);
         const gedcomindex* ix = run->w->index();
         const auto held = std::find_if(ix->flags.begin(), ix->flags.end(),
                                        [](const flagrec& r) { return r.code == "__CENSUS_1871"; });
-        QVERIFY(held != ix->flags.end() && held->date == "2 APR 1871" && held->country == "UK");
-        QCOMPARE(held->count, given);
+        QVERIFY(held != ix->flags.end() && held->date == "2 APR 1871" && held->count == given);
     }
 };
 

@@ -1,24 +1,19 @@
 // Attach Images to Existing Sources: the source list and its filters, the
 // selected source's details, attaching (with the Census Images dialog stood in
 // for) and its refusals, then the whole road from the main window's Tools menu
-// through the real image dialogs.
+// through the real image dialogs. Which sources each filter keeps, and the
+// index after an attach: sourcedates_test.
 #include "images/attachimagesfrm.h"
 
 #include "images/imagechoices.h"
 #include "model/filechanged.h"
 #include "model/loadgedcom.h"
-#include "platform/scriptedprompts.h"
-#include "settings/settings.h"
-#include "writer/saveroad.h"
+#include "support/b_dialogs.h"
 #include "support/mainfrmfixture.h"
-#include "support/testfiles.h"
 
 #include <QAction>
 #include <QCheckBox>
-#include <QDir>
 #include <QImage>
-#include <QLineEdit>
-#include <QListWidget>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QtTest>
@@ -28,43 +23,18 @@ using namespace qmtest;
 
 namespace {
 
-template <class T>
-T* child(const QWidget& w, const char* name)
-{
-    T* c = w.findChild<T*>(QString::fromLatin1(name));
-    if (!c)
-        qWarning("no control %s", name);
-    return c;
-}
-
-QStringList rows(const QListWidget* l)
-{
-    QStringList out;
-    for (int i = 0; i < l->count(); ++i)
-        out << l->item(i)->text();
-    return out;
-}
-
-// Selects the row of the list whose text begins with `start`.
-bool pick(QListWidget* l, const QString& start)
-{
-    for (int i = 0; i < l->count(); ++i) {
-        if (l->item(i)->text().startsWith(start)) {
-            l->setCurrentRow(i);
-            return true;
-        }
-    }
-    return false;
-}
-
 const QString s5 = QStringLiteral("Census 1871 Hebden Bridge RG10/4387/62 (John Ashworth)");
+
+std::vector<int32_t> linked(const gedcomindex& ix, size_t source)
+{
+    return {ix.sources[source].objectids.begin(), ix.sources[source].objectids.end()};
+}
 
 } // namespace
 
 class attachimagesfrm_test : public QObject {
     Q_OBJECT
 
-private:
     windowfiles files_;
     int runs_ = 0;
 
@@ -77,9 +47,11 @@ private:
         s.logpath = folder + QStringLiteral("/censuslog.txt");
         return s;
     }
-    static QStringList backups(const settings& s) { return QDir(s.backupfolder).entryList({QStringLiteral("QM Backup*")}, QDir::Files); }
+    static int backups(const settings& s)
+    {
+        return static_cast<int>(QDir(s.backupfolder).entryList({QStringLiteral("QM Backup*")}, QDir::Files).size());
+    }
 
-    // A small PNG beside the family files.
     QString png(const char* name)
     {
         const QString path = files_.filepath(QString::fromLatin1(name));
@@ -88,17 +60,14 @@ private:
         return image.save(path) ? QDir::toNativeSeparators(path) : QString();
     }
 
-    // The sample, loaded.
     struct loaded {
         QString file;
         std::unique_ptr<gedcomindex> index;
     };
     loaded sample()
     {
-        loaded r;
-        r.file = files_.sample();
-        r.index = loadgedcom(r.file, {}).index;
-        return r;
+        const QString file = files_.sample();
+        return {file, loadgedcom(file, {}).index};
     }
 
     // Stands in for the Census Images dialog: one new image of the source's
@@ -130,60 +99,53 @@ private slots:
         scriptedprompts p;
         Attachimagesfrm d(*x.index, s, p, {});
         d.show();
-        auto* list = child<QListWidget>(d, "sourcelst");
-        auto* count = child<QLabel>(d, "countlab");
-        auto* search = child<QLineEdit>(d, "searchtxt");
-        auto* searchbut = child<QPushButton>(d, "searchbut");
-        auto* noimages = child<QCheckBox>(d, "imagecountchk");
+        auto* list = child<QListWidget>(&d, "sourcelst");
+        auto* search = child<QLineEdit>(&d, "searchtxt");
+        auto* searchbut = child(&d, "searchbut");
 
-        // Census sources at first: 9 of the 11.
-        QVERIFY(child<QRadioButton>(d, "sourceopt1")->isChecked());
-        QCOMPARE(list->count(), 9);
-        QCOMPARE(count->text(), QStringLiteral("9 sources"));
-        QVERIFY(!searchbut->isEnabled());
-        noimages->click();
-        QCOMPARE(list->count(), 7);
-        child<QRadioButton>(d, "sourceopt0")->click();
-        QCOMPARE(list->count(), 9);
-        noimages->click();
-        QCOMPARE(list->count(), 11);
+        // Census sources at first; without images; all sources; all with or without.
+        QVERIFY(child(&d, "sourceopt1")->isChecked() && !searchbut->isEnabled());
+        QList<int> counts{list->count()};
+        press(&d, "imagecountchk");
+        counts << list->count();
+        press(&d, "sourceopt0");
+        counts << list->count();
+        press(&d, "imagecountchk");
+        counts << list->count();
+        QCOMPARE(counts, (QList<int>{9, 7, 9, 11}));
 
-        // Typing chooses the text option; the list waits for Search.
+        // Typing chooses the text option; the list waits for Search; Return in
+        // the box searches, and does not close the dialog.
         QTest::keyClicks(search, QStringLiteral("  HEBDEN bridge  "));
-        QVERIFY(child<QRadioButton>(d, "sourceopt2")->isChecked());
-        QVERIFY(searchbut->isEnabled());
-        QCOMPARE(list->count(), 11);
+        QVERIFY(child(&d, "sourceopt2")->isChecked() && searchbut->isEnabled() && list->count() == 11);
         searchbut->click();
         QCOMPARE(list->count(), 6);
-        // Return in the search box searches, and does not close the dialog.
         search->setText(QStringLiteral("certificate"));
         QTest::keyClick(search, Qt::Key_Return);
         QVERIFY(d.isVisible());
-        QCOMPARE(rows(list), QStringList{QStringLiteral("Birth certificate, Frederick Ashworth, 1881")});
-        QCOMPARE(count->text(), QStringLiteral("1 source"));
+        QCOMPARE(rows(list), QStringList{"Birth certificate, Frederick Ashworth, 1881"});
+        QCOMPARE(child<QLabel>(&d, "countlab")->text(), QStringLiteral("1 source"));
 
         // Another option empties the search text.
-        child<QRadioButton>(d, "sourceopt1")->click();
-        QCOMPARE(search->text(), QString());
-        QVERIFY(!searchbut->isEnabled());
-        QCOMPARE(list->count(), 9);
+        press(&d, "sourceopt1");
+        QVERIFY(search->text().isEmpty() && !searchbut->isEnabled() && list->count() == 9);
 
         // The selected source's details; Attach waits for a selection.
-        QVERIFY(!child<QPushButton>(d, "attachbut")->isEnabled());
+        QVERIFY(!child(&d, "attachbut")->isEnabled());
         QVERIFY(pick(list, QStringLiteral("Census 1881 Hebden Bridge")));
-        QCOMPARE(child<QLineEdit>(d, "titletxt")->text(), QStringLiteral("Census 1881 Hebden Bridge RG11/4426/88 (John Ashworth)"));
-        QCOMPARE(child<QLineEdit>(d, "indextxt")->text(), QStringLiteral("7"));
-        QCOMPARE(child<QLineEdit>(d, "Datetxt")->text(), QStringLiteral("3 APR 1881"));
-        QCOMPARE(rows(child<QListWidget>(d, "imagelst")), QStringList{QStringLiteral("Census 1881 Hebden Bridge")});
-        QCOMPARE(rows(child<QListWidget>(d, "individualslst")).filter(QStringLiteral("Ashworth, John")).size(), 1);
-        QVERIFY(child<QPushButton>(d, "attachbut")->isEnabled());
-
+        QStringList details;
+        for (const char* box : {"titletxt", "indextxt", "Datetxt"})
+            details << child<QLineEdit>(&d, box)->text();
+        QCOMPARE(details, (QStringList{"Census 1881 Hebden Bridge RG11/4426/88 (John Ashworth)", "7", "3 APR 1881"}));
+        QCOMPARE(rows(&d, "imagelst"), QStringList{"Census 1881 Hebden Bridge"});
+        QCOMPARE(rows(&d, "individualslst").filter(QStringLiteral("Ashworth, John")).size(), 1);
+        QVERIFY(child(&d, "attachbut")->isEnabled());
         QVERIFY(pick(list, s5));
-        QCOMPARE(child<QListWidget>(d, "imagelst")->count(), 0);
+        QCOMPARE(rows(&d, "imagelst").size(), 0);
 
-        child<QPushButton>(d, "helpbut")->click();
-        QCOMPARE(p.helpshown, QStringList{QStringLiteral("19")});
-        QCOMPARE(p.unexpected(), 0);
+        press(&d, "helpbut");
+        QCOMPARE(p.helpshown, QStringList{"19"});
+        QVERIFY(answered(p));
     }
 
     // Two attaches in one opening: the file is rewritten each time, the index
@@ -199,47 +161,35 @@ private slots:
         const QString page = png("page62.png");
         Attachimagesfrm d(*x.index, s, p, fakechooser(*x.index, page, &calls, &date));
         d.show();
-        auto* list = child<QListWidget>(d, "sourcelst");
-        child<QCheckBox>(d, "imagecountchk")->click();
+        auto* list = child<QListWidget>(&d, "sourcelst");
+        press(&d, "imagecountchk");
         QCOMPARE(list->count(), 7);
 
         QVERIFY(pick(list, s5));
-        child<QPushButton>(d, "attachbut")->click();
-        QCOMPARE(calls, 1);
-        QCOMPARE(date, QStringLiteral("2 APR 1871"));
-        QVERIFY(d.imagesattached());
-        QCOMPARE(p.unexpected(), 0);
-        QCOMPARE(backups(s).size(), 1);
-        const QStringList lines = QString::fromStdString(readfile(x.file)).split(QStringLiteral("\r\n"));
-        const qsizetype at = lines.indexOf(QStringLiteral("1 TITL ") + s5);
-        QVERIFY(at > 0);
-        QCOMPARE(lines.mid(at).indexOf(QStringLiteral("1 OBJE @O3@")) + 2, lines.mid(at).indexOf(QStringLiteral("1 OBJE @O2@")));
-        const qsizetype o3 = lines.indexOf(QStringLiteral("0 @O3@ OBJE"));
-        QVERIFY(o3 > 0);
-        QCOMPARE(lines.mid(o3 + 1, 4), (QStringList{QStringLiteral("1 FORM png"), QStringLiteral("1 TITL ") + s5,
-                                                     QStringLiteral("1 _FILE ") + page, QStringLiteral("1 _DATE 2 APR 1871")}));
+        press(&d, "attachbut");
+        QVERIFY(calls == 1 && date == QStringLiteral("2 APR 1871") && d.imagesattached());
+        QCOMPARE(backups(s), 1);
+        const QString record = QStringLiteral("0 @O3@ OBJE\r\n1 FORM png\r\n1 TITL ") + s5 + QStringLiteral("\r\n1 _FILE ")
+                             + page + QStringLiteral("\r\n1 _DATE 2 APR 1871\r\n");
+        const std::string text = readfile(x.file);
+        QVERIFY(text.find(record.toStdString()) != std::string::npos);
+        // Linked to the source chosen, in the order chosen (_ASID: the rewrite's golden files).
+        const size_t source = text.find("1 TITL " + s5.toStdString() + "\r\n");
+        QVERIFY(source != std::string::npos);
+        QVERIFY(text.find("1 OBJE @O3@\r\n2 _ASID 1\r\n1 OBJE @O2@\r\n", source) < text.find("\r\n0 @", source));
 
-        // The index: the new record, both links, the new stamp.
-        const sourcerec& source = x.index->sources[4];
-        QVERIFY(source.objectids == (std::vector<int32_t>{3, 2}));
-        QVERIFY(!filechanged(*x.index));
-
-        // The details are cleared and the source has left the list.
-        QCOMPARE(child<QLineEdit>(d, "titletxt")->text(), QString());
-        QVERIFY(!child<QPushButton>(d, "attachbut")->isEnabled());
-        QCOMPARE(list->count(), 6);
-        QVERIFY(!pick(list, s5));
+        // The index: the new record, both links, the new stamp; the details
+        // cleared and the source gone from the list.
+        QVERIFY(linked(*x.index, 4) == (std::vector<int32_t>{3, 2}) && !filechanged(*x.index));
+        QVERIFY(child<QLineEdit>(&d, "titletxt")->text().isEmpty() && !child(&d, "attachbut")->isEnabled());
+        QVERIFY(list->count() == 6 && !pick(list, s5));
 
         // Again, on another source.
         QVERIFY(pick(list, QStringLiteral("Census 1841")));
-        child<QPushButton>(d, "attachbut")->click();
-        QCOMPARE(calls, 2);
-        QCOMPARE(p.unexpected(), 0);
-        const std::string now = readfile(x.file);
-        QVERIFY(now.find("0 @O4@ OBJE\r\n") != std::string::npos);
-        QVERIFY(now.find("1 OBJE @O4@\r\n2 _ASID 1\r\n1 OBJE @O2@\r\n") != std::string::npos);
-        QCOMPARE(backups(s).size(), 2);
-        QVERIFY(x.index->sources[0].objectids == (std::vector<int32_t>{4, 2}));
+        press(&d, "attachbut");
+        QVERIFY(calls == 2 && answered(p) && backups(s) == 2);
+        QVERIFY(readfile(x.file).find("0 @O4@ OBJE\r\n") != std::string::npos);
+        QVERIFY(linked(*x.index, 0) == (std::vector<int32_t>{4, 2}));
     }
 
     // Changed by another program while the images are chosen: nothing is
@@ -251,26 +201,22 @@ private slots:
         scriptedprompts p;
         int calls = 0;
         const Attachimagesfrm::imagechooser inner = fakechooser(*x.index, png("page.png"), &calls);
-        const QString file = x.file;
         const auto chooser = [&](const QString& title, const QString& date, QWidget* parent) {
-            replaceinfile(file, "1 NAME Sample Family File", "1 NAME Another Family File");
+            replaceinfile(x.file, "1 NAME Sample Family File", "1 NAME Another Family File");
             return inner(title, date, parent);
         };
         Attachimagesfrm d(*x.index, s, p, chooser);
         d.show();
-        QVERIFY(pick(child<QListWidget>(d, "sourcelst"), s5));
-        p.expect(answer::ok, QDir::toNativeSeparators(file) + QStringLiteral(
+        QVERIFY(pick(child<QListWidget>(&d, "sourcelst"), s5));
+        p.expect(answer::ok, QDir::toNativeSeparators(x.file) + QStringLiteral(
                                  " has been modified by another application. Images will not be attached to this "
                                  "source and new images will not be added as a precaution to ensure there is no "
                                  "data loss. This form will now close and the file will be reloaded."));
-        child<QPushButton>(d, "attachbut")->click();
-        QCOMPARE(p.unexpected(), 0);
-        QCOMPARE(calls, 1);
-        QVERIFY(!d.isVisible());
-        QVERIFY(d.filechanged());
-        QVERIFY(!d.imagesattached());
-        QVERIFY(readfile(file).find("@O3@") == std::string::npos);
-        QVERIFY(backups(s).isEmpty());
+        press(&d, "attachbut");
+        QVERIFY(answered(p) && calls == 1);
+        QVERIFY(!d.isVisible() && d.filechanged() && !d.imagesattached());
+        QVERIFY(readfile(x.file).find("@O3@") == std::string::npos);
+        QCOMPARE(backups(s), 0);
     }
 
     // Attaches that write nothing and leave the dialog open: only an image
@@ -294,16 +240,14 @@ private slots:
             Attachimagesfrm d(*x.index, s, p,
                               nobackup ? fakechooser(*x.index, png("page.png"), &calls) : Attachimagesfrm::imagechooser(onlyo2));
             d.show();
-            QVERIFY(pick(child<QListWidget>(d, "sourcelst"), nobackup ? s5 : QStringLiteral("Census 1881 Hebden Bridge")));
+            QVERIFY(pick(child<QListWidget>(&d, "sourcelst"), nobackup ? s5 : QStringLiteral("Census 1881 Hebden Bridge")));
             const std::string before = readfile(x.file);
             p.expect(answer::ok, nobackup ? QString()
                                           : QStringLiteral("The image 'Census 1881 Hebden Bridge' (ID: 2) is already "
                                                            "attached to this source, so it is not attached again."));
-            child<QPushButton>(d, "attachbut")->click();
-            QCOMPARE(calls, 1);
-            QCOMPARE(p.unexpected(), 0);
-            QVERIFY(d.isVisible());
-            QVERIFY(!d.imagesattached());
+            press(&d, "attachbut");
+            QVERIFY(calls == 1 && answered(p));
+            QVERIFY(d.isVisible() && !d.imagesattached());
             QCOMPARE(readfile(x.file), before);
             QVERIFY(x.index->sources[4].objectids.empty());
         }
@@ -321,106 +265,90 @@ private slots:
         QVERIFY(run);
         mainfrm& w = *run->w;
         const QString page = png("page62.png");
-        QVERIFY(!page.isEmpty());
         auto* menu = w.findChild<QAction*>(QStringLiteral("attachbut"));
-        QVERIFY(menu && menu->isEnabled());
+        QVERIFY(!page.isEmpty() && menu && menu->isEnabled());
 
         dialoganswers dialogs;
-        QString datetxt;
-        std::vector<int32_t> linked;
-        size_t objects = 0;
-        bool watched = true;
-        dialogs.expect(QStringLiteral("Attachimagesfrm"), [&](QDialog* d) {
-            QTimer::singleShot(0, d, [&, d] {
-                watched = w.watching();
-                if (pick(child<QListWidget>(*d, "sourcelst"), s5)) {
-                    datetxt = child<QLineEdit>(*d, "Datetxt")->text();
-                    child<QPushButton>(*d, "attachbut")->click(); // waits for the Census Images dialog
-                }
-                linked.assign(w.index()->sources[4].objectids.begin(), w.index()->sources[4].objectids.end());
-                objects = w.index()->objects.size();
-                child<QPushButton>(*d, "okbut")->click();
-            });
-        });
-        dialogs.expect(QStringLiteral("imagesfrm"), [&](QDialog* d) {
-            QTimer::singleShot(0, d, [d] {
-                child<QPushButton>(*d, "addcurrentimagebut")->click();
-                child<QPushButton>(*d, "Addnewbut")->click();
-                child<QPushButton>(*d, "okbut")->click();
-            });
-        });
-        const auto link1881page = [](QDialog* d) {
-            pick(child<QListWidget>(*d, "imageslst"), QStringLiteral("Census 1881 Hebden Bridge"));
-            child<QPushButton>(*d, "okbut")->click();
+        // Each opening of Attach Images runs `f` once the dialog is up.
+        const auto attach = [&](std::function<void(QDialog*)> f) {
+            dialogs.expect(QStringLiteral("Attachimagesfrm"), [f](QDialog* d) { QTimer::singleShot(0, d, [f, d] { f(d); }); });
         };
-        dialogs.expect(QStringLiteral("currentimagesfrm"), link1881page);
+        const auto imagesfrm = [&](bool addnew) {
+            dialogs.expect(QStringLiteral("imagesfrm"), [addnew](QDialog* d) {
+                QTimer::singleShot(0, d, [d, addnew] {
+                    press(d, "addcurrentimagebut");
+                    if (addnew)
+                        press(d, "Addnewbut");
+                    press(d, "okbut");
+                });
+            });
+            dialogs.expect(QStringLiteral("currentimagesfrm"), [](QDialog* d) {
+                pick(child<QListWidget>(d, "imageslst"), QStringLiteral("Census 1881 Hebden Bridge"));
+                press(d, "okbut");
+            });
+        };
+        const auto closed = [&] {
+            QTRY_COMPARE(dialogs.pending(), 0);
+            QVERIFY(answered(dialogs) && answered(run->prompts));
+        };
+
+        QString datetxt;
+        std::vector<int32_t> before;
+        bool watched = true;
+        attach([&](QDialog* d) {
+            watched = w.watching();
+            if (pick(child<QListWidget>(d, "sourcelst"), s5)) {
+                datetxt = child<QLineEdit>(d, "Datetxt")->text();
+                press(d, "attachbut"); // waits for the Census Images dialog
+            }
+            before = linked(*w.index(), 4);
+            press(d, "okbut");
+        });
+        imagesfrm(true);
         dialogs.expect(QStringLiteral("newimagefrm"), [&](QDialog* d) {
             run->prompts.expectfile(page);
-            child<QPushButton>(*d, "choosefilebut")->click();
-            child<QRadioButton>(*d, "titleopt1")->click();
-            child<QCheckBox>(*d, "renamechk")->setChecked(false);
-            child<QPushButton>(*d, "addbut")->click();
+            press(d, "choosefilebut");
+            press(d, "titleopt1");
+            child<QCheckBox>(d, "renamechk")->setChecked(false);
+            press(d, "addbut");
         });
         menu->trigger();
-        QTRY_COMPARE(dialogs.pending(), 0);
-        QCOMPARE(dialogs.unexpected, 0);
-        QCOMPARE(run->prompts.unexpected(), 0);
-        QVERIFY(!watched);
-        QVERIFY(w.watching());
+        closed();
+        QVERIFY(!watched && w.watching());
         QCOMPARE(datetxt, QStringLiteral("2 APR 1871"));
-        // The index was brought up to date before the dialog closed.
-        QVERIFY(linked == (std::vector<int32_t>{2, 3}));
-        QCOMPARE(objects, size_t(3));
-
-        // The records written are attachtwice's; here: read again afterwards.
-        QCOMPARE(backups(s).size(), 1);
-        QVERIFY(w.index()->sources[4].objectids == (std::vector<int32_t>{2, 3}));
-        QCOMPARE(w.index()->maxobjectid, 3);
+        // The index was brought up to date before the dialog closed, and the
+        // file read again afterwards (the records written: attachtwice).
+        QVERIFY(before == (std::vector<int32_t>{2, 3}) && linked(*w.index(), 4) == before);
+        QVERIFY(backups(s) == 1 && w.index()->maxobjectid == 3);
 
         // Another program changes the file while the dialog is open: nothing
         // is written, and the file is read again.
-        dialogs.expect(QStringLiteral("Attachimagesfrm"), [&](QDialog* d) {
-            QTimer::singleShot(0, d, [&, d] {
-                pick(child<QListWidget>(*d, "sourcelst"), QStringLiteral("Census 1841"));
-                replaceinfile(file, "1 NAME Sample Family File", "1 NAME Changed Elsewhere");
-                run->prompts.expect(answer::ok, QStringLiteral("Images will not be attached to this source"));
-                child<QPushButton>(*d, "attachbut")->click();
-            });
+        attach([&](QDialog* d) {
+            pick(child<QListWidget>(d, "sourcelst"), QStringLiteral("Census 1841"));
+            replaceinfile(file, "1 NAME Sample Family File", "1 NAME Changed Elsewhere");
+            run->prompts.expect(answer::ok, QStringLiteral("Images will not be attached to this source"));
+            press(d, "attachbut");
         });
         menu->trigger();
-        QTRY_COMPARE(dialogs.pending(), 0);
-        QCOMPARE(dialogs.unexpected, 0);
-        QCOMPARE(run->prompts.unexpected(), 0);
-        QVERIFY(readfile(file).find("1 NAME Changed Elsewhere") != std::string::npos);
-        QCOMPARE(backups(s).size(), 1);
-        QVERIFY(!filechanged(*w.index())); // read again
-        QVERIFY(w.index()->sources[0].objectids.empty());
+        closed();
+        QVERIFY(readfile(file).find("1 NAME Changed Elsewhere") != std::string::npos && backups(s) == 1);
+        QVERIFY(!filechanged(*w.index()) && w.index()->sources[0].objectids.empty());
 
         // A rewrite that fails: its message, the file as it was, and the program ends.
-        const std::string before = readfile(file);
-        dialogs.expect(QStringLiteral("Attachimagesfrm"), [&](QDialog* d) {
-            QTimer::singleShot(0, d, [&, d] {
-                pick(child<QListWidget>(*d, "sourcelst"), QStringLiteral("Census 1841"));
-                run->prompts.expect(answer::ok, QStringLiteral("An error occurred"));
-                setinputfaultfortests(true);
-                child<QPushButton>(*d, "attachbut")->click();
-                setinputfaultfortests(false);
-            });
+        const std::string unchanged = readfile(file);
+        attach([&](QDialog* d) {
+            pick(child<QListWidget>(d, "sourcelst"), QStringLiteral("Census 1841"));
+            run->prompts.expect(answer::ok, QStringLiteral("An error occurred"));
+            setinputfaultfortests(true);
+            press(d, "attachbut");
+            setinputfaultfortests(false);
         });
-        dialogs.expect(QStringLiteral("imagesfrm"), [](QDialog* d) {
-            QTimer::singleShot(0, d, [d] {
-                child<QPushButton>(*d, "addcurrentimagebut")->click();
-                child<QPushButton>(*d, "okbut")->click();
-            });
-        });
-        dialogs.expect(QStringLiteral("currentimagesfrm"), link1881page);
+        imagesfrm(false);
         menu->trigger();
-        QTRY_COMPARE(dialogs.pending(), 0);
-        QCOMPARE(dialogs.unexpected, 0);
-        QCOMPARE(run->prompts.unexpected(), 0);
+        closed();
         QCOMPARE(run->prompts.history().back().m.kind, icon::critical);
         QVERIFY(!w.isVisible());
-        QCOMPARE(readfile(file), before);
+        QCOMPARE(readfile(file), unchanged);
     }
 };
 

@@ -66,13 +66,8 @@ TEST_F(CensusLog, OccupationBirthResidenceFlagAndImages)
     r.birthplace = QStringLiteral("Leeds");
     e.selection = {r};
     e.flagname = QStringLiteral("Census 1851");
-    imagechoice fresh;
-    fresh.isnew = true;
-    fresh.title = QStringLiteral("Page 3");
-    fresh.file = QStringLiteral("/img/p3.jpg");
-    imagechoice old;
-    old.title = QStringLiteral("Page 2");
-    e.chosenimages = {fresh, old};
+    e.chosenimages = {imagechoice{3, {}, QStringLiteral("Page 3"), QStringLiteral("/img/p3.jpg"), {}, true, 0, {}},
+                      imagechoice{2, {}, QStringLiteral("Page 2"), {}, {}, false, 0, {}}};
     s.residence = true;
     s.fullentry = false;
     s.sharednote = true;

@@ -65,9 +65,15 @@ TEST_F(LogPages, APageEndsAtTheLineReaching65001)
 
 TEST_F(LogPages, LineEndsEncodingsAndStart)
 {
+    logpages pages;
+    EXPECT_FALSE(pages.open(dir.filePath(QStringLiteral("none.txt"))));
+    EXPECT_FALSE(pages.more());
+    writefile(log, "");
+    ASSERT_TRUE(pages.open(log));
+    EXPECT_TRUE(pages.page() == 1 && pages.text().isEmpty() && !pages.more());
+
     // Spaces at the end go, tabs and inner spaces stay; any line end reads as one.
     writefile(log, "a b   \r\n\tc \nlast   ");
-    logpages pages;
     ASSERT_TRUE(pages.open(log));
     EXPECT_EQ(pages.text(), QStringLiteral("a b\r\n\tc\r\nlast\r\n"));
     // UTF-8 as written by the log, and an older log's Windows-1252 bytes.
@@ -105,16 +111,6 @@ TEST_F(LogPages, TheLogIsNotHeldOpenWhileShown)
     EXPECT_EQ(pages.text().size(), 651 * 100);
     EXPECT_TRUE(pages.more());
     EXPECT_FALSE(pages.restart()); // gone now
-}
-
-TEST_F(LogPages, EmptyAndMissing)
-{
-    writefile(log, "");
-    logpages pages;
-    ASSERT_TRUE(pages.open(log));
-    EXPECT_TRUE(pages.page() == 1 && pages.text().isEmpty() && !pages.more());
-    EXPECT_FALSE(pages.open(dir.filePath(QStringLiteral("none.txt"))));
-    EXPECT_FALSE(pages.more());
 }
 
 TEST_F(LogPages, ClearLog)
