@@ -3,7 +3,7 @@
 // anyway" saves.
 #include "census/householdcheckfrm.h"
 
-#include "support/groupd_widgets.h"
+#include "support/dialogs.h"
 #include "support/mainfrmfixture.h"
 
 #include <QPlainTextEdit>

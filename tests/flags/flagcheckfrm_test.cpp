@@ -8,7 +8,7 @@
 #include "flags/flagcheck.h"
 #include "flags/flagsmenu_ui.h"
 #include "model/loadgedcom.h"
-#include "support/b_dialogs.h"
+#include "support/dialogs.h"
 #include "support/mainfrmfixture.h"
 #include "support/openfixture.h"
 #include "support/testflags.h"

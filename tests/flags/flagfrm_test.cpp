@@ -8,7 +8,7 @@
 
 #include "flags/flagalloc.h"
 #include "model/gedcomindex.h"
-#include "support/b_dialogs.h"
+#include "support/dialogs.h"
 #include "support/fixedpitch.h"
 #include "support/mainfrmfixture.h"
 

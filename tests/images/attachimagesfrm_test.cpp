@@ -8,7 +8,7 @@
 #include "images/imagechoices.h"
 #include "model/filechanged.h"
 #include "model/loadgedcom.h"
-#include "support/b_dialogs.h"
+#include "support/dialogs.h"
 #include "support/mainfrmfixture.h"
 
 #include <QAction>

@@ -11,7 +11,7 @@
 #include "images/newimagefrm.h"
 #include "model/loadgedcom.h"
 #include "platform/clock.h"
-#include "support/b_dialogs.h"
+#include "support/dialogs.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 

@@ -3,7 +3,7 @@
 // ends and how lines are read: logpages_test.
 #include "log/logfrm.h"
 
-#include "support/b_dialogs.h"
+#include "support/dialogs.h"
 #include "support/fixedpitch.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"

@@ -5,7 +5,7 @@
 #include "tools/coveragefrm.h"
 
 #include "model/loadgedcom.h"
-#include "support/groupd_widgets.h"
+#include "support/dialogs.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 

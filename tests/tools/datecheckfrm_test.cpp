@@ -8,7 +8,7 @@
 #include "platform/clock.h"
 #include "writer/saveroad.h"
 #include "support/mainfrmfixture.h"
-#include "support/groupd_widgets.h"
+#include "support/dialogs.h"
 #include "support/openfixture.h"
 
 #include <QAction>
@@ -108,9 +108,9 @@ private slots:
             done = true;
             QVERIFY(child<QRadioButton>(d, "countryopt0")->isChecked());
             // The lists as the check makes them (their texts: datecheck_test).
-            QCOMPARE(itemtexts(d, "changelst").size(), 3);
-            QCOMPARE(itemtexts(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
-            QCOMPARE(itemtexts(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
+            QCOMPARE(rows(d, "changelst").size(), 3);
+            QCOMPARE(rows(d, "countrylst"), QStringList{QStringLiteral("1 JUN 1850 (1 occurence) : USA 1850 Census")});
+            QCOMPARE(rows(d, "currentlst").value(0), QStringLiteral("6 JUN 1841 (5 occurences) : UK 1841 Census"));
             auto* changebut = child<QPushButton>(d, "changebut");
             auto* frame = child<QGroupBox>(d, "suggestionframe");
             auto* combo = child<QComboBox>(d, "suggestcombo");
@@ -126,14 +126,14 @@ private slots:
             QCOMPARE(details(d), QStringList{qs(w.index()->people[0].name) + QStringLiteral(" 43 Hebden Bridge, Yorkshire, England")});
             // ... left as it is.
             child(d, "OKbut")->click();
-            QVERIFY(frame->isHidden() && itemtexts(d, "countrylst").size() == 1);
+            QVERIFY(frame->isHidden() && rows(d, "countrylst").size() == 1);
 
             // Refuse the first proposal.
             clickitem(d, "changelst", 0);
             QVERIFY(child<QRadioButton>(d, "suggestopt0")->isChecked());
             child(d, "suggestopt1")->click();
             child(d, "OKbut")->click();
-            QCOMPARE(itemtexts(d, "changelst")[0],
+            QCOMPARE(rows(d, "changelst")[0],
                      QStringLiteral("ABT 1841 (1 occurence) : [User has requested Quillmark not to replace this date]"));
 
             // Change the second to another census: first without choosing one.
@@ -145,12 +145,12 @@ private slots:
             QVERIFY(frame->isVisible());
             combo->setCurrentIndex(combo->findText(QStringLiteral("Canada 1861 Census (14 JAN 1861)")));
             child(d, "OKbut")->click();
-            QCOMPARE(itemtexts(d, "changelst")[1],
+            QCOMPARE(rows(d, "changelst")[1],
                      QStringLiteral("7 Apr 1861 (1 occurence) : [Suggest replacing with Canada 1861 Census date 14 JAN 1861]"));
 
             // Places of a date.
             clickitem(d, "currentlst", 0);
-            QVERIFY(itemtexts(d, "changelst").size() == 3 && child<QListWidget>(d, "changelst")->selectedItems().isEmpty());
+            QVERIFY(rows(d, "changelst").size() == 3 && child<QListWidget>(d, "changelst")->selectedItems().isEmpty());
             child(d, "peopleopt1")->click();
             QCOMPARE(details(d), QStringList{QStringLiteral("Heptonstall, Yorkshire, England (in 5 census events)")});
 

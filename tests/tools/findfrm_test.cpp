@@ -5,7 +5,7 @@
 #include "tools/findfrm.h"
 
 #include "model/loadgedcom.h"
-#include "support/groupd_widgets.h"
+#include "support/dialogs.h"
 #include "support/mainfrmfixture.h"
 #include "support/screenreader.h"
 #include "tools/findindividual.h"
@@ -76,8 +76,8 @@ private slots:
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("lee, a"));
         QCOMPARE((QStringList{text(&d, "nametxt"), text(&d, "idtxt"), text(&d, "dobtxt"), text(&d, "placetxt")}),
                  (QStringList{"Lee, Ann", "1", "ABT 1850", "Leeds"}));
-        QCOMPARE(itemtexts(&d, "censuslst"), QStringList{"1881: aged 30 at York (4 High St)"});
-        QCOMPARE((QStringList{itemtexts(&d, "parentlst") + itemtexts(&d, "spouselst") + itemtexts(&d, "childrenlst")}),
+        QCOMPARE(rows(&d, "censuslst"), QStringList{"1881: aged 30 at York (4 High St)"});
+        QCOMPARE((QStringList{rows(&d, "parentlst") + rows(&d, "spouselst") + rows(&d, "childrenlst")}),
                  (QStringList{"Lee, Bob", "Lee, Bob", "Lee, Cy"}));
         QVERIFY(child(&d, "okbut")->isEnabled());
 
@@ -85,8 +85,8 @@ private slots:
         clickitem(&d, "spouselst", 0);
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
         QCOMPARE(text(&d, "dobtxt"), QString());
-        QCOMPARE(itemtexts(&d, "spouselst"), QStringList{"Lee, Ann"});
-        QCOMPARE(itemtexts(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
+        QCOMPARE(rows(&d, "spouselst"), QStringList{"Lee, Ann"});
+        QCOMPARE(rows(&d, "childrenlst"), QStringList{"Lee, Cy"}); // Ann, also a child of F1, is not
         QTest::keyClicks(child<QLineEdit>(&d, "searchnametxt"), QStringLiteral("x"));
         QCOMPARE(text(&d, "nametxt"), QStringLiteral("Lee, Bob"));
 
@@ -142,7 +142,7 @@ private slots:
             QVERIFY(!child(d, "okbut")->isEnabled());
             QTest::keyClicks(child<QLineEdit>(d, "searchnametxt"), QStringLiteral("ASHWORTH, JOHN (3"));
             QCOMPARE(text(d, "idtxt"), QStringLiteral("3"));
-            QCOMPARE(itemtexts(d, "spouselst"), QStringList{"Kershaw, Ellen"});
+            QCOMPARE(rows(d, "spouselst"), QStringList{"Kershaw, Ellen"});
             QVERIFY(replaceinfile(file, "1 NAME John /Ashworth/", "1 NAME Johnny /Ashworth/"));
             QTest::mouseClick(child(d, "okbut"), Qt::LeftButton);
         });

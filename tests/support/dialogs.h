@@ -1,7 +1,7 @@
 #pragma once
-// The controls of a dialog found by the names the program gives them, and the
-// rows of its lists, and whether every prompt and dialog was answered, for the
-// window tests of the flag, image and log tools.
+// The controls of a window found by the names the program gives them, the
+// rows of its lists read and clicked, and whether every prompt and dialog was
+// answered: for the window tests.
 // Header only: the logic tests do not link the windows.
 
 #include "platform/scriptedprompts.h"
@@ -81,6 +81,14 @@ inline void clickitem(QListWidget* l, const QString& start)
     const int i = rowstarting(l, start);
     QVERIFY2(i >= 0, qPrintable(start));
     QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(l->item(i)).center());
+}
+
+// Clicks row `row` of a list, scrolled into view first.
+inline void clickitem(const QWidget* w, const char* list, int row)
+{
+    auto* l = child<QListWidget>(w, list);
+    l->scrollToItem(l->item(row));
+    QTest::mouseClick(l->viewport(), Qt::LeftButton, {}, l->visualItemRect(l->item(row)).center());
 }
 
 } // namespace qmtest
