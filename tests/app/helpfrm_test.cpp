@@ -1,11 +1,10 @@
 // The help window offscreen (topics, navigation, search, help under a modal
-// dialog) and, through the main window, the Help menu, F1, About, "Make a
-// Donation..." and the milestone after a save.
+// dialog) and, through the main window, the Help menu, F1, About and "Make a
+// Donation...". The milestone after a save: saveentryfrm_test.
 #include "app/helpfrm.h"
 #include "support/mainfrmfixture.h"
 
 #include <QAction>
-#include <QDir>
 #include <QListWidget>
 #include <QMenuBar>
 #include <QPushButton>
@@ -122,8 +121,9 @@ private slots:
         QCOMPARE(h->currentpage(), QStringLiteral("options.html"));
     }
 
-    // The Help menu and F1 reach the prompts with their topics.
-    void helpmenuandf1throughthemainwindow()
+    // The Help menu and F1 reach the prompts with their topics; About and
+    // Donate open their windows.
+    void helpmenuthroughthemainwindow()
     {
         auto run = files_.opened(files_.sample());
         QVERIFY(run);
@@ -150,12 +150,9 @@ private slots:
         QTest::keyClick(box, Qt::Key_F1);
         QCOMPARE(pressed, 1);
         QCOMPARE(run->prompts.helpshown.size(), 4);
-    }
+        d.close();
 
-    void aboutanddonatefromthehelpmenu()
-    {
-        auto run = files_.opened(files_.sample());
-        QVERIFY(run);
+        // About and "Make a Donation...".
         dialoganswers answers;
         QString caption;
         answers.expect(QStringLiteral("aboutfrm"), [&](QDialog* d) {
@@ -168,8 +165,8 @@ private slots:
             button(d, "regularbut")->click();
             button(d, "closebut")->click();
         });
-        trigger(*run->w, "aboutmen");
-        trigger(*run->w, "donatemen");
+        trigger(w, "aboutmen");
+        trigger(w, "donatemen");
         QCOMPARE(answers.unexpected, 0);
         QCOMPARE(caption, QStringLiteral("About Quillmark %1.%2.%3|Would you like to make a donation?")
                               .arg(QM_VERSION_MAJOR)
@@ -177,60 +174,6 @@ private slots:
                               .arg(QM_VERSION_PATCH));
         QCOMPARE(run->prompts.opened, (QStringList{QStringLiteral("https://quillmark.org/donate"),
                                                    QStringLiteral("https://quillmark.org/donate/regular")}));
-    }
-
-    // The tenth saved entry shows the milestone window; the eleventh does not.
-    void milestoneafterthetenthsavedentry()
-    {
-        settings s = defaultsettings();
-        const QString folder = files_.filepath(QStringLiteral("milestone"));
-        // The household check is tested on its own (householdcheckfrm_test).
-        s.householdcheck = false;
-        QDir().mkpath(folder + QStringLiteral("/backups"));
-        s.backupfolder = folder + QStringLiteral("/backups");
-        s.logpath = folder + QStringLiteral("/censuslog.txt");
-        s.requestimage = false;
-        s.birthdate = false;
-        s.nosourcetextwarning = false;
-
-        session run(files_.ini());
-        savesettings(*run.store, s);
-        saveflagsettings(*run.store, s);
-        run.store->write(QStringLiteral("Count"), QStringLiteral("9"));
-        run.make();
-        run.prompts.expect(answer::no, QStringLiteral("by default"));
-        QVERIFY(run.w->start({QLatin1Char('"') + files_.sample() + QLatin1Char('"')}));
-        run.w->show();
-        QVERIFY(QTest::qWaitForWindowExposed(run.w.get()));
-        mainfrm& w = *run.w;
-
-        const auto typeentry = [&](int32_t id) {
-            chooseyear(w, QStringLiteral("1881"));
-            w.panel()->locationtxt->setText(QStringLiteral("Hebden Bridge, Yorkshire, England"));
-            w.panel()->referencetxt->setText(QStringLiteral("RG11/4426/52"));
-            clickid(w, peoplelist(w), id);
-            typerow(w, 0, QStringLiteral("28"));
-        };
-        dialoganswers answers;
-        QString text;
-        answers.expect(QStringLiteral("donatefrm"), [&](QDialog* d) {
-            auto* mainlab = d->findChild<QLabel*>(QStringLiteral("mainlab"));
-            text = mainlab->isHidden() ? QString() : d->windowTitle() + QLatin1Char('|') + mainlab->text();
-            button(d, "closebut")->click();
-        });
-        typeentry(11);
-        button(&w, "addbut")->click();
-        QCOMPARE(run.read("Count"), QStringLiteral("10"));
-        QCOMPARE(answers.unexpected, 0);
-        QCOMPARE(text, QStringLiteral("Milestone|For your information you have now used Quillmark to create at least "
-                                      "10 census entries."));
-
-        typeentry(27);
-        button(&w, "addbut")->click();
-        QCOMPARE(run.read("Count"), QStringLiteral("11"));
-        QCOMPARE(answers.unexpected, 0);
-        QCOMPARE(answers.seen, QStringList{QStringLiteral("donatefrm")});
-        QCOMPARE(run.prompts.unexpected(), 0);
     }
 };
 

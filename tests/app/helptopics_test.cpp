@@ -51,7 +51,7 @@ QStringList ranked(const std::vector<helpdoc>& docs, const char* query)
 } // namespace
 
 // The resource file lists exactly the pages of the folder, and every topic has its own.
-TEST(HelpTopics, EveryTopicHasItsOwnPageInTheResources)
+TEST(HelpTopics, EveryTopicHasItsOwnPageInTheResourcesOthersTheIndex)
 {
     QStringList listed = qrcfiles();
     QStringList folder = QDir(helpdir()).entryList({QStringLiteral("*.html"), QStringLiteral("*.css")}, QDir::Files);
@@ -68,10 +68,8 @@ TEST(HelpTopics, EveryTopicHasItsOwnPageInTheResources)
         seen.insert(t.page);
     }
     EXPECT_EQ(numbers, (std::vector<int>{12, 14, 17, 18, 19, 20, 23, 24, 30, 35, 45, 55, 60}));
-}
 
-TEST(HelpTopics, CommandsAndUnknownTopics)
-{
+    // The commands, and topics that have no page.
     EXPECT_EQ(pagefor(0, QStringLiteral("Index")), QStringLiteral("index.html"));
     EXPECT_EQ(pagefor(0, QStringLiteral("Search")), QStringLiteral("search.html"));
     EXPECT_EQ(pagefor(45, QStringLiteral("Search")), QStringLiteral("search.html")); // the command wins

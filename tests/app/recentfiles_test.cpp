@@ -9,36 +9,27 @@
 
 using namespace qm;
 
-namespace {
-recentfiles filled()
+// Each step remembers or removes a path; the four slots after it.
+TEST(RecentFiles, RememberMovesToFirstSlotRemoveMovesLaterSlotsUp)
 {
     recentfiles r;
     r.paths = {QStringLiteral("/a.ged"), QStringLiteral("/b.ged"), QStringLiteral("/c.ged"), QStringLiteral("/d.ged")};
-    return r;
-}
-} // namespace
-
-TEST(RecentFiles, RememberMovesToFirstSlot)
-{
-    recentfiles r = filled();
-    r.remember(QStringLiteral("/c.ged")); // slot 3 to 1; 1 and 2 move down; 4 unchanged
-    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/c.ged", "/a.ged", "/b.ged", "/d.ged"}));
-    r.remember(QStringLiteral("/c.ged")); // already first: nothing moves
-    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/c.ged", "/a.ged", "/b.ged", "/d.ged"}));
-    r.remember(QStringLiteral("/e.ged")); // new: the last is dropped
-    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/e.ged", "/c.ged", "/a.ged", "/b.ged"}));
-    r.remember(QStringLiteral("/C.ged")); // compared as exact text
-    EXPECT_EQ(r.paths[0], "/C.ged");
-    EXPECT_EQ(r.paths[1], "/e.ged");
-}
-
-TEST(RecentFiles, RemoveMovesLaterSlotsUp)
-{
-    recentfiles r = filled();
-    r.remove(QStringLiteral("/b.ged"));
-    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/a.ged", "/c.ged", "/d.ged", ""}));
-    r.remove(QStringLiteral("/x.ged"));
-    EXPECT_EQ(r.paths, (std::array<QString, 4>{"/a.ged", "/c.ged", "/d.ged", ""}));
+    const struct {
+        bool remember;
+        const char* path;
+        std::array<QString, 4> after;
+    } steps[] = {
+        {true, "/c.ged", {"/c.ged", "/a.ged", "/b.ged", "/d.ged"}}, // slot 3 to 1, 1 and 2 down, 4 stays
+        {true, "/c.ged", {"/c.ged", "/a.ged", "/b.ged", "/d.ged"}}, // already first: nothing moves
+        {true, "/e.ged", {"/e.ged", "/c.ged", "/a.ged", "/b.ged"}}, // new: the last is dropped
+        {true, "/C.ged", {"/C.ged", "/e.ged", "/c.ged", "/a.ged"}}, // compared as exact text
+        {false, "/c.ged", {"/C.ged", "/e.ged", "/a.ged", ""}},
+        {false, "/x.ged", {"/C.ged", "/e.ged", "/a.ged", ""}},
+    };
+    for (const auto& step : steps) {
+        step.remember ? r.remember(QString::fromLatin1(step.path)) : r.remove(QString::fromLatin1(step.path));
+        EXPECT_EQ(r.paths, step.after) << step.path;
+    }
     EXPECT_FALSE(r.inuse(3));
 }
 

@@ -91,9 +91,9 @@ public:
         return rc == 0 ? out : QString();
     }
 
-    // A window started on `file` from the command line (with settings s when
-    // given), the default-file question answered No; shown, so that lists can
-    // be clicked.
+    // A window started on `file` from the command line (with settings s, and
+    // its Count, when given), the default-file question answered No; shown, so
+    // that lists can be clicked.
     std::unique_ptr<session> opened(const QString& file, const qm::settings* s = nullptr)
     {
         auto r = std::make_unique<session>(ini());
@@ -109,6 +109,8 @@ public:
             }
             qm::savesettings(*r->store, given);
             qm::saveflagsettings(*r->store, given);
+            if (given.count > 0)
+                r->store->write(QStringLiteral("Count"), QString::number(given.count));
         }
         r->make();
         r->prompts.expect(qm::answer::no, QStringLiteral("by default"));
