@@ -28,40 +28,37 @@ private:
 
 } // namespace
 
-TEST(Recognisedate, EnglishMonthsInAnyCase)
+TEST(Recognisedate, EnglishMonthsInAnyCaseAndNumbersInTheLocaleOrder)
 {
-    for (const char* text : {"4 apr 1881", "04 APR 1881", "4 April 1881", "4-Apr-1881", "4 Apr. 1881",
-                             "April 4 1881", "apr 4, 1881", " 4  APR 1881 ", "4 aPrIl 1881"})
-        EXPECT_EQ(recognisedate(QString::fromLatin1(text), dateorder::dmy), d(1881, 4, 4)) << text;
-    EXPECT_EQ(recognisedate(u"3 Sept 1851", dateorder::dmy), d(1851, 9, 3));
-    EXPECT_EQ(recognisedate(u"APR 1881", dateorder::mdy), d(1881, 4, 1));
-    EXPECT_EQ(recognisedate(u"29 FEB 1852", dateorder::dmy), d(1852, 2, 29));
-}
+    constexpr dateorder dmy = dateorder::dmy, mdy = dateorder::mdy, ymd = dateorder::ymd;
+    const struct {
+        dateorder order;
+        std::optional<QDate> day; // none: not one day
+        std::vector<const char*> texts;
+    } rows[] = {
+        {dmy, d(1881, 4, 4), {"4 apr 1881", "04 APR 1881", "4 April 1881", "4-Apr-1881", "4 Apr. 1881", "April 4 1881",
+                              "apr 4, 1881", " 4  APR 1881 ", "4 aPrIl 1881"}},
+        {dmy, d(1851, 9, 3), {"3 Sept 1851"}},
+        {mdy, d(1881, 4, 1), {"APR 1881"}},
+        {dmy, d(1852, 2, 29), {"29 FEB 1852"}},
+        {dmy, std::nullopt, {"", "1881", "ABT 1881", "BET 1850 AND 1852", "31 FEB 1881", "29 FEB 1851", "0 APR 1881",
+                             "32 APR 1881", "4 Apr", "4/4/81", "4 AP 1881", "4 Aprilx 1881", "4 APR 1881 1882",
+                             "4 MAI 1881", "4 APR 18810", "4 APR 1881?", "13/13/1881", "4 APR 0000"}},
+        {dmy, d(1881, 4, 3), {"3/4/1881", "03.04.1881", "1881-04-03"}},
+        {mdy, d(1881, 3, 4), {"3/4/1881"}},
+        {mdy, std::nullopt, {"13/4/1881"}},
+        {ymd, std::nullopt, {"3/4/1881"}},
+        {mdy, d(1881, 4, 3), {"1881-04-03"}}, // year first with four digits reads the same everywhere
+        {ymd, d(1881, 4, 3), {"1881-04-03"}},
+    };
+    for (const auto& row : rows)
+        for (const char* text : row.texts)
+            EXPECT_EQ(recognisedate(QString::fromLatin1(text), row.order), row.day) << text << " " << int(row.order);
 
-TEST(Recognisedate, RefusesWhatIsNotOneDay)
-{
-    for (const char* text : {"", "1881", "ABT 1881", "BET 1850 AND 1852", "31 FEB 1881", "29 FEB 1851",
-                             "0 APR 1881", "32 APR 1881", "4 Apr", "4/4/81", "4 AP 1881", "4 Aprilx 1881",
-                             "4 APR 1881 1882", "4 MAI 1881", "4 APR 18810", "4 APR 1881?", "13/13/1881",
-                             "4 APR 0000"})
-        EXPECT_FALSE(recognisedate(QString::fromLatin1(text), dateorder::dmy)) << text;
-}
-
-TEST(Recognisedate, NumericDatesFollowTheLocaleOrder)
-{
-    EXPECT_EQ(recognisedate(u"3/4/1881", dateorder::dmy), d(1881, 4, 3));
-    EXPECT_EQ(recognisedate(u"3/4/1881", dateorder::mdy), d(1881, 3, 4));
-    EXPECT_EQ(recognisedate(u"03.04.1881", dateorder::dmy), d(1881, 4, 3));
-    EXPECT_FALSE(recognisedate(u"3/4/1881", dateorder::ymd));
-    EXPECT_FALSE(recognisedate(u"13/4/1881", dateorder::mdy));
-    // Year first with four digits reads the same everywhere.
-    for (dateorder o : {dateorder::dmy, dateorder::mdy, dateorder::ymd})
-        EXPECT_EQ(recognisedate(u"1881-04-03", o), d(1881, 4, 3));
-
-    EXPECT_EQ(localedateorder(QLocale(QLocale::German, QLocale::Germany)), dateorder::dmy);
-    EXPECT_EQ(localedateorder(QLocale(QLocale::English, QLocale::UnitedKingdom)), dateorder::dmy);
-    EXPECT_EQ(localedateorder(QLocale(QLocale::English, QLocale::UnitedStates)), dateorder::mdy);
-    EXPECT_EQ(localedateorder(QLocale(QLocale::Chinese, QLocale::China)), dateorder::ymd);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::German, QLocale::Germany)), dmy);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::English, QLocale::UnitedKingdom)), dmy);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::English, QLocale::UnitedStates)), mdy);
+    EXPECT_EQ(localedateorder(QLocale(QLocale::Chinese, QLocale::China)), ymd);
 }
 
 TEST(Recognisedate, TypedUnderAnyLocaleIsWrittenInEnglish)
@@ -83,7 +80,7 @@ TEST(Recognisedate, TypedUnderAnyLocaleIsWrittenInEnglish)
     }
 }
 
-TEST(Formatgedcomdate, StampsAndMonths)
+TEST(Formatgedcomdate, StampsMonthsAndCompletedYears)
 {
     EXPECT_EQ(formatgedcomdate(d(2026, 12, 4)), "04 DEC 2026");
     EXPECT_EQ(formatgedcomdate(d(1851, 3, 30)), "30 MAR 1851");
@@ -92,16 +89,11 @@ TEST(Formatgedcomdate, StampsAndMonths)
     EXPECT_EQ(formatgedcomtime(QTime(9, 5, 7)), "09:05:07");
     EXPECT_EQ(englishmonth(9), "SEP");
     EXPECT_EQ(englishmonth(13), "");
-}
-
-TEST(Completedyears, CountsWholeYears)
-{
-    EXPECT_EQ(completedyears(d(1851, 3, 3), d(1881, 4, 3)), 30);
-    EXPECT_EQ(completedyears(d(1851, 4, 3), d(1881, 4, 3)), 30); // birthday on census day
-    EXPECT_EQ(completedyears(d(1851, 4, 4), d(1881, 4, 3)), 29);
-    EXPECT_EQ(completedyears(d(1851, 12, 31), d(1881, 4, 3)), 29);
-    EXPECT_EQ(completedyears(d(1881, 5, 1), d(1881, 4, 3)), 0);
-    EXPECT_EQ(completedyears(d(1883, 5, 1), d(1881, 4, 3)), -2);
+    // Whole years to the census day of 3 APR 1881 (a birthday on the day counts).
+    std::vector<int> years;
+    for (const QDate& born : {d(1851, 3, 3), d(1851, 4, 3), d(1851, 4, 4), d(1851, 12, 31), d(1881, 5, 1), d(1883, 5, 1)})
+        years.push_back(completedyears(born, d(1881, 4, 3)));
+    EXPECT_EQ(years, (std::vector<int>{30, 30, 29, 29, 0, -2}));
 }
 
 TEST(Datephrase, PhrasesAndAges)
@@ -225,23 +217,24 @@ TEST(Personinfo, TheLineForAnIndividual)
 
 TEST(Validdate, NormalisesTypedDates)
 {
-    auto r = validdate(u"4 apr 1881"_s, u"3 APR 1881"_s, dateorder::dmy);
-    EXPECT_TRUE(r.isdate);
-    EXPECT_EQ(r.newtext, u"04 APR 1881"_s);
-
-    // The official date stands as it is.
-    r = validdate(u"3 APR 1881"_s, u"3 APR 1881"_s, dateorder::dmy);
-    EXPECT_TRUE(r.isdate);
-    EXPECT_FALSE(r.newtext);
-    // Typed differently, the official day keeps the official spelling.
-    EXPECT_EQ(validdate(u" 03 apr 1881"_s, u"3 APR 1881"_s, dateorder::dmy).newtext, u"3 APR 1881"_s);
-    EXPECT_EQ(validdate(u"3/4/1881"_s, u"3 APR 1881"_s, dateorder::dmy).newtext, u"3 APR 1881"_s);
-    // Already in the written form: nothing to change.
-    EXPECT_FALSE(validdate(u"04 APR 1881"_s, u"3 APR 1881"_s, dateorder::dmy).newtext);
-    EXPECT_EQ(validdate(u"4 apr 1881"_s, u""_s, dateorder::dmy).newtext, u"04 APR 1881"_s);
-
-    r = validdate(u"ABT 1881"_s, u"3 APR 1881"_s, dateorder::dmy);
-    EXPECT_FALSE(r.isdate);
-    EXPECT_FALSE(r.newtext);
-    EXPECT_FALSE(validdate(u""_s, u"3 APR 1881"_s, dateorder::dmy).isdate);
+    const struct {
+        const char* typed;
+        const char* official;
+        bool isdate;
+        std::optional<QString> newtext; // none: the text stands
+    } rows[] = {
+        {"4 apr 1881", "3 APR 1881", true, u"04 APR 1881"_s},
+        {"3 APR 1881", "3 APR 1881", true, std::nullopt}, // the official date stands as it is
+        {" 03 apr 1881", "3 APR 1881", true, u"3 APR 1881"_s}, // typed otherwise, it keeps the official spelling
+        {"3/4/1881", "3 APR 1881", true, u"3 APR 1881"_s},
+        {"04 APR 1881", "3 APR 1881", true, std::nullopt}, // already in the written form
+        {"4 apr 1881", "", true, u"04 APR 1881"_s},
+        {"ABT 1881", "3 APR 1881", false, std::nullopt},
+        {"", "3 APR 1881", false, std::nullopt},
+    };
+    for (const auto& row : rows) {
+        const datecheck r = validdate(QString::fromLatin1(row.typed), QString::fromLatin1(row.official), dateorder::dmy);
+        EXPECT_EQ(r.isdate, row.isdate) << row.typed;
+        EXPECT_EQ(r.newtext, row.newtext) << row.typed;
+    }
 }

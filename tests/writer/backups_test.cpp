@@ -1,24 +1,18 @@
+// Backups of the family file: their names and bytes, failures told in the
+// system's words, the folder checks, the removal of old backups, and two
+// Quillmarks backing up into one folder at once.
 #include "writer/backups.h"
 
-#include "platform/clock.h"
-#include "platform/filetime.h"
 #include "platform/scriptedprompts.h"
-#include "settings/settings.h"
+#include "support/c_savefolder.h"
 #include "support/readonlyfolder.h"
-#include "support/testfiles.h"
 
-#include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 #include <thread>
 #include <utility>
 #include <vector>
-
-#include <unistd.h>
 
 using namespace qm;
 using qmtest::readfile;
@@ -26,21 +20,14 @@ using qmtest::writefile;
 
 namespace {
 
-const QDateTime fixed(QDate(2026, 12, 4), QTime(23, 50, 7));
-
-class Backups : public ::testing::Test {
+class Backups : public qmtest::savefolder {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
-        QDir(dir.path()).mkdir(QStringLiteral("bk"));
-        folder = dir.filePath(QStringLiteral("bk"));
-        family = dir.filePath(QStringLiteral("family.ged"));
-        writefile(family, "0 HEAD\r\n0 TRLR\r\n");
-        setmodified(family, QDateTime(QDate(2020, 1, 2), QTime(3, 4, 5)).toMSecsSinceEpoch());
-        setclockfortests(fixed);
+        savefolder::SetUp();
+        folder = s.backupfolder;
+        putfamily("0 HEAD\r\n0 TRLR\r\n");
     }
-    void TearDown() override { setclockfortests(QDateTime()); }
 
     // A file in the backup folder with a given last-modified day.
     void put(const QString& name, int day)
@@ -51,31 +38,27 @@ protected:
     }
     QStringList names() const { return QDir(folder).entryList(QDir::Files, QDir::Name); }
 
-    QTemporaryDir dir;
-    QString folder, family;
+    QString folder;
     scriptedprompts prompts;
 };
 
 } // namespace
 
-// (A read-only family file, as a shared one may be, backs up all the same.)
-TEST_F(Backups, CopyKeepsBytesAndTimeAndLeavesFamilyFile)
+// A copy with the file's bytes and time; a second one in the same second gets
+// a suffix. (A read-only family file, as a shared one may be, backs up all the same.)
+TEST_F(Backups, CopyKeepsBytesAndTimeAndSameSecondGetsSuffixes)
 {
     QFile::setPermissions(family, QFileDevice::ReadOwner);
     const filestamp before = stampof(family);
-    const backupresult r = makebackup(family, folder);
-    ASSERT_TRUE(r.ok()) << r.error.toStdString();
-    EXPECT_EQ(QFileInfo(r.path).fileName(), QStringLiteral("QM Backup 2026_12_04_23_50_07.ged"));
-    EXPECT_EQ(readfile(r.path), readfile(family));
-    EXPECT_EQ(stampof(r.path), before);
-    EXPECT_EQ(stampof(family), before);
-}
-
-TEST_F(Backups, SameSecondGetsSuffixes)
-{
     QStringList got;
-    for (int i = 0; i < 4; ++i)
-        got << QFileInfo(makebackup(family, folder).path).fileName();
+    for (int i = 0; i < 4; ++i) {
+        const backupresult r = makebackup(family, folder);
+        ASSERT_TRUE(r.ok()) << r.error.toStdString();
+        EXPECT_EQ(readfile(r.path), readfile(family));
+        EXPECT_EQ(stampof(r.path), before);
+        got << QFileInfo(r.path).fileName();
+    }
+    EXPECT_EQ(stampof(family), before);
     EXPECT_EQ(got, (QStringList{QStringLiteral("QM Backup 2026_12_04_23_50_07.ged"),
                                 QStringLiteral("QM Backup 2026_12_04_23_50_071.ged"),
                                 QStringLiteral("QM Backup 2026_12_04_23_50_07 2.ged"),
@@ -103,7 +86,6 @@ TEST_F(Backups, FolderCheck)
 {
     EXPECT_FALSE(checkbackupfolder(prompts, folder));
     EXPECT_TRUE(names().isEmpty()) << "the probe file is removed";
-
     prompts.expect(answer::ok, QStringLiteral("does not exist. "));
     EXPECT_TRUE(checkbackupfolder(prompts, dir.filePath(QStringLiteral("gone"))));
     EXPECT_EQ(prompts.unexpected(), 0);
@@ -121,8 +103,6 @@ TEST_F(Backups, ReadOnlyFolderCannotBeWrittenTo)
 
 TEST_F(Backups, CheckPathsStopsAtLogProblem)
 {
-    settings s;
-    s.keeplog = true;
     s.logpath = dir.filePath(QStringLiteral("nofolder/censuslog.txt"));
     s.backupfolder = dir.filePath(QStringLiteral("gone")); // not reported: the log check came first
     prompts.expect(answer::ok, QStringLiteral("The current log file can not be written to ("));
@@ -133,24 +113,26 @@ TEST_F(Backups, CheckPathsStopsAtLogProblem)
     s.backupfolder = folder;
     EXPECT_FALSE(checkpaths(prompts, s));
     EXPECT_TRUE(QFileInfo::exists(s.logpath)) << "a missing log is created";
-
     s.keeplog = false;
     s.logpath = dir.filePath(QStringLiteral("nofolder/censuslog.txt"));
     EXPECT_FALSE(checkpaths(prompts, s));
 }
 
-TEST_F(Backups, RemoveOldNoneAndFew)
+TEST_F(Backups, RemoveOldNoneAndFewAndOldFormRenamedFirst)
 {
     put(QStringLiteral("other.ged"), 1);
     prompts.expect(answer::ok, QStringLiteral("You have no Quillmark backup files to delete."));
     removeoldbackups(prompts, folder);
-
-    for (int d = 1; d <= 5; ++d)
+    put(QStringLiteral("Backup  12.ged"), 9);
+    put(QStringLiteral("Backup  x.ged"), 10);
+    for (int d = 1; d <= 4; ++d)
         put(QStringLiteral("QM Backup 2021_03_0%1_12_00_00.ged").arg(d), d);
     prompts.expect(answer::ok, QStringLiteral("You only have 5 Quillmark backup files and so none will be deleted"));
     removeoldbackups(prompts, folder);
-    EXPECT_EQ(names().size(), 6);
     EXPECT_EQ(prompts.unexpected(), 0);
+    EXPECT_EQ(names().size(), 7);
+    EXPECT_TRUE(names().contains(QStringLiteral("QM Backup 2021_03_09_12_00_00.ged")));
+    EXPECT_TRUE(names().contains(QStringLiteral("Backup  x.ged")));
 }
 
 TEST_F(Backups, RemoveOldKeepsFiveNewestByTime)
@@ -173,16 +155,6 @@ TEST_F(Backups, RemoveOldKeepsFiveNewestByTime)
     EXPECT_EQ(prompts.unexpected(), 0);
 }
 
-TEST_F(Backups, RemoveOldRenamesOldFormFirst)
-{
-    put(QStringLiteral("Backup  12.ged"), 9);
-    put(QStringLiteral("Backup  x.ged"), 10);
-    prompts.expect(answer::ok, QStringLiteral("You only have 1 Quillmark"));
-    removeoldbackups(prompts, folder);
-    EXPECT_EQ(names(), (QStringList{QStringLiteral("Backup  x.ged"), QStringLiteral("QM Backup 2021_03_09_12_00_00.ged")}));
-    EXPECT_EQ(prompts.unexpected(), 0);
-}
-
 // Two Quillmarks backing up two family files into one folder in the same
 // second: each takes a name of its own by creating it, none fails, and none
 // removes or overwrites the other's backup.
@@ -199,7 +171,6 @@ TEST_F(Backups, BackupsMadeAtOnceNeverTakeEachOthersName)
     for (int i = 0; i < each; ++i)
         a.push_back(makebackup(family, folder));
     other.join();
-
     for (const auto& [made, from] : {std::pair{&a, family}, std::pair{&b, second}})
         for (const backupresult& r : *made) {
             ASSERT_TRUE(r.ok()) << r.error.toStdString();

@@ -1,17 +1,15 @@
+// The open family file: reading it (listeners, failures, faulty flag
+// definitions), the pause of the watch, changes by other programs (told by
+// time, size or absence), and the save through it.
 #include "writer/openfile.h"
 
-#include "platform/filetime.h"
+#include "model/filechanged.h"
 #include "platform/scriptedprompts.h"
 #include "platform/settingsstore.h"
+#include "support/c_savefolder.h"
 #include "support/censusentries.h"
-#include "support/testfiles.h"
 
-#include <QDir>
 #include <QFile>
-#include <QFileInfo>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 #include <stdexcept>
 
@@ -20,29 +18,19 @@ using qmtest::readfile;
 
 namespace {
 
-const std::string family = "0 HEAD\r\n1 CHAR ANSI\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n0 @I2@ INDI\r\n"
-                           "1 NAME Mary /Smith/\r\n0 @S1@ SOUR\r\n1 TITL Census 1851 Leeds\r\n0 TRLR\r\n";
+const std::string original = "0 HEAD\r\n1 CHAR ANSI\r\n0 @I1@ INDI\r\n1 NAME John /Smith/\r\n0 @I2@ INDI\r\n"
+                             "1 NAME Mary /Smith/\r\n0 @S1@ SOUR\r\n1 TITL Census 1851 Leeds\r\n0 TRLR\r\n";
 
-class OpenFile : public ::testing::Test {
+class OpenFile : public qmtest::savefolder {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(dir.isValid());
+        savefolder::SetUp();
         store = settingsstore::onfile(dir.filePath(QStringLiteral("settings.ini")));
-        path = write(QStringLiteral("family.ged"), family);
-        // Another second than the writes of the test, so that a change is seen.
-        setmodified(path, QDateTime(QDate(2024, 5, 6), QTime(7, 8, 9)).toMSecsSinceEpoch());
-    }
-    QString write(const QString& name, const std::string& bytes)
-    {
-        const QString p = dir.filePath(name);
-        qmtest::writefile(p, bytes);
-        return p;
+        putfamily(original);
     }
 
-    QTemporaryDir dir;
     std::unique_ptr<settingsstore> store;
-    QString path;
     scriptedprompts prompts;
 };
 
@@ -56,9 +44,9 @@ TEST_F(OpenFile, ReadTellsListenersInOrderWithTheWatchPaused)
     f.onread([&] { heard << QStringLiteral("a:%1:%2").arg(f.index()->people.size()).arg(int(f.watching())); });
     f.onread([&] { heard << QStringLiteral("b"); });
 
-    const readoutcome out = f.load(path);
+    const readoutcome out = f.load(family);
     EXPECT_TRUE(out.ok && out.error.isEmpty() && out.flagerror.isEmpty());
-    EXPECT_EQ(f.path(), path);
+    EXPECT_EQ(f.path(), family);
     EXPECT_EQ(heard, (QStringList{QStringLiteral("a:2:0"), QStringLiteral("b")}));
     EXPECT_TRUE(f.watching()) << "the watch comes back after the read";
     EXPECT_EQ(prompts.busy, 0);
@@ -73,7 +61,8 @@ TEST_F(OpenFile, FailedReadKeepsTheFileReadBefore)
     openfile f(*store, &prompts);
     int heard = 0;
     f.onread([&] { ++heard; });
-    const QString missing = dir.filePath(QStringLiteral("gone.ged"));
+    const QString missing = dir.filePath(QStringLiteral("gone.ged")), nohead = dir.filePath(QStringLiteral("nohead.ged"));
+    qmtest::writefile(nohead, "0 @I1@ INDI\r\n");
     // Nothing read before: an empty index over the path asked for.
     readoutcome out = f.load(missing);
     EXPECT_FALSE(out.ok);
@@ -82,19 +71,19 @@ TEST_F(OpenFile, FailedReadKeepsTheFileReadBefore)
     EXPECT_EQ(f.path(), missing);
     EXPECT_EQ(heard, 1);
 
-    ASSERT_TRUE(f.load(path).ok);
+    ASSERT_TRUE(f.load(family).ok);
     const gedcomindex* before = f.index();
-    for (const QString& bad : {missing, dir.path(), write(QStringLiteral("nohead.ged"), "0 @I1@ INDI\r\n")}) {
+    for (const QString& bad : {missing, dir.path(), nohead}) {
         prompts.clear();
         out = f.load(bad, true);
         EXPECT_FALSE(out.ok) << bad.toStdString();
         EXPECT_FALSE(out.error.isEmpty());
         EXPECT_EQ(prompts.texts(), QStringList{out.error}) << "told as a warning";
         EXPECT_EQ(f.index(), before);
-        EXPECT_EQ(f.path(), path);
+        EXPECT_EQ(f.path(), family);
     }
     EXPECT_EQ(heard, 5) << "listeners run after a failed read too";
-    EXPECT_TRUE(f.load(path + QStringLiteral("x"), true).error.contains(QStringLiteral("family.gedx")));
+    EXPECT_TRUE(f.load(family + QStringLiteral("x"), true).error.contains(QStringLiteral("family.gedx")));
     EXPECT_TRUE(out.error.contains(QStringLiteral("has no \"0 HEAD\" line")));
 }
 
@@ -109,7 +98,7 @@ TEST_F(OpenFile, FaultyFlagDefinitionsAreToldBeforeTheReadFails)
     // Without prompts (the command-line tool) the messages are only in the outcome.
     store->write(QStringLiteral("Flags/1"), QStringLiteral("Code"), QStringLiteral("__"));
     openfile quiet(*store);
-    EXPECT_FALSE(quiet.load(path).flagerror.isEmpty());
+    EXPECT_FALSE(quiet.load(family).flagerror.isEmpty());
     EXPECT_EQ(prompts.texts().size(), 2);
 }
 
@@ -139,14 +128,14 @@ TEST_F(OpenFile, SeesChangesAndRemovalByOtherPrograms)
 {
     openfile f(*store);
     EXPECT_FALSE(f.changed() || f.missing()) << "nothing read yet";
-    ASSERT_TRUE(f.load(path).ok);
+    ASSERT_TRUE(f.load(family).ok);
     EXPECT_FALSE(f.changed() || f.missing());
-    qmtest::writefile(path, family + "0 @I3@ INDI\r\n");
+    qmtest::writefile(family, original + "0 @I3@ INDI\r\n");
     EXPECT_TRUE(f.changed());
     EXPECT_FALSE(f.missing());
     ASSERT_TRUE(f.reload().ok);
     EXPECT_FALSE(f.changed());
-    ASSERT_TRUE(QFile::rename(path, path + QStringLiteral(".moved")));
+    ASSERT_TRUE(QFile::rename(family, family + QStringLiteral(".moved")));
     EXPECT_TRUE(f.missing());
     EXPECT_TRUE(f.changed());
 }
@@ -154,31 +143,47 @@ TEST_F(OpenFile, SeesChangesAndRemovalByOtherPrograms)
 TEST_F(OpenFile, SaveRunsTheSaveRoadAndNotesTheNewStamp)
 {
     openfile f(*store);
-    ASSERT_TRUE(f.load(path).ok);
-    settings s = f.currentsettings();
-    s.backupfolder = dir.filePath(QStringLiteral("backups"));
-    s.logpath = dir.filePath(QStringLiteral("censuslog.txt"));
+    ASSERT_TRUE(f.load(family).ok);
+    const settings folders = s;
+    s = f.currentsettings();
+    s.backupfolder = folders.backupfolder;
+    s.logpath = folders.logpath;
     s.keeplog = true;
-    QDir(dir.path()).mkpath(QStringLiteral("backups"));
     f.usesettings(s);
-
     rewriterequest rq;
     rq.entry = qmtest::censusof(QStringLiteral("2"), "Census 1851 Leeds", "Leeds, Yorkshire", "30 MAR 1851");
     rq.entry.year = 1851;
     rq.entry.selection = {qmtest::chosen(1, 0, "Smith, John", "40")};
     const saveoutcome out = f.save(rq);
     ASSERT_TRUE(out.saved()) << out.message.toStdString();
-    EXPECT_EQ(readfile(out.backuppath), family);
-    EXPECT_NE(readfile(path).find("0 @S2@ SOUR\r\n"), std::string::npos);
+    EXPECT_EQ(readfile(out.backuppath), original);
+    EXPECT_NE(readfile(family).find("0 @S2@ SOUR\r\n"), std::string::npos);
     EXPECT_TRUE(out.logwritten);
     EXPECT_FALSE(f.changed()) << "our own save is not an outside change";
-    EXPECT_EQ(f.index()->gedcomdate, stampof(path));
+    EXPECT_EQ(f.index()->gedcomdate, stampof(family));
 
     // Another program's change is never written over.
-    qmtest::writefile(path, family);
-    const std::string theirs = readfile(path);
+    qmtest::writefile(family, original);
     rq.entry.sourceid = QStringLiteral("3");
     EXPECT_EQ(f.save(rq).status, savestatus::changed);
-    EXPECT_EQ(readfile(path), theirs);
+    EXPECT_EQ(readfile(family), original);
     EXPECT_TRUE(f.changed());
+}
+
+TEST_F(OpenFile, ChangeIsToldByTimeOrSizeOrAbsence)
+{
+    const int64_t t = 1'600'000'000'000;
+    setmodified(family, t);
+    const filestamp noted = stampof(family);
+    EXPECT_FALSE(filechanged(family, noted));
+    setmodified(family, t + 2000);
+    EXPECT_TRUE(filechanged(family, noted));
+    // Same time, other size: an editor that restores the time is still caught.
+    qmtest::writefile(family, original + "0 TRLR\r\n");
+    setmodified(family, t);
+    EXPECT_TRUE(filechanged(family, noted));
+    QFile::remove(family);
+    EXPECT_TRUE(filechanged(family, noted));
+    EXPECT_TRUE(changedonsavemessage(QStringLiteral("f.ged"), true)
+                    .endsWith(QStringLiteral("when you click 'Save Changes' again. Please wait for the details to be reloaded...")));
 }

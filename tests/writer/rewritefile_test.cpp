@@ -4,14 +4,9 @@
 #include "writer/rewritefile.h"
 
 #include "model/loadgedcom.h"
-#include "platform/clock.h"
+#include "support/c_savefolder.h"
 #include "support/censusentries.h"
 #include "support/goldenfiles.h"
-#include "support/testfiles.h"
-
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 #include <functional>
 
@@ -23,15 +18,8 @@ using qmtest::writefile;
 
 namespace {
 
-const QDateTime fixedclock(QDate(2026, 12, 4), QTime(13, 5, 9));
-
-flagtable flagdefs()
-{
-    flagtable t;
-    t.push_back({"__CENSUS_1881", "Census 1881", "1881", 0, "UK"});
-    t.push_back({"__CENSUS_1851", "Census 1851", "30 MAR 1851", 0, "UK"});
-    return t;
-}
+const flagtable flagdefs{{"__CENSUS_1881", "Census 1881", "1881", 0, "UK"},
+                         {"__CENSUS_1851", "Census 1851", "30 MAR 1851", 0, "UK"}};
 
 // The census entry most cases start from: three individuals of family.ged,
 // one with an occupation, one with a one-character occupation, one given
@@ -76,11 +64,6 @@ struct goldencase {
     const char* input;
     std::function<void(const gedcomindex&, settings&, rewriterequest&)> setup;
 };
-
-void PrintTo(const goldencase& c, std::ostream* os)
-{
-    *os << c.name;
-}
 
 const goldencase goldencases[] = {
     {"fullentry", "family.ged",
@@ -197,8 +180,7 @@ const goldencase goldencases[] = {
 
 class RewriteGolden : public ::testing::TestWithParam<goldencase> {
 protected:
-    void SetUp() override { setclockfortests(fixedclock); }
-    void TearDown() override { setclockfortests(QDateTime()); }
+    qmtest::fixedclock clock{QDateTime(QDate(2026, 12, 4), QTime(13, 5, 9))};
 };
 
 } // namespace
@@ -210,8 +192,7 @@ TEST_P(RewriteGolden, WritesTheExpectedFile)
     const goldencase& c = GetParam();
     const std::string input = readfile(QStringLiteral(QM_TESTDATA_DIR "/writer/") + QString::fromLatin1(c.input));
     ASSERT_FALSE(input.empty());
-    auto ix = loadgedcombytes(input, flagdefs());
-    ASSERT_TRUE(ix);
+    auto ix = loadgedcombytes(input, flagdefs);
     settings s;
     rewriterequest r;
     c.setup(*ix, s, r);

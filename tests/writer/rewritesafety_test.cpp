@@ -5,26 +5,17 @@
 #include "writer/rewritefile.h"
 
 #include "model/loadgedcom.h"
-#include "platform/clock.h"
+#include "support/c_savefolder.h"
 #include "support/censusentries.h"
 #include "support/goldenfiles.h"
-#include "support/testfiles.h"
-#include "writer/linewriter.h"
 
-#include <QDir>
-#include <QFile>
 #include <QStringEncoder>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 using namespace qm;
 using qmtest::readfile;
 using qmtest::writefile;
 
 namespace {
-
-const QDateTime fixedclock(QDate(2026, 12, 4), QTime(13, 5, 9));
 
 std::string familytext(const char* charset)
 {
@@ -48,18 +39,16 @@ std::string expectedtext(const char* charset)
 // UTF-8 text in a file's encoding.
 std::string encoded(const std::string& utf8, textencoding enc, bool bom)
 {
-    const QString text = QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
-    QByteArray bytes;
+    std::string out;
     if (enc == textencoding::windows1252) {
-        std::string out;
         fromutf8(utf8, textencoding::windows1252, out);
         return out;
     }
-    const auto kind = enc == textencoding::utf16le   ? QStringConverter::Utf16LE
-                      : enc == textencoding::utf16be ? QStringConverter::Utf16BE
-                                                     : QStringConverter::Utf8;
-    QStringEncoder encoder(kind, bom ? QStringConverter::Flag::WriteBom : QStringConverter::Flag::Default);
-    bytes = encoder.encode(text);
+    QStringEncoder encoder(enc == textencoding::utf16le   ? QStringConverter::Utf16LE
+                           : enc == textencoding::utf16be ? QStringConverter::Utf16BE
+                                                          : QStringConverter::Utf8,
+                           bom ? QStringConverter::Flag::WriteBom : QStringConverter::Flag::Default);
+    const QByteArray bytes = encoder.encode(QString::fromStdString(utf8));
     return std::string(bytes.constData(), static_cast<size_t>(bytes.size()));
 }
 
@@ -81,8 +70,7 @@ struct encodingcase {
 
 class RewriteEncoding : public ::testing::TestWithParam<encodingcase> {
 protected:
-    void SetUp() override { setclockfortests(fixedclock); }
-    void TearDown() override { setclockfortests(QDateTime()); }
+    qmtest::fixedclock clock{QDateTime(QDate(2026, 12, 4), QTime(13, 5, 9))};
 };
 
 } // namespace
@@ -152,48 +140,41 @@ TEST(RewriteRefusal, TextTheEncodingCannotHoldIsRefusedBeforeAnythingIsWritten)
 }
 
 // Control characters never reach the family file; the message names the field.
-struct controlcase {
-    const char* name;
-    void (*put)(censusentry& e);
-    const char* field; // "" when the text is taken
-};
-
-class RewriteControlCharacters : public ::testing::TestWithParam<controlcase> {};
-
-TEST_P(RewriteControlCharacters, AreRefusedNamingTheField)
+TEST(RewriteRefusal, ControlCharactersAreRefusedNamingTheField)
 {
+    const struct {
+        void (*put)(censusentry& e);
+        const char* field; // "" when the text is taken
+    } rows[] = {
+        {[](censusentry& e) { e.place = QStringLiteral("Leeds\x1b[31m"); }, "place"},
+        {[](censusentry& e) { e.other = QStringLiteral("a") + QChar(0) + u'b'; }, "other information"},
+        {[](censusentry& e) { e.title = QStringLiteral("Census\x7f"); }, "title"},
+        {[](censusentry& e) { e.sourcetext = QStringLiteral("a\vb"); }, "source text"},
+        {[](censusentry& e) { e.notetext = QStringLiteral("a\fb"); }, "note"},
+        {[](censusentry& e) { e.selection[0].occupation = QStringLiteral("Cur\u0085"); }, "occupation of Bronte, Zoe"},
+        {[](censusentry& e) { e.place = QStringLiteral("a\tb"); }, "place"},
+        {[](censusentry& e) {
+             e.sourcetext = QStringLiteral("a\tb\r\nc\nd"); // tabs and line breaks of texts are taken
+             e.notetext = QStringLiteral("x\ty\r\n");
+         },
+         ""},
+    };
     const auto ix = loadgedcombytes(familytext("UTF-8"), {});
-    rewriterequest r = entry(*ix);
-    GetParam().put(r.entry);
-    const QString message = checkencodable(r, settings{}, textencoding::utf8);
-    if (*GetParam().field == 0) {
-        EXPECT_TRUE(message.isEmpty()) << message.toStdString();
-        return;
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.field);
+        rewriterequest r = entry(*ix);
+        row.put(r.entry);
+        const QString message = checkencodable(r, settings{}, textencoding::utf8);
+        if (*row.field == 0) {
+            EXPECT_TRUE(message.isEmpty()) << message.toStdString();
+            continue;
+        }
+        EXPECT_TRUE(message.startsWith(QStringLiteral("The ") + QString::fromUtf8(row.field)
+                                       + QStringLiteral(" holds a control character (U+")))
+            << message.toStdString();
+        EXPECT_TRUE(message.endsWith(QStringLiteral("Nothing has been changed.")));
     }
-    EXPECT_TRUE(message.startsWith(QStringLiteral("The ") + QString::fromUtf8(GetParam().field)
-                                   + QStringLiteral(" holds a control character (U+")))
-        << message.toStdString();
-    EXPECT_TRUE(message.endsWith(QStringLiteral("Nothing has been changed.")));
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Fields, RewriteControlCharacters,
-    ::testing::Values(
-        controlcase{"PlaceEscape", [](censusentry& e) { e.place = QStringLiteral("Leeds\x1b[31m"); }, "place"},
-        controlcase{"OtherNul", [](censusentry& e) { e.other = QStringLiteral("a") + QChar(0) + u'b'; }, "other information"},
-        controlcase{"TitleDelete", [](censusentry& e) { e.title = QStringLiteral("Census\x7f"); }, "title"},
-        controlcase{"SourceTextVerticalTab", [](censusentry& e) { e.sourcetext = QStringLiteral("a\vb"); }, "source text"},
-        controlcase{"NoteFormFeed", [](censusentry& e) { e.notetext = QStringLiteral("a\fb"); }, "note"},
-        controlcase{"OccupationC1", [](censusentry& e) { e.selection[0].occupation = QStringLiteral("Cur\u0085"); },
-                    "occupation of Bronte, Zoe"},
-        controlcase{"PlaceTab", [](censusentry& e) { e.place = QStringLiteral("a\tb"); }, "place"},
-        controlcase{"TabsAndLineBreaksOfTexts",
-                    [](censusentry& e) {
-                        e.sourcetext = QStringLiteral("a\tb\r\nc\nd");
-                        e.notetext = QStringLiteral("x\ty\r\n");
-                    },
-                    ""}),
-    [](const auto& info) { return std::string(info.param.name); });
 
 // A typed text that begins with "@" is written "@@", so that no reader takes
 // it for a pointer to a record.
@@ -210,17 +191,17 @@ TEST(RewriteTypedText, LeadingAtSignIsDoubled)
     settings s;
     s.fullentry = false;
     s.sourceinnote = true;
-    std::string out;
-    ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
-    for (const char* line : {"2 PLAC @@home\r\n", "3 PAGE @@R1@\r\n", "4 TEXT @@N1@\r\n5 CONT x @ y\r\n5 CONT @@S1@\r\n",
-                             "3 NOTE @@N2@\r\n", "1 OCCU @@I1@\r\n", "2 NOTE @@N1@\r\n"})
-        EXPECT_NE(out.find(line), std::string::npos) << line << "\n" << out;
-
+    const auto expectlines = [&](std::initializer_list<const char*> lines) {
+        std::string out;
+        ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
+        for (const char* line : lines)
+            EXPECT_NE(out.find(line), std::string::npos) << line << "\n" << out;
+    };
+    expectlines({"2 PLAC @@home\r\n", "3 PAGE @@R1@\r\n", "4 TEXT @@N1@\r\n5 CONT x @ y\r\n5 CONT @@S1@\r\n",
+                 "3 NOTE @@N2@\r\n", "1 OCCU @@I1@\r\n", "2 NOTE @@N1@\r\n"});
     s.fullentry = true;
     r.entry.title = QStringLiteral("@T1@");
-    ASSERT_TRUE(rewritebytes(input, out, *ix, s, r).ok);
-    for (const char* line : {"1 TITL @@T1@\r\n", "1 TEXT @@N1@\r\n2 CONT x @ y\r\n2 CONT @@S1@\r\n", "1 NOTE @@N2@\r\n"})
-        EXPECT_NE(out.find(line), std::string::npos) << line << "\n" << out;
+    expectlines({"1 TITL @@T1@\r\n", "1 TEXT @@N1@\r\n2 CONT x @ y\r\n2 CONT @@S1@\r\n", "1 NOTE @@N2@\r\n"});
 }
 
 TEST(RewriteRefusal, OtherCharacterSetsKeepTheirBytesAndTakeAsciiText)
@@ -238,10 +219,9 @@ TEST(RewriteRefusal, OtherCharacterSetsKeepTheirBytesAndTakeAsciiText)
 
 TEST(RewriteMessages, EachModeHasItsOwnFailureText)
 {
-    EXPECT_EQ(rewritefailuremessage(rewritemode::censusdates, QStringLiteral("Disk full")),
-              QStringLiteral("An error occurred (Disk full): Dates were not changed and program will close when you press OK"));
-    EXPECT_EQ(rewritefailuremessage(rewritemode::flagchanges, QStringLiteral("x")),
-              QStringLiteral("An error occurred (x): Flags were not changed and program will close when you press OK"));
-    EXPECT_EQ(rewritefailuremessage(rewritemode::attachimages, QStringLiteral("x")),
-              QStringLiteral("An error occurred (x): Images not attached and program will close when you press OK"));
+    for (const auto& [mode, says] : {std::pair{rewritemode::censusdates, "Dates were not changed"},
+                                     std::pair{rewritemode::flagchanges, "Flags were not changed"},
+                                     std::pair{rewritemode::attachimages, "Images not attached"}})
+        EXPECT_EQ(rewritefailuremessage(mode, QStringLiteral("Disk full")),
+                  QStringLiteral("An error occurred (Disk full): %1 and program will close when you press OK").arg(QLatin1String(says)));
 }
