@@ -4,7 +4,7 @@
 #include "writer/backups.h"
 
 #include "platform/scriptedprompts.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/readonlyfolder.h"
 
 #include <QFile>

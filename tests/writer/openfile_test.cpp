@@ -6,7 +6,7 @@
 #include "model/filechanged.h"
 #include "platform/scriptedprompts.h"
 #include "platform/settingsstore.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 
 #include <QFile>

@@ -3,7 +3,7 @@
 #include "writer/preview.h"
 
 #include "model/loadgedcom.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 
 #include <QFileInfo>

@@ -9,7 +9,7 @@
 
 #include "model/loadgedcom.h"
 #include "platform/linereader.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 
 #include <QDirIterator>

@@ -6,7 +6,7 @@
 
 #include "images/imagechoices.h"
 #include "model/loadgedcom.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 #include "writer/maketitle.h"
 #include "writer/recordwriters.h"

@@ -5,7 +5,7 @@
 #include "writer/rewritefile.h"
 
 #include "model/loadgedcom.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 #include "support/goldenfiles.h"
 

@@ -6,7 +6,7 @@
 
 #include "model/loadgedcom.h"
 #include "platform/scriptedprompts.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 #include "writer/saveprompts.h"
 

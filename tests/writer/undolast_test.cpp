@@ -4,7 +4,7 @@
 #include "writer/undolast.h"
 
 #include "model/loadgedcom.h"
-#include "support/c_savefolder.h"
+#include "support/savefolder.h"
 #include "support/censusentries.h"
 
 #include <QFile>
