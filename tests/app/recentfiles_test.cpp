@@ -123,6 +123,27 @@ TEST(Startup, PlacementStopsAtFirstMissingValue)
     EXPECT_FALSE(p.centre);
 }
 
+// The window's own size when nothing is kept; the kept placement within the
+// screen, also when it was on a screen that is no longer there; centred when
+// "Main Maximised" was missing.
+TEST(Startup, WindowIsPlacedWithinTheScreen)
+{
+    const QRect screen(0, 0, 1920, 1080);
+    const auto at = [&](const placement& p) {
+        const windowplace w = placewindow(p, QPoint(5, 5), QSize(900, 600), QSize(400, 300), screen, 96);
+        return std::to_string(w.at.x()) + "," + std::to_string(w.at.y()) + " " + std::to_string(w.size.width()) +
+               "x" + std::to_string(w.size.height()) + (w.move ? " moved" : "");
+    };
+    EXPECT_EQ(at(placement{}), "5,5 1280x760");
+    EXPECT_EQ(at(placement{1440, 2880, 15000, 9000}), "192,96 1000x600 moved");
+    EXPECT_EQ(at(placement{1440, 60000, 15000, 9000}), "919,96 1000x600 moved"); // off to the right
+    EXPECT_EQ(at(placement{-9000, -9000, 90000, 90000}), "0,0 1904x1040 moved");
+    EXPECT_EQ(at(placement{1440, 2880, 1500, 900}), "192,96 400x300 moved"); // never below the smallest
+    placement centred{1440, 2880, 15000, 9000};
+    centred.centre = true;
+    EXPECT_EQ(at(centred), "459,239 1000x600 moved");
+}
+
 TEST(Startup, DefaultFileQuestion)
 {
     EXPECT_TRUE(askdefaultfile(QString(), false, false));

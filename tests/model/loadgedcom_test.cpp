@@ -135,16 +135,21 @@ TEST(LoadGedcom, SourcesTitlesAndCensusSources)
 {
     auto ix = load(ged("0 @S1@ SOUR\n1 ABBR Parish register\n1 TITL 1851 Census\n"
                        "0 @S2@ SOUR\n1 TITL   1881 CENSUS of Leeds  \n1 ABBR Other\n1 OBJE @O3@\n1 OBJE @O5@\n"
-                       "0 @S3@ SOUR\n1 TITL Censuses of Wales\n"));
+                       "0 @S3@ SOUR\n1 TITL Censuses of Wales\n"
+                       "0 @S4@ SOUR\n1 TITL census 1851 Eire\n0 @S5@ SOUR\n1 TITL Census 1841 Eire\n"));
     strings got;
     for (const sourcerec& s : ix->sources)
         got.push_back(sv(s.title) + (s.iscensus ? " census " : " ") + ids(s.objectids));
-    EXPECT_EQ(got, (strings{"Parish register ", "1881 CENSUS of Leeds census 3,5", "Censuses of Wales census "}));
-    EXPECT_EQ(ix->censussources, (std::vector<int32_t>{1, 2}));
-    const auto items = censussourcelist(*ix);
-    ASSERT_EQ(items.size(), 2u);
-    EXPECT_EQ(items[0].title, QStringLiteral("1881 CENSUS of Leeds"));
-    EXPECT_EQ(items[0].source, 1);
+    EXPECT_EQ(got, (strings{"Parish register ", "1881 CENSUS of Leeds census 3,5", "Censuses of Wales census ",
+                            "census 1851 Eire census ", "Census 1841 Eire census "}));
+    EXPECT_EQ(ix->censussources, (std::vector<int32_t>{1, 2, 3, 4}));
+    // The list of existing census sources is in the one list order, whatever
+    // the locale: letter case set aside.
+    strings listed;
+    for (const sourceitem& item : censussourcelist(*ix))
+        listed.push_back(item.title.toStdString() + " " + std::to_string(item.source));
+    EXPECT_EQ(listed, (strings{"1881 CENSUS of Leeds 1", "Census 1841 Eire 4", "census 1851 Eire 3",
+                               "Censuses of Wales 2"}));
 }
 
 TEST(LoadGedcom, CensusEventsResidencesAndCitations)
