@@ -147,6 +147,21 @@ QString unknownoption(const QStringList& args)
     return QString();
 }
 
+bool beginargs(QStringList& args, QStringList& operands, QString& inipath, QString& error)
+{
+    operands = takeoperands(args);
+    return takesettingsoption(args, &inipath, &error);
+}
+
+bool endargs(QStringList& args, const QStringList& operands, QString& error)
+{
+    error = unknownoption(args);
+    if (!error.isEmpty())
+        return false;
+    args += operands;
+    return true;
+}
+
 QString readapplyargs(const QStringList& args, const QString& name, const QString& missing,
                       const std::function<QString(const QString& value)>& take, bool* apply, QStringList* files)
 {

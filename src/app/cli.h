@@ -84,6 +84,14 @@ bool takeoptionvalue(QStringList& args, qsizetype i, const QString& name, QStrin
 // looks like an option ("-" alone names standard input); "" when none does.
 QString unknownoption(const QStringList& args);
 
+// The opening every command shares: the operands after "--" set aside, then
+// "--settings" taken. False (with the message) when --settings has no value.
+bool beginargs(QStringList& args, QStringList& operands, QString& inipath, QString& error);
+// The closing, once a command has taken its own options: false (with the
+// message) when an argument left looks like an option; else the operands set
+// aside are put back after the arguments left.
+bool endargs(QStringList& args, const QStringList& operands, QString& error);
+
 // Reads the arguments of a command that takes family files, the switch
 // --apply and one option NAME VALUE or NAME=VALUE, in the order given. Each
 // value goes to `take`, which returns "" or why it refuses it; `missing` is

@@ -37,8 +37,8 @@ struct backupguard {
 int cliaddentry(QStringList args)
 {
     QString inipath, error, entrypath;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
     const bool strict = args.removeAll(QStringLiteral("--strict")) > 0;
     const bool dryrun = args.removeAll(QStringLiteral("--dry-run")) > 0;
@@ -54,10 +54,8 @@ int cliaddentry(QStringList args)
             break;
         }
     }
-    error = unknownoption(args);
-    if (!error.isEmpty())
+    if (!endargs(args, operands, error))
         return clifail(error);
-    args += operands;
     if (args.size() != 1 || entrypath.isEmpty())
         return clifail(QStringLiteral("add-entry needs a family file and an entry: quillmark-cli add-entry FILE "
                                       "--entry ENTRY.json [--strict] [--dry-run] [--settings S.ini]"));

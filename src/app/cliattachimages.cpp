@@ -45,8 +45,8 @@ struct wanted {
 int cliattachimages(QStringList args)
 {
     QString inipath, error, sourcetext;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
     std::vector<wanted> asked;
     for (qsizetype i = 0; i < args.size();) {
@@ -76,10 +76,8 @@ int cliattachimages(QStringList args)
         if (!error.isEmpty())
             return clifail(error);
     }
-    error = unknownoption(args);
-    if (!error.isEmpty())
+    if (!endargs(args, operands, error))
         return clifail(error);
-    args += operands;
     const QString usage = QStringLiteral("attach-images needs a family file, a source and at least one image: "
                                          "quillmark-cli attach-images FILE --source S_NUMBER --image PATH[=TITLE]... "
                                          "--object O_NUMBER...");

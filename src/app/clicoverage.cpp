@@ -43,8 +43,8 @@ private:
 int clicoverage(QStringList args)
 {
     QString inipath, error, country;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
     int year = 0;
     bool missingonly = false, csv = false;
@@ -71,10 +71,8 @@ int clicoverage(QStringList args)
         if (!error.isEmpty())
             return clifail(error);
     }
-    error = unknownoption(args);
-    if (!error.isEmpty())
+    if (!endargs(args, operands, error))
         return clifail(error);
-    args += operands;
     const auto f = openfamily(args, usage(), inipath);
     if (!f)
         return clifailure;

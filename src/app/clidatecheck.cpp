@@ -32,8 +32,8 @@ QString usage()
 int clidatecheck(QStringList args)
 {
     QString inipath, error;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
     bool apply = false;
     QString country;

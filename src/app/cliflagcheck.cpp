@@ -29,8 +29,8 @@ QString usage()
 int cliflagcheck(QStringList args)
 {
     QString inipath, error;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
     bool apply = false;
     std::map<std::string, QString> countryfor; // place key -> country

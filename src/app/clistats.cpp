@@ -11,13 +11,11 @@ namespace qm {
 int clistats(QStringList args)
 {
     QString inipath, error;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
-    error = unknownoption(args);
-    if (!error.isEmpty())
+    if (!endargs(args, operands, error))
         return clifail(error);
-    args += operands;
     const auto f = openfamily(
         args, QStringLiteral("stats needs one family file: quillmark-cli stats FILE [--settings S.ini]"), inipath);
     if (!f)

@@ -13,13 +13,11 @@ namespace qm {
 int cliundo(QStringList args)
 {
     QString inipath, error;
-    const QStringList operands = takeoperands(args);
-    if (!takesettingsoption(args, &inipath, &error))
+    QStringList operands;
+    if (!beginargs(args, operands, inipath, error))
         return clifail(error);
-    error = unknownoption(args);
-    if (!error.isEmpty())
+    if (!endargs(args, operands, error))
         return clifail(error);
-    args += operands;
     if (args.size() != 1)
         return clifail(QStringLiteral("undo needs one family file: quillmark-cli undo FILE [--settings S.ini]"));
     const QString path = args.front();
